@@ -1,0 +1,41 @@
+# How every target of the project is compiled.
+
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+
+# One flat set of rooms: libraries and programs lie side by side, so that $ORIGIN finds the engine.
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY "${CMAKE_BINARY_DIR}/out")
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY "${CMAKE_BINARY_DIR}/out")
+
+if(NOT CMAKE_BUILD_TYPE)
+  set(CMAKE_BUILD_TYPE Release CACHE STRING "" FORCE)
+endif()
+
+add_library(mrtu_flags INTERFACE)
+target_include_directories(mrtu_flags INTERFACE "${CMAKE_SOURCE_DIR}" "${CMAKE_BINARY_DIR}")
+target_compile_options(mrtu_flags INTERFACE
+  -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Wformat=2 -Werror
+  # GNU-unique symbols would keep an unloaded plug-in in memory for ever.
+  $<$<AND:$<COMPILE_LANGUAGE:CXX>,$<CXX_COMPILER_ID:GNU>>:-fno-gnu-unique>)
+
+if(MRTU_SANITIZE)
+  add_compile_options(-fsanitize=${MRTU_SANITIZE} -fno-omit-frame-pointer
+    -fno-sanitize-recover=all)
+  add_link_options(-fsanitize=${MRTU_SANITIZE})
+endif()
+
+# Headers of other projects are system headers: their warnings are theirs.
+find_package(Threads REQUIRED)
+
+# mrtu_shared_library(TARGET EXPORTS): what plug-in and engine have in common.
+function(mrtu_shared_library target exports)
+  set_target_properties(${target} PROPERTIES
+    BUILD_RPATH "$ORIGIN" INSTALL_RPATH "$ORIGIN" BUILD_RPATH_USE_ORIGIN ON
+    LINK_DEPENDS "${exports}")
+  target_link_options(${target} PRIVATE "-Wl,--version-script=${exports}" "-Wl,--gc-sections")
+  if(MRTU_STATIC_RUNTIME)
+    target_link_options(${target} PRIVATE -static-libstdc++ -static-libgcc -Wl,--exclude-libs,ALL)
+  endif()
+endfunction()

@@ -1,0 +1,54 @@
+// Run-time overrides of node addresses, one storage key for each changed node.
+#pragma once
+
+#include <string>
+#include <utility>
+#include <vector>
+
+/// Pairs of a configured address and its replacement, at most one for each configured address, in
+/// order of insertion. Threads: as the other replacers.
+template <class Address>
+class AddressReplacer {
+  public:
+    using Pair = std::pair<Address, Address>;
+
+    AddressReplacer() = default;
+    AddressReplacer(const AddressReplacer&) = delete;
+    AddressReplacer& operator=(const AddressReplacer&) = delete;
+
+    /// The prefix of the storage keys.
+    virtual std::string getPrefix() const = 0;
+    virtual std::string toString(Address address) const = 0;
+    virtual Address fromString(const std::string& text) const = 0;
+
+    /// Records an override and, unless `section` is null, persists it. Replacing an address by
+    /// itself removes the storage key; the pair stays listed.
+    void setValue(Address address, Address replacement, const char* section);
+
+    /// Records every override that the section holds; nothing is written back.
+    void restore(const char* section);
+
+    /// @return the replacement, or `address` itself when none is recorded.
+    Address replacementOf(Address address) const;
+
+    const std::vector<Pair>& replacements() const { return replacements_; }
+
+  protected:
+    // Not virtual: nobody deletes through this base, and the table begins with getPrefix().
+    ~AddressReplacer() = default;
+
+  private:
+    void record(Address address, Address replacement);
+
+    std::vector<Pair> replacements_;
+};
+
+extern template class AddressReplacer<int>;
+
+/// Node addresses: keys "tempNode" + address in decimal; stored texts are read with automatic base.
+class AddressReplacerID final : public AddressReplacer<int> {
+  public:
+    std::string getPrefix() const override;
+    std::string toString(int address) const override;
+    int fromString(const std::string& text) const override;
+};

@@ -1,0 +1,144 @@
+// The framework's base of every protocol.
+#pragma once
+
+#include <list>
+#include <string>
+
+#include "platform/IProtocol.h"
+
+class TagBase;
+
+/// Supplies the error state, the identity, the ownership of tags, the generic reads, the queries
+/// of tag URI fields, the console and a refusing default for every optional capability.
+/// Pure operations are left to the engine and to the driver.
+/// Threads: no locking here; see IProtocol.
+class ProtocolBase : public IProtocol7 {
+  public:
+    ProtocolBase() = default;
+    ~ProtocolBase() override;
+    ProtocolBase(const ProtocolBase&) = delete;
+    ProtocolBase& operator=(const ProtocolBase&) = delete;
+
+    // IProtocol
+    void* ConvertTo(const char* name) override;
+    ITag* CreateTag(const char* uri) override;
+    void FreeTag(ITag* tag) override;
+    int Start() override;
+    int Stop() override;
+    int Read(const ITag* tag, unsigned char* value) override;
+    int WriteBlock(const ITag* tag, const unsigned char* data, int length) override;
+    int MaxDatagramItems(const ITag* tag) const override;
+    int MaxDatagramLength(const ITag* tag) const override;
+    bool CanCoexistInDatagram(const ITag* a, const ITag* b) const override;
+    int ReadDatagram(const ITag* const* tags, int count, unsigned char* data) override;
+    const char* GetNextInstanceName() const override;
+    int GetLastError() const override;
+    const char* GetLastErrorString() const override;
+    int GetInfo(char* buffer, int size) const override;
+    const unsigned char* GetXml() const override;
+    bool IsConverted() const override;
+    const char* GetIdent() const override;
+    void SetIdent(const char* ident) override;
+
+    // IProtocol2
+    int DoCommand(const char* command, char* answer, int size) override;
+    int Extend(int code, void* data) override;
+
+    // IProtocol3
+    bool CanAddToDatagram(const ITag* const* tags, int count, const ITag* candidate) override;
+    int ReadDatagramWithStatus(const ITag* const* tags, int count, unsigned char* data,
+                               idal_error_t* status) override;
+    bool MultipleReadSupported() const override;
+    int MultipleRead(IMultiRead* request) override;
+    bool MultipleWriteSupported() const override;
+    int MultipleWrite(IMultiWrite* request) override;
+
+    // IProtocol4
+    bool CanReadBitBlock(const ITag* tag) const override;
+    int ReadBitBlock(const ITag* tag, unsigned char* data, int bits) override;
+    void* GetInterface(const char* name) override;
+    int MaxUnusedGap(const ITag* tag) const override;
+    bool IsBefore(const ITag* a, const ITag* b) const override;
+    bool IsAdjacent(const ITag* a, const ITag* b) const override;
+    bool NeedsReadBeforeWrite(const ITag* tag) const override;
+
+    // IProtocol5
+    bool CanWriteDatagrams(const ITag* tag) const override;
+    bool CanAddToWriteDatagram(const ITag* const* tags, int count,
+                               const ITag* candidate) const override;
+    int WriteDatagramWithStatus(const ITag* const* tags, int count, const unsigned char* data,
+                                idal_error_t* status) override;
+    bool CanWriteBitBlock(const ITag* tag) const override;
+    int WriteBitBlock(const ITag* tag, const unsigned char* data, int bits) override;
+    int readObject(const ITag* tag, IObjectString* object) override;
+    int writeObject(const ITag* tag, const IObjectString* object) override;
+
+    // IProtocol6
+    int vcsGetCapability() const override;
+    int vcsGetComParams(char* text, int size) const override;
+    int vcsActivateInterleaved(unsigned short onOff) override;
+    IEventChannel* createEventChannel(int kind) override;
+    IEventChannel* createEventChannel(IEventProcessor* processor) override;
+    void deleteEventChannel(IEventChannel* channel) override;
+    int addEventSource(IEventChannel* channel, const char* source) override;
+    int addAlarmEvents(IEventChannel* channel, IAlarm* alarm) override;
+    void* frontEvent(IEventChannel* channel) override;
+    void popEvent(IEventChannel* channel) override;
+    IAlarm* createAlarm(const char* source) override;
+    void deleteAlarm(IAlarm* alarm) override;
+    int listAlarms(IAlarmProcessor* processor) override;
+    int quitAlarm(IAlarm* alarm) override;
+    ITrend* createTrend(const char* source) override;
+    void deleteTrend(ITrend* trend) override;
+    int readTrend(ITrend* trend, unsigned long long from, unsigned long long to,
+                  unsigned long long& next, unsigned int limit, bool option,
+                  ITrendProcessor* processor) override;
+
+    // IProtocol7
+    bool hasPlcTimestamp(const ITag* tag) override;
+    int readWithTimestamp(const ITag* tag, unsigned char* value,
+                          unsigned long long* stamp) override;
+    int readBlockWithTimestamp(const ITag* tag, unsigned char* data, int length,
+                               unsigned long long* stamp) override;
+    int readDatagramWithTimestamp(const ITag* const* tags, int count, unsigned char* data,
+                                  idal_error_t* status, unsigned long long* stamps) override;
+    int getTagUriFieldCount() const override;
+    const char* getTagUriFieldName(int index) const override;
+    int getTagUriFieldPosition(const char* name) const override;
+    const char* getTagUriField(const ITag* tag, int index, int* length) const override;
+    int readArrayItem(const ITag* tag, int index, unsigned char* value) override;
+    int writeArrayItem(const ITag* tag, int index, const unsigned char* value) override;
+    int readBitBlockWithTimestamp(const ITag* tag, unsigned char* data, int bits,
+                                  unsigned long long* stamp) override;
+
+    // What a driver supplies, in table order behind the interface family.
+
+    /// @return a new tag for the URI, or null after setting the error.
+    virtual ITag* CreateTagBase(const char* uri) = 0;
+    /// @return the worst-case time of one transaction in milliseconds; `tag` may be null.
+    virtual int GetMaxTm(const ITag* tag) const = 0;
+    /// @return the names of the tag URI's fields, ended by a null pointer.
+    virtual const char* const* tagUriNames() const;
+
+  protected:
+    /// Stores the error that GetLastError() and GetLastErrorString() report.
+    void SetError(int code, const char* text);
+    /// Reports the tag's own error text together with its URI.
+    void SetTagError(const TagBase* tag);
+    /// Destroys every tag that this object owns.
+    void DeleteTags();
+
+  private:
+    bool arrayItemInRange(const ITag* tag, int index);
+    int refuseEvents();
+    void commandRead(const std::string& uri, char* answer, int size);
+    void commandWrite(const std::string& uri, const std::string& hex, char* answer, int size);
+
+    std::list<ITag*> tags_;
+    int lastError_ = 1;
+    std::string lastErrorText_;
+    std::string ident_;
+};
+
+/// @return milliseconds since the Unix epoch.
+unsigned long long currentTimeStamp();

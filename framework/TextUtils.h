@@ -1,0 +1,38 @@
+// Small text utilities that every driver of the family shares. Pure, callable from any thread.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+namespace ProtUtilsN {
+
+/// Removes blanks and tabs (no other white space) from both ends.
+void Trim(std::string& text);
+std::string GetTrim(const std::string& text);
+
+/// Splits at every delimiter and appends each piece, trimmed, to `pieces`, which is not cleared
+/// first. Empty pieces are kept; an empty text is one empty piece.
+void ParseSubstrings(const std::string& text, std::vector<std::string>& pieces, char delimiter);
+
+/// Finds the first `key` + "=" anywhere in `text` and stores the letters and digits that follow.
+/// @return false, with `value` untouched, when there is none.
+bool GetConfigValue(const char* text, const char* key, std::string& value);
+
+/// Reads an integer whose base follows from its prefix (0x hexadecimal, leading 0 octal, else
+/// decimal), after optional blanks and sign. Reading stops at the first character that does not
+/// fit; no digits read as 0; a number beyond 32 bits reads as the nearest 32-bit one, on every
+/// architecture.
+std::int32_t ParseInteger(const char* text);
+
+/// Copies `text` into `out` the way strncpy() does: at most `size` bytes, the rest filled with
+/// zeroes, unterminated when the text has `size` bytes or more. A `size` below 1 writes nothing.
+void CopyBounded(char* out, const char* text, int size);
+
+}  // namespace ProtUtilsN
+
+/// Writes the digits of `value` and a terminating zero. Base 16 has the digits 0-9 and a-f; any
+/// other base adds the remainder to "0", so bases up to 10 give digits. No sign is written:
+/// REQUIRES: value >= 0, base >= 2, and room for the digits and the zero.
+/// @return buffer
+char* itoa(int value, char* buffer, int base);

@@ -1,0 +1,66 @@
+// The Modbus memory map: twelve memory types in four models.
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <string_view>
+
+#include "framework/MemoryManager.h"
+
+namespace _MRTU {
+
+/// The areas that the driver itself serves; they never reach the line.
+enum class DriverArea : std::uint8_t {
+    none,
+    nodeOverride,  // "NO"
+    modiconMode,   // "NP_Mode"
+    baud,          // "SP_Baud"
+    parity,        // "SP_Par"
+    stopBits,      // "SP_Stop"
+    lineMode,      // "SP_Mode"
+    apply,         // "SP_Done"
+};
+
+/// One memory type; index ranges in the order of the models "1" to "4".
+struct MemoryRow {
+    struct Range {
+        std::int32_t min;
+        std::int32_t max;
+    };
+    std::string_view name;
+    ICU_Type naturalType;
+    std::uint32_t icomTypes;
+    bool bitRead;
+    bool bitWrite;
+    bool bitArrayWrite;
+    bool readOnly;
+    std::int32_t blockReadCount;
+    std::int32_t blockWriteCount;
+    bool enronOnly;  ///< Offered by the models "3" and "4" only.
+    std::array<Range, 4> ranges;
+    std::uint8_t readFunction;  ///< 0: keeps what the tag has.
+    DriverArea area;
+};
+
+extern const std::array<MemoryRow, 12> memoryRows;
+
+/// One row of the reference address table: the classic five-digit form and the six-digit form of an
+/// area's addresses, bounds included.
+struct AddressRange {
+    std::string_view name;
+    std::int32_t shortMin;
+    std::int32_t shortMax;
+    std::int32_t longMin;
+    std::int32_t longMax;
+};
+
+extern const std::array<AddressRange, 5> table;
+
+/// @return the row of the memory type called `name`, or null.
+const MemoryRow* memoryRow(std::string_view name);
+const AddressRange* addressRange(std::string_view name);
+
+/// Registers the four models.
+void registerModels(MemoryManager& manager);
+
+}  // namespace _MRTU

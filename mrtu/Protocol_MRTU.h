@@ -1,0 +1,102 @@
+// The Modbus master for serial lines.
+#pragma once
+
+#include "engine/ProtgenProtocol.h"
+#include "framework/AddressReplacer.h"
+#include "framework/MemoryManager.h"
+#include "framework/ParameterReplacer.h"
+#include "mrtu/Params.h"
+#include "mrtu/Reply.h"
+#include "mrtu/SerialSettings.h"
+#include "platform/IMultiTask2.h"
+#include "platform/ISerialFactory.h"
+
+class Tag_MRTU;
+
+/// One serial line with its slaves.
+/// Threads: re-entrant. One lock serialises every complete exchange on the line; Stop() takes it
+/// too. Configuration, start, tag creation, console and the driver's own memory areas rely on the
+/// host's ordering.
+class Protocol_MRTU : public ProtgenProtocol {
+  public:
+    /// REQUIRES: the module object holds the host's services.
+    Protocol_MRTU();
+    ~Protocol_MRTU() override;
+
+    void* ConvertTo(const char* name) override;
+    const char* GetImpName() const override { return "Protocol_MRTU"; }
+    int GetImpVersion() const override { return 100; }
+    int Config(const char* text) override;
+    int Start() override;
+    int Stop() override;
+    const char* GetName() const override { return "MRTU"; }
+    int GetProtocolVersion() const override { return 126; }
+    int GetProtocolType() const override { return 184; }
+    const char* GetProtocolName() const override { return "Modbus RTU"; }
+    const unsigned char* GetXml() const override;
+    int DoCommand(const char* command, char* answer, int size) override;
+    int Extend(int code, void* data) override;
+    int vcsGetCapability() const override { return 2; }
+    int vcsGetComParams(char* text, int size) const override;
+
+    ITag* CreateTagBase(const char* uri) override;
+    int GetMaxTm(const ITag* tag) const override;
+    const char* const* tagUriNames() const override;
+
+    int getMaxItemCount(const ProtgenTag* tag, bool write) const override;
+    int arrayItemByTag() const override { return 1; }
+    int doWrite(const ProtgenTag* tag, int index, const unsigned char* data, int count) override;
+    bool doReadBlock(const ProtgenTag* tag, int index, unsigned char* data, int count) override;
+    int doWriteBits(const ProtgenTag* tag, int index, const unsigned char* data,
+                    int count) override;
+    bool doReadBits(const ProtgenTag* tag, int index, unsigned char* data, int count) override;
+
+    const _MRTU::ParamManager* getParamManager() const { return &params_; }
+    const MemoryManager* getMemoryManager() const { return &memoryManager_; }
+
+  private:
+    class LineLock;
+    struct Attempt;
+
+    int fail(const _MRTU::Fault& fault);
+
+    // Start
+    void applySerialOverrides();
+    bool openPort();
+    void releasePort();
+    bool configurePort();
+
+    // Transactions
+    void pauseBefore(const Tag_MRTU& tag) const;
+    std::uint16_t lineAddress(const Tag_MRTU& tag, int index);
+    bool modiconMode(const Tag_MRTU& tag);
+    std::uint8_t lineNode(const Tag_MRTU& tag) const;
+    _MRTU::Fault exchange(const Tag_MRTU& tag, const _MRTU::Message& request, _MRTU::Reply& reply);
+    void flushInput();
+    Attempt attempt(const _MRTU::Frame& frame, int timeoutMs, bool ascii, _MRTU::Reply& reply);
+
+    _MRTU::Fault readItems(const Tag_MRTU& tag, int index, unsigned char* data, int count);
+    _MRTU::Fault readTransaction(const Tag_MRTU& tag, int index, int count, int dataLength,
+                                 _MRTU::Reply& reply);
+    int writeItems(const Tag_MRTU* tag, int index, const unsigned char* data, int count);
+    _MRTU::Fault writeTransaction(const Tag_MRTU& tag, int index, const unsigned char* data,
+                                  int count);
+
+    // The driver's own areas
+    bool readDriverArea(const Tag_MRTU& tag, unsigned char* data);
+    bool writeDriverArea(const Tag_MRTU& tag, const unsigned char* data);
+    int serialValue(const char* name, int current);
+    void applyStaged();
+
+    bool started_ = false;
+    _MRTU::ParamManager params_;
+    MemoryManager memoryManager_;
+    _MRTU::SerialSettings line_;
+    ISerialPort* port_ = nullptr;
+    ISerialFactory* serialFactory_;
+    AddressReplacerID nodeOverrides_;
+    ParameterReplacer overrides_;
+    GroupParameterReplacer stagedOverrides_;
+    IMultiTask2* multiTask_;
+    ILock* lock_;
+};
