@@ -1,0 +1,42 @@
+// What every sub-command of `mrtu` shares, and how sub-commands are added.
+//
+// A sub-command is one function `void addXyCommand(CLI::App& app, CommandContext& context)`. It
+// calls app.add_subcommand(), declares its options and sets a callback. The callback runs after
+// the whole command line was accepted; it prints results on context.out, complaints on
+// context.err, and either stores context.exitCode or throws CommandError.
+#pragma once
+
+#include <iosfwd>
+#include <string>
+
+#include "cli/ExitCode.h"
+
+namespace CLI {
+class App;
+}
+
+namespace cli {
+
+/// Lives from before the command line is parsed until after the callback.
+struct CommandContext {
+    std::ostream& out;
+    std::ostream& err;
+    /// The callback's verdict.
+    ExitCode exitCode = ExitCode::Done;
+    /// What --plugin said; empty for the default places. Ask pluginFile() instead.
+    std::string pluginOption;
+};
+
+/// Declares `--plugin FILE` on a sub-command that loads the driver.
+void addPluginOption(CLI::App& command, CommandContext& context);
+
+/// @return the plug-in to load: what --plugin named, else the first that exists of "libmrtu.so"
+/// beside the executable and "../lib/mrtu/libmrtu.so" relative to the executable's folder.
+/// Errors: CommandError (Other) naming the places looked at when there is none.
+std::string pluginFile(const CommandContext& context);
+
+/// Runs a whole command line, also `--help` and `--version`.
+/// @return what main() returns: the number of an ExitCode.
+int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::ostream& err);
+
+}  // namespace cli
