@@ -1,0 +1,16 @@
+// The simulator's words for bytes on the line.
+#pragma once
+
+#include <cstdint>
+#include <span>
+#include <vector>
+
+namespace sim {
+
+using Bytes = std::vector<std::uint8_t>;
+using ByteView = std::span<const std::uint8_t>;
+
+/// How frames travel. Source: Modbus over Serial Line V1.02, 2.5.
+enum class Mode : std::uint8_t { rtu, ascii };
+
+}  // namespace sim

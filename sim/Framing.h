@@ -1,0 +1,66 @@
+// Frames of serial Modbus: a message (node, function, data) packed for the line and found again in
+// the stream of received bytes. Pure: no port, no clock.
+#pragma once
+
+#include <cstddef>
+#include <functional>
+#include <optional>
+#include <vector>
+
+#include "sim/Bytes.h"
+
+namespace sim {
+
+/// Bytes of the longest RTU frame. Source: Modbus over Serial Line V1.02, 2.5.1.
+inline constexpr std::size_t kMaxRtuFrame = 256;
+/// Characters of the longest ASCII frame: colon, 2 for each of 254 bytes and the LRC, CR, LF.
+inline constexpr std::size_t kMaxAsciiFrame = 1 + 2 * (254 + 1) + 2;
+
+/// @return the message with its check, as it travels in `mode`.
+/// @param breakCheck  The check is spoilt (all its bits inverted), the rest is in order.
+Bytes encodeFrame(Mode mode, ByteView message, bool breakCheck = false);
+
+/// A frame taken from the line.
+struct Received {
+    Bytes raw;      ///< What arrived, colon and check included.
+    Bytes message;  ///< Node, function, data. Empty when the frame is damaged.
+
+    bool damaged() const { return message.empty(); }
+};
+
+/// @return the frame read from `raw`. It is damaged when it is too short or too long, when its
+/// check is wrong, and in ASCII when it holds a character other than 0-9 and A-F.
+Received decodeFrame(Mode mode, ByteView raw);
+
+/// Tells from the first bytes of an RTU request how long it is, check included; nothing when more
+/// bytes are needed or the function is unknown.
+using RequestLength = std::function<std::optional<std::size_t>(ByteView)>;
+
+/// Cuts the stream of received bytes into frames. RTU: a frame ends as soon as the length that its
+/// own first bytes announce is there and the check is right, or at silence. ASCII: it begins at
+/// the last colon and ends at CR LF; silence means nothing, so that a person can type a frame.
+/// Threads: one at a time.
+class FrameSplitter {
+  public:
+    FrameSplitter(Mode mode, RequestLength requestLength);
+
+    /// @return the frames that these bytes complete.
+    std::vector<Received> add(ByteView bytes);
+
+    /// The line was silent for longer than a frame may pause.
+    /// @return what had arrived in RTU mode; nothing in ASCII mode or when nothing had arrived.
+    std::optional<Received> silence();
+
+    /// Whether silence() would return a frame.
+    bool waitsForSilence() const { return mode_ == Mode::rtu && !pending_.empty(); }
+
+  private:
+    std::optional<Received> completeRtu();
+    std::optional<Received> addAscii(std::uint8_t character);
+
+    Mode mode_;
+    RequestLength requestLength_;
+    Bytes pending_;
+};
+
+}  // namespace sim

@@ -1,0 +1,134 @@
+// A simulated line with Modbus nodes on a pseudo terminal, with faults on demand.
+//
+//     sim::Simulator simulator({.mode = sim::Mode::rtu, .nodes = {{.address = 1}}});
+//     simulator.start();
+//     openPort(simulator.path());
+#pragma once
+
+#include <chrono>
+#include <condition_variable>
+#include <cstdint>
+#include <deque>
+#include <functional>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "sim/Bytes.h"
+#include "sim/Fault.h"
+#include "sim/Framing.h"
+#include "sim/PtyLine.h"
+#include "sim/Slave.h"
+
+namespace sim {
+
+/// Something that happened on the line.
+struct LineEvent {
+    enum class Kind : std::uint8_t {
+        request,  ///< A frame with a right check, for whatever node.
+        damaged,  ///< Bytes that are no frame; they stay unanswered.
+        reply,    ///< What was sent, faults included.
+        hangUp,   ///< A fault ended the line; no bytes.
+    };
+    Kind kind = Kind::request;
+    Bytes raw;  ///< As on the line: RTU bytes or ASCII characters, check included.
+    std::chrono::steady_clock::time_point at{};
+};
+
+/// @return the kind's name: "request", "damaged", "reply", "hang-up".
+const char* nameOf(LineEvent::Kind kind);
+
+/// @return one line of text: the kind's name, then the bytes in hexadecimal (RTU) or the characters
+/// up to CR LF (ASCII). `request 01 03 00 00 00 01 84 0A`.
+std::string describe(const LineEvent& event, Mode mode);
+
+struct SimulatorOptions {
+    Mode mode = Mode::rtu;
+    std::vector<NodeOptions> nodes = {NodeOptions{}};
+    std::string link{};            ///< Symbolic link to the device, see PtyLine. Empty: none.
+    std::uint32_t silenceMs = 20;  ///< Silence that ends an RTU frame of no announced length, 1..
+    std::size_t logLimit = 10000;  ///< Events that log() keeps; older ones are dropped.
+    /// Called for each event on the serving thread, before the next byte is looked at. It must not
+    /// throw and not call start(), stop() or wait().
+    std::function<void(const LineEvent&)> trace{};
+};
+
+/// Serves one line on a thread of its own. Memory, faults and log outlive stop() and start().
+/// Threads: start(), stop() and wait() belong to one thread; all else may be called from any.
+class Simulator {
+  public:
+    /// Errors: std::invalid_argument, see Slave; silenceMs 0.
+    explicit Simulator(SimulatorOptions options);
+    /// Stops.
+    ~Simulator();
+    Simulator(const Simulator&) = delete;
+    Simulator& operator=(const Simulator&) = delete;
+
+    /// Opens the line and serves it; on return a master may open path(). Also after stop() and
+    /// after a hang-up, then usually with another device behind the link. Serving already: nothing.
+    /// Errors: std::system_error when the pseudo terminal, the link or the thread fails.
+    void start();
+
+    /// Ends serving, also in the middle of a reply, and closes the line: the port vanishes.
+    void stop();
+
+    /// Asks for the end without waiting for it; wait() returns. Safe in a signal handler.
+    void requestStop() noexcept;
+
+    enum class End : std::uint8_t { stopped, hungUp };
+
+    /// Blocks until requestStop() or a hang-up has ended serving, then cleans up as stop() does.
+    End wait();
+
+    /// The path that a master opens, also after the end; empty before the first start().
+    std::string path() const;
+    /// The device itself, /dev/pts/N; empty before the first start().
+    std::string device() const;
+    Mode mode() const { return options_.mode; }
+
+    /// The nodes: values to look at or to change while serving.
+    Slave& slave() { return slave_; }
+    const Slave& slave() const { return slave_; }
+
+    /// Faults for the coming requests.
+    FaultQueue& faults() { return faults_; }
+
+    /// @return the events so far, oldest first.
+    std::vector<LineEvent> log() const;
+    void clearLog();
+    /// Blocks until log() holds `count` events. @return false when the time ran out first.
+    bool waitForEvents(std::size_t count, std::chrono::milliseconds timeout) const;
+
+  private:
+    using Clock = std::chrono::steady_clock;
+
+    enum class Wake : std::uint8_t { time, bytes, stop };
+    Wake waitFor(Clock::time_point deadline, bool bytesToo) const;
+    void serve();
+    void serveFrames(FrameSplitter& splitter);
+    void handle(const Received& frame);
+    std::optional<Bytes> replyTo(const Received& frame, std::optional<Fault>& fault);
+    void send(const Transmission& transmission);
+    bool drip(const Transmission& transmission, Bytes& sent);
+    void record(LineEvent::Kind kind, Bytes raw);
+    void endLine();
+
+    SimulatorOptions options_;
+    Slave slave_;
+    FaultQueue faults_;
+    Descriptor stopEvent_;
+    std::unique_ptr<PtyLine> line_;
+    std::thread thread_;
+    bool lineEnded_ = false;  // The serving thread's: a hang-up or a stop was met.
+    bool hungUp_ = false;     // Written by the serving thread, read after the join.
+
+    mutable std::mutex mutex_;  // Guards what follows.
+    mutable std::condition_variable eventAdded_;
+    std::string path_;
+    std::string device_;
+    std::deque<LineEvent> log_;
+};
+
+}  // namespace sim
