@@ -3,6 +3,7 @@
 
 #include <list>
 #include <string>
+#include <vector>
 
 #include "platform/IProtocol.h"
 
@@ -14,7 +15,7 @@ class TagBase;
 /// Threads: no locking here; see IProtocol.
 class ProtocolBase : public IProtocol7 {
   public:
-    ProtocolBase() = default;
+    ProtocolBase();
     ~ProtocolBase() override;
     ProtocolBase(const ProtocolBase&) = delete;
     ProtocolBase& operator=(const ProtocolBase&) = delete;
@@ -131,8 +132,11 @@ class ProtocolBase : public IProtocol7 {
   private:
     bool arrayItemInRange(const ITag* tag, int index);
     int refuseEvents();
-    void commandRead(const std::string& uri, char* answer, int size);
-    void commandWrite(const std::string& uri, const std::string& hex, char* answer, int size);
+    int runCommand(const std::vector<std::string>& words, char* answer, int size);
+    int commandInfo(char* answer, int size) const;
+    int commandRead(const std::string& uri, char* answer, int size);
+    int commandWrite(const std::string& uri, const std::string& hex, char* answer, int size);
+    const char* writeHex(const ITag* tag, const std::string& hex);
 
     std::list<ITag*> tags_;
     int lastError_ = 1;

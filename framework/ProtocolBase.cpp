@@ -1,0 +1,227 @@
+// Identity, error state, ownership of tags and the fields of a tag URI.
+#include "framework/ProtocolBase.h"
+
+#include <sys/time.h>
+
+#include <algorithm>
+#include <charconv>
+#include <cstring>
+#include <new>
+
+#include "framework/DataTypes.h"
+#include "framework/HostServicePointers.h"
+#include "framework/TagBase.h"
+
+namespace {
+
+/// Room for every usual error text, so that a failure does not move the text that another thread
+/// may be looking at.
+constexpr std::size_t kErrorTextRoom = 256;
+
+constexpr int kProtocolBaseVersion = 100;
+
+constexpr const char* kEveryFace[] = {"ProtocolBase", "IProtocol7", "IProtocol6", "IProtocol5",
+                                      "IProtocol4",   "IProtocol3", "IProtocol2", "IProtocol"};
+
+const char* orEmpty(const char* text) {
+    return text != nullptr ? text : "";
+}
+
+bool equalTexts(const char* a, const char* b) {
+    return a != nullptr && b != nullptr && std::strcmp(a, b) == 0;
+}
+
+/// Writes into the caller's buffer until it is full. Like a stream, it goes bad at the first null
+/// text and swallows whatever follows.
+class InfoWriter {
+  public:
+    InfoWriter(char* out, int size) : out_(out), size_(size) {}
+
+    InfoWriter& operator<<(const char* text) {
+        if (text == nullptr) bad_ = true;
+        if (!bad_) append(text, std::strlen(text));
+        return *this;
+    }
+
+    InfoWriter& operator<<(int number) {
+        char digits[16];
+        const std::to_chars_result end = std::to_chars(digits, digits + sizeof digits, number);
+        if (!bad_) append(digits, static_cast<std::size_t>(end.ptr - digits));
+        return *this;
+    }
+
+    int written() const { return written_; }
+
+  private:
+    void append(const char* text, std::size_t length) {
+        if (written_ >= size_) return;
+        const std::size_t count = std::min(length, static_cast<std::size_t>(size_ - written_));
+        std::memcpy(out_ + written_, text, count);
+        written_ += static_cast<int>(count);
+    }
+
+    char* out_;
+    int size_;
+    int written_ = 0;
+    bool bad_ = false;
+};
+
+/// @return the first character of the next field, or null when `field` is the last one.
+const char* nextField(const char* field) {
+    const char* mark = std::strchr(field, '?');
+    return mark != nullptr ? mark + 1 : nullptr;
+}
+
+}  // namespace
+
+ProtocolBase::ProtocolBase() {
+    lastErrorText_.reserve(kErrorTextRoom);
+}
+
+ProtocolBase::~ProtocolBase() {
+    DeleteTags();
+}
+
+void* ProtocolBase::ConvertTo(const char* name) {
+    const bool known =
+        std::any_of(std::begin(kEveryFace), std::end(kEveryFace),
+                    [name](const char* face) { return CompareInterface(name, face); });
+    return known ? this : nullptr;
+}
+
+ITag* ProtocolBase::CreateTag(const char* uri) {
+    ITag* tag = CreateTagBase(uri);
+    if (tag == nullptr) return nullptr;
+    try {
+        tags_.push_back(tag);
+    } catch (const std::bad_alloc&) {
+        delete tag;
+        SetError(-1, "Out of memory");
+        return nullptr;
+    }
+    return tag;
+}
+
+void ProtocolBase::FreeTag(ITag* tag) {
+    tags_.remove(tag);
+    delete tag;
+}
+
+void ProtocolBase::DeleteTags() {
+    for (ITag* tag : tags_)
+        delete tag;
+    tags_.clear();
+}
+
+int ProtocolBase::Start() {
+    return 1;
+}
+
+int ProtocolBase::Stop() {
+    return 1;
+}
+
+const char* ProtocolBase::GetNextInstanceName() const {
+    return GetName();
+}
+
+const unsigned char* ProtocolBase::GetXml() const {
+    return nullptr;
+}
+
+bool ProtocolBase::IsConverted() const {
+    return false;
+}
+
+const char* ProtocolBase::GetIdent() const {
+    return ident_.empty() ? GetName() : ident_.c_str();
+}
+
+void ProtocolBase::SetIdent(const char* ident) {
+    ident_ = orEmpty(ident);
+}
+
+int ProtocolBase::GetLastError() const {
+    return lastError_;
+}
+
+const char* ProtocolBase::GetLastErrorString() const {
+    return lastErrorText_.c_str();
+}
+
+void ProtocolBase::SetError(int code, const char* text) {
+    lastError_ = code;
+    try {
+        lastErrorText_ = orEmpty(text);
+    } catch (const std::bad_alloc&) {
+        lastErrorText_.assign(text, lastErrorText_.capacity());  // what fits is better than nothing
+    }
+}
+
+void ProtocolBase::SetTagError(const TagBase* tag) {
+    try {
+        const std::string text =
+            std::string("Tag URI error: ") + orEmpty(tag->GetVarName()) + " - " + tag->GetError();
+        SetError(-1, text.c_str());
+    } catch (const std::bad_alloc&) {
+        SetError(-1, "Out of memory");
+    }
+}
+
+int ProtocolBase::GetInfo(char* buffer, int size) const {
+    InfoWriter info(buffer, size);
+    info << "Protocol: " << GetName() << " (" << GetProtocolType() << ") v." << GetProtocolVersion()
+         << "\n";
+    info << "Implementation: " << GetImpName() << " v." << GetImpVersion() << "\n";
+    info << "ProtocolBase v." << kProtocolBaseVersion << "\n";
+    info << "ProtLib v." << ProtUtilsN::GetVersion() << "\n";
+    if (IsConverted()) return info.written();
+
+    for (const IInterface* service : {piMultiTask, piSerialFactory, piSocketFactory}) {
+        if (service == nullptr) continue;
+        info << service->GetImpName() << " v." << service->GetImpVersion() << "\n";
+    }
+    return info.written();
+}
+
+const char* const* ProtocolBase::tagUriNames() const {
+    static constexpr const char* kNoNames[] = {nullptr};
+    return kNoNames;
+}
+
+int ProtocolBase::getTagUriFieldCount() const {
+    int count = 0;
+    for (const char* const* name = tagUriNames(); *name != nullptr; ++name)
+        ++count;
+    return count;
+}
+
+const char* ProtocolBase::getTagUriFieldName(int index) const {
+    if (index < 0 || index >= getTagUriFieldCount()) return nullptr;
+    return tagUriNames()[index];
+}
+
+int ProtocolBase::getTagUriFieldPosition(const char* name) const {
+    const char* const* names = tagUriNames();
+    for (int index = 0; names[index] != nullptr; ++index) {
+        if (equalTexts(names[index], name)) return index;
+    }
+    return -1;
+}
+
+const char* ProtocolBase::getTagUriField(const ITag* tag, int index, int* length) const {
+    if (index < 0) return nullptr;
+    const char* field = tag->GetVarName();
+    for (int skipped = 0; field != nullptr && skipped < index; ++skipped)
+        field = nextField(field);
+    if (field == nullptr) return nullptr;
+    *length = static_cast<int>(std::strcspn(field, "?"));
+    return field;
+}
+
+unsigned long long currentTimeStamp() {
+    timeval now{};
+    gettimeofday(&now, nullptr);
+    return static_cast<unsigned long long>(now.tv_sec) * 1000ULL +
+           static_cast<unsigned long long>(now.tv_usec) / 1000ULL;
+}
