@@ -7,6 +7,10 @@
 
 namespace ProtUtilsN {
 
+/// The six white-space characters and the ten digits of the "C" locale, whatever the host's is.
+bool IsWhiteSpace(char c);
+bool IsDecimalDigit(char c);
+
 /// Removes blanks and tabs (no other white space) from both ends.
 void Trim(std::string& text);
 std::string GetTrim(const std::string& text);
@@ -24,6 +28,8 @@ bool GetConfigValue(const char* text, const char* key, std::string& value);
 /// fit; no digits read as 0; a number beyond 32 bits reads as the nearest 32-bit one, on every
 /// architecture.
 std::int32_t ParseInteger(const char* text);
+/// The same with base 10, whatever the prefix.
+std::int32_t ParseDecimal(const char* text);
 
 /// Copies `text` into `out` the way strncpy() does: at most `size` bytes, the rest filled with
 /// zeroes, unterminated when the text has `size` bytes or more. A `size` below 1 writes nothing.

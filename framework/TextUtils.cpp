@@ -1,0 +1,111 @@
+// Small text utilities: trimming, splitting, key look-up, integers and bounded copies.
+#include "framework/TextUtils.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <cstring>
+#include <limits>
+#include <string_view>
+
+namespace ProtUtilsN {
+
+namespace {
+
+constexpr std::string_view kTrimmed = " \t";
+
+bool isLetterOrDigit(char c) {
+    return IsDecimalDigit(c) || (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
+}
+
+// strtol() has 64 bits on one architecture and 32 on the other: the clamp makes both agree.
+std::int32_t parseClamped(const char* text, int base) {
+    using Limits = std::numeric_limits<std::int32_t>;
+    const long value = std::strtol(text, nullptr, base);
+    return static_cast<std::int32_t>(std::clamp<long>(value, Limits::min(), Limits::max()));
+}
+
+// Chosen here, since newer libraries read "0b1" as a binary number when strtol() chooses.
+int baseOf(const char* text) {
+    while (IsWhiteSpace(*text)) {
+        ++text;
+    }
+    if (*text == '+' || *text == '-') ++text;
+    if (*text != '0') return 10;
+    return text[1] == 'x' || text[1] == 'X' ? 16 : 8;
+}
+
+}  // namespace
+
+bool IsWhiteSpace(char c) {
+    return c == ' ' || (c >= '\t' && c <= '\r');
+}
+
+bool IsDecimalDigit(char c) {
+    return c >= '0' && c <= '9';
+}
+
+void Trim(std::string& text) {
+    const std::size_t last = text.find_last_not_of(kTrimmed);
+    text.erase(last == std::string::npos ? 0 : last + 1);
+    text.erase(0, text.find_first_not_of(kTrimmed));
+}
+
+std::string GetTrim(const std::string& text) {
+    std::string trimmed = text;
+    Trim(trimmed);
+    return trimmed;
+}
+
+void ParseSubstrings(const std::string& text, std::vector<std::string>& pieces, char delimiter) {
+    std::size_t start = 0;
+    for (;;) {
+        const std::size_t end = text.find(delimiter, start);
+        pieces.push_back(GetTrim(text.substr(start, end - start)));
+        if (end == std::string::npos) return;
+        start = end + 1;
+    }
+}
+
+bool GetConfigValue(const char* text, const char* key, std::string& value) {
+    const std::string item = std::string(key) + "=";
+    const char* start = std::strstr(text, item.c_str());
+    if (start == nullptr) return false;
+
+    start += item.size();
+    const char* end = start;
+    while (isLetterOrDigit(*end)) {
+        ++end;
+    }
+    value.assign(start, end);
+    return true;
+}
+
+std::int32_t ParseInteger(const char* text) {
+    return parseClamped(text, baseOf(text));
+}
+
+std::int32_t ParseDecimal(const char* text) {
+    return parseClamped(text, 10);
+}
+
+void CopyBounded(char* out, const char* text, int size) {
+    if (size < 1) return;
+    std::strncpy(out, text, static_cast<std::size_t>(size));
+}
+
+}  // namespace ProtUtilsN
+
+char* itoa(int value, char* buffer, int base) {
+    const auto divisor = static_cast<unsigned>(base);
+    auto rest = static_cast<unsigned>(value);
+    char* end = buffer;
+    do {
+        const unsigned digit = rest % divisor;
+        const char zero = base == 16 && digit > 9 ? 'a' - 10 : '0';
+        *end++ = static_cast<char>(static_cast<unsigned>(zero) + digit);
+        rest /= divisor;
+    } while (rest != 0);
+    *end = '\0';
+    std::reverse(buffer, end);
+    return buffer;
+}
