@@ -1,0 +1,94 @@
+// The permanent storage: an SQLite database in one file.
+#pragma once
+
+#include <memory>
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include "runtime/Result.h"
+#include "runtime/Storage.h"
+
+namespace runtime {
+
+/// Why a storage file could not be opened.
+enum class StorageFault {
+    NoDirectory,  ///< A directory on the way is missing and can't be made, or is none.
+    CannotOpen,   ///< The file can't be created or opened.
+    Damaged,      ///< The file is no database, or one that fails its integrity check.
+    Foreign,      ///< A sound database, but not a storage of this run time.
+    Newer,        ///< A storage with a layout that a later version wrote.
+};
+
+struct StorageError {
+    StorageFault fault;
+    std::string text;  ///< One line for a person; names the file.
+};
+
+/// The default place: "$XDG_STATE_HOME/mrtu/overrides.db", else
+/// "$HOME/.local/state/mrtu/overrides.db". A variable that is unset, empty or not an absolute path
+/// does not count. Empty when neither does.
+std::string defaultStoragePath();
+/// The same from given values; null for an unset variable.
+std::string storagePathFrom(const char* xdgStateHome, const char* home);
+
+/// A value whose write has returned without a failure survives the death of the process and of
+/// the system. Several processes may use one file at a time. docs/storage.md shows the layout.
+class SqliteStorage final : public Storage {
+  public:
+    /// Opens the file, and creates it (mode 0600) with the directories that are missing on the way
+    /// (mode 0700) when it does not exist. A file that is there and is not a sound storage is left
+    /// as it is. One that may not be written is opened for reading: readOnly() tells, and writes
+    /// fail.
+    /// @param busyTimeoutMs  How long an operation waits for another process's write.
+    static Result<std::unique_ptr<SqliteStorage>, StorageError> open(
+        const std::string& path, int busyTimeoutMs = kBusyTimeoutMs);
+
+    ~SqliteStorage() override;
+    SqliteStorage(const SqliteStorage&) = delete;
+    SqliteStorage& operator=(const SqliteStorage&) = delete;
+
+    bool readOnly() const;
+    const std::string& path() const { return path_; }
+
+    void writeString(const char* section, const char* key, const char* value) override;
+    void writeBool(const char* section, const char* key, bool value) override;
+    void writeInt(const char* section, const char* key, int value) override;
+    const char* readString(const char* section, const char* key) override;
+    bool readBool(const char* section, const char* key) override;
+    int readInt(const char* section, const char* key) override;
+    int hasKey(const char* section, const char* key) override;
+    void removeKey(const char* section, const char* key) override;
+    int keyCount(const char* section) override;
+    const char* keyName(const char* section, int index) override;
+    int readStringInto(const char* section, const char* key, char* buffer, int size) override;
+    int keyNameInto(const char* section, int index, char* buffer, int size) override;
+
+    bool failed() const override;
+    std::string lastError() const override;
+    void clearFailure() override;
+    std::vector<std::string> sections() override;
+    std::vector<StoredEntry> entries(const std::string& section) override;
+
+    void* ConvertTo(const char* name) override;
+    const char* GetImpName() const override { return "runtime::SqliteStorage"; }
+    int GetImpVersion() const override { return 100; }
+
+    static constexpr int kBusyTimeoutMs = 5000;
+
+  private:
+    class Database;
+    SqliteStorage(std::unique_ptr<Database> database, std::string path);
+
+    void write(const char* section, const char* key, const StoredValue& value);
+    bool find(const char* section, const char* key, StoredValue& value);
+    bool findName(const char* section, int index, std::string& name);
+    void fail(const std::string& what);
+
+    mutable std::mutex mutex_;
+    std::unique_ptr<Database> database_;
+    std::string path_;
+    std::string failure_;
+};
+
+}  // namespace runtime
