@@ -32,7 +32,7 @@ class Message {
     /// REQUIRES: room for the byte, see fits().
     void put(std::uint8_t byte) { bytes_[static_cast<std::size_t>(length_++)] = byte; }
     void putWord(std::uint16_t word);
-    bool fits(int count) const { return count >= 0 && count <= kMaxMessage - length_; }
+    bool fits(long long count) const { return count >= 0 && count <= kMaxMessage - length_; }
 
     ByteView view() const { return {bytes_.data(), static_cast<std::size_t>(length_)}; }
     std::uint8_t operator[](std::size_t index) const { return bytes_[index]; }

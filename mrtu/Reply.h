@@ -16,7 +16,7 @@ struct Fault {
 };
 
 inline constexpr Fault kNoFault{};
-inline constexpr Fault kGeneralPort{-1, "Can't open serial port"};
+inline constexpr Fault kCannotOpen{-1, "Can't open serial port"};
 inline constexpr Fault kNotStarted{-3, "Protocol not started"};
 inline constexpr Fault kNoResponse{-4, "No response"};
 inline constexpr Fault kTooShort{-6, "The received message too short"};
@@ -42,7 +42,7 @@ struct Reply {
 Fault checkCommon(const Message& request, const Reply& reply);
 
 /// Length of the frame and byte count, for `dataLength` bytes of data.
-Fault checkReadBody(const Reply& reply, int dataLength);
+Fault checkReadBody(const Reply& reply, long long dataLength);
 
 /// Start address, and echoed value (functions 5 and 6) or count (15 and 16).
 Fault checkWriteBody(const Message& request, const Reply& reply);
