@@ -21,6 +21,15 @@ enum class DriverArea : std::uint8_t {
     apply,         // "SP_Done"
 };
 
+/// How an area's write function code is chosen.
+enum class WriteChoice : std::uint8_t {
+    keep,       ///< The tag keeps what it has.
+    never,      ///< 0: the area cannot be written.
+    coils,      ///< 15, or 5 after the node's forceFunction.
+    registers,  ///< 16, or 6 after the node's presetFunction.
+    single,     ///< 6, whatever the node says.
+};
+
 /// One memory type; index ranges in the order of the models "1" to "4".
 struct MemoryRow {
     struct Range {
@@ -28,18 +37,19 @@ struct MemoryRow {
         std::int32_t max;
     };
     std::string_view name;
-    ICU_Type naturalType;
-    std::uint32_t icomTypes;
-    bool bitRead;
-    bool bitWrite;
-    bool bitArrayWrite;
-    bool readOnly;
-    std::int32_t blockReadCount;
-    std::int32_t blockWriteCount;
-    bool enronOnly;  ///< Offered by the models "3" and "4" only.
-    std::array<Range, 4> ranges;
-    std::uint8_t readFunction;  ///< 0: keeps what the tag has.
-    DriverArea area;
+    ICU_Type naturalType = ICU_Type::none;
+    std::uint32_t icomTypes = 0;
+    std::array<Range, 4> ranges{};
+    std::int32_t blockReadCount = 0;
+    std::int32_t blockWriteCount = 0;
+    bool bitRead = false;
+    bool bitWrite = false;
+    bool bitArrayWrite = false;
+    bool readOnly = false;
+    bool enronOnly = false;         ///< Offered by the models "3" and "4" only.
+    std::uint8_t readFunction = 0;  ///< Modbus function code; 0: the tag keeps what it has.
+    WriteChoice write = WriteChoice::keep;
+    DriverArea area = DriverArea::none;
 };
 
 extern const std::array<MemoryRow, 12> memoryRows;
