@@ -36,7 +36,7 @@ struct CommonParams {
     std::string uart;
     int baudrate = 0;
     std::string parity;
-    int bits = 0;  ///< Not read when txMode is exactly "RTU".
+    int bits = 0;  ///< Not read when the text says txMode=RTU; required when it leaves txMode out.
     int stopbits = 0;
     std::string mode;
 

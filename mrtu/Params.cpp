@@ -1,0 +1,135 @@
+#include "mrtu/Params.h"
+
+#include <algorithm>
+#include <limits>
+
+namespace _MRTU {
+
+namespace {
+
+constexpr int kWideNode = -1;
+constexpr bool kRequired = false;
+constexpr bool kOptional = true;
+
+constexpr int kMaxRegisterBytes = 250;
+constexpr int kMaxBits = 2000;
+
+/// Reads one parameter after another until one fails.
+class Reader {
+  public:
+    Reader(CfgParser& parser, int node, int flags, std::string& error)
+        : parser_(parser), node_(node), flags_(flags), error_(error) {}
+
+    template <class Value>
+    bool required(const char* name, Value& value) {
+        return readParam(parser_, name, node_, value, flags_, kRequired, error_);
+    }
+
+    template <class Value>
+    bool optional(const char* name, Value& value, const Value& fallback) {
+        value = fallback;
+        return readParam(parser_, name, node_, value, flags_, kOptional, error_);
+    }
+
+    /// An optional length: a negative one is refused, one above the limit is lowered to it.
+    bool length(const char* name, int& value, int limit) {
+        if (!optional(name, value, limit)) return false;
+        if (value < 0) {
+            error_ = std::string("parameter '") + name + "' out of range";
+            return false;
+        }
+        value = std::min(value, limit);
+        return true;
+    }
+
+  private:
+    CfgParser& parser_;
+    int node_;
+    int flags_;
+    std::string& error_;
+};
+
+/// Whether the text itself says "RTU". The default does not count: a configuration that leaves
+/// txMode out still has to give "bits".
+bool saysRtu(CfgParser& parser) {
+    std::string txMode;
+    const auto result = parser.getParam("txMode", kWideNode, txMode, CfgParser::commonOnly);
+    return result == CfgParser::found && txMode == "RTU";
+}
+
+}  // namespace
+
+bool NodeParams::parse(CfgParser& parser, int node, std::string& error) {
+    Reader readOwn(parser, node, CfgParser::nodeOnly, error);
+    Reader read(parser, node, CfgParser::anyPlace, error);
+    const bool ok = readOwn.optional("prefix", prefix, std::string()) &&  //
+                    read.required("defNodeId", defNodeId) &&              //
+                    read.optional("timeout", timeout, 2000) &&            //
+                    read.optional("delay", delay, 0) &&                   //
+                    read.optional("repeat", repeat, 2) &&                 //
+                    read.length("maxOptLen", maxOptLen, kMaxRegisterBytes) &&
+                    read.length("maxBitOptLen", maxBitOptLen, kMaxBits) &&
+                    read.optional("presetFunction", presetFunction, std::string("16")) &&
+                    read.optional("forceFunction", forceFunction, std::string("15")) &&
+                    read.optional("model", model, std::string("1"));
+    if (!ok) return false;
+    if (model != "1" && model != "3") oneBased = false;
+    return true;
+}
+
+bool CommonParams::parse(CfgParser& parser, std::string& error) {
+    Reader read(parser, kWideNode, CfgParser::commonOnly, error);
+    return read.optional("txMode", txMode, std::string("RTU")) &&  //
+           read.required("uart", uart) &&                          //
+           read.required("baudrate", baudrate) &&                  //
+           read.required("parity", parity) &&                      //
+           (saysRtu(parser) || read.required("bits", bits)) &&     //
+           read.required("stopbits", stopbits) &&                  //
+           read.required("mode", mode);
+}
+
+int maxTransactionTime(const NodeParams& node) {
+    const long long product = static_cast<long long>(node.timeout) * node.repeat;
+    constexpr long long kLowest = std::numeric_limits<int>::min();
+    constexpr long long kHighest = std::numeric_limits<int>::max();
+    return static_cast<int>(std::clamp(product, kLowest, kHighest));
+}
+
+bool ParamManager::parse(const char* text) {
+    CfgParser parser(text);
+    if (!parser.KnownFormat()) {
+        lastError_ = "Parser: unknown format";
+        return false;
+    }
+    NodeParams wide;
+    wide.oneBased = wide_.oneBased;
+    if (!wide.parse(parser, kWideNode, lastError_)) return false;
+    int maxTm = std::max(0, maxTransactionTime(wide));
+
+    std::vector<NodeParams> nodes;
+    for (int index = 0; index < parser.GetNodeCount(); ++index) {
+        NodeParams node = wide;
+        node.nodeId = parser.GetNodeID(index);
+        if (!node.parse(parser, node.nodeId, lastError_)) return false;
+        maxTm = std::max(maxTm, maxTransactionTime(node));
+        nodes.push_back(std::move(node));
+    }
+
+    CommonParams common;
+    if (!common.parse(parser, lastError_)) return false;
+
+    nodes_ = std::move(nodes);
+    wide_ = std::move(wide);
+    common_ = std::move(common);
+    maxTm_ = maxTm;
+    return true;
+}
+
+const NodeParams* ParamManager::getNodeParams(int node) const {
+    const auto named = std::find_if(nodes_.begin(), nodes_.end(), [node](const NodeParams& params) {
+        return params.nodeId == node;
+    });
+    return named != nodes_.end() ? &*named : &wide_;
+}
+
+}  // namespace _MRTU

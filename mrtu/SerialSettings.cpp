@@ -1,0 +1,73 @@
+#include "mrtu/SerialSettings.h"
+
+#include <algorithm>
+#include <array>
+#include <cstddef>
+
+namespace _MRTU {
+
+namespace {
+
+struct Word {
+    const char* text;
+    bool configurable;  ///< Codes that are not come from run-time overrides only.
+};
+
+// Row i stands for code i.
+constexpr std::array parityWords{Word{"none", true}, Word{"even", true}, Word{"odd", true},
+                                 Word{"mark", true}, Word{"space", false}};
+constexpr std::array modeWords{Word{"RS-232", true}, Word{"RS-485", true}, Word{"RS-422", true},
+                               Word{"RS-485P", false}};
+
+constexpr std::array listedBaudRates{150,  300,   600,   1200,  2400,  4800,
+                                     9600, 19200, 38400, 57600, 115200};
+
+template <std::size_t Count>
+int codeOf(const std::array<Word, Count>& words, std::string_view word) {
+    for (std::size_t code = 0; code < Count; ++code)
+        if (words[code].configurable && word == words[code].text) return static_cast<int>(code);
+    return -1;
+}
+
+template <std::size_t Count>
+const char* wordOf(const std::array<Word, Count>& words, int code) {
+    const bool known = code >= 0 && code < static_cast<int>(Count);
+    return words[known ? static_cast<std::size_t>(code) : 0].text;
+}
+
+char lowered(char letter) {
+    return letter >= 'A' && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
+}
+
+}  // namespace
+
+int interCharacterGap(int baud) {
+    // A rate of 0 cannot open a port; here it must not divide.
+    if (baud == 0) return 1;
+    const long long gap = (static_cast<long long>(baud) + 119999) / baud;
+    return gap > 0 ? static_cast<int>(gap) : 1;
+}
+
+int parityCode(std::string_view word) {
+    std::string lowerCase(word);
+    std::transform(lowerCase.begin(), lowerCase.end(), lowerCase.begin(), lowered);
+    return codeOf(parityWords, lowerCase);
+}
+
+int modeCode(std::string_view word) {
+    return codeOf(modeWords, word);
+}
+
+const char* parityWord(int code) {
+    return wordOf(parityWords, code);
+}
+
+const char* modeWord(int code) {
+    return wordOf(modeWords, code);
+}
+
+bool isListedBaudRate(int baud) {
+    return std::find(listedBaudRates.begin(), listedBaudRates.end(), baud) != listedBaudRates.end();
+}
+
+}  // namespace _MRTU
