@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdint>
+#include <string>
 
 #include "engine/ProtgenTag.h"
 #include "mrtu/MemoryMap.h"
@@ -44,7 +45,7 @@ class Tag_MRTU final : public ProtgenTag {
     bool refuse(const std::string& message);
     bool resolveArea(const Protocol_MRTU& protocol, const std::string& node,
                      const std::string& area);
-    bool checkType() const;
+    bool resolveType(const std::string& text);
 
     const _MRTU::NodeParams* nodeParams_ = nullptr;
     const _MRTU::CommonParams* commonParams_ = nullptr;

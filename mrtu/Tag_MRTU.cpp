@@ -1,0 +1,136 @@
+#include "mrtu/Tag_MRTU.h"
+
+#include <array>
+#include <limits>
+#include <string>
+#include <vector>
+
+#include "framework/DataTypes.h"
+#include "framework/TextUtils.h"
+#include "mrtu/Protocol_MRTU.h"
+
+using _MRTU::DriverArea;
+using _MRTU::WriteChoice;
+
+namespace {
+
+// What is wrong when a field is empty, in the order of the URI.
+constexpr std::array missingField{
+    "nodeID field missing",
+    "memorytype field missing",
+    "subIndex field missing",
+    "icomType field missing",
+};
+
+bool isZeroBased(const Model& model) {
+    return model.getName() == "2" || model.getName() == "4";
+}
+
+}  // namespace
+
+Tag_MRTU::Tag_MRTU(const char* uri, const char* const* fieldNames) : ProtgenTag(uri, fieldNames) {}
+
+ITag* Tag_MRTU::Clone() const {
+    return new Tag_MRTU(*this);
+}
+
+bool Tag_MRTU::refuse(const std::string& message) {
+    SetError(message.c_str());
+    return false;
+}
+
+bool Tag_MRTU::parseTagUrl(Protocol_MRTU* protocol) {
+    std::vector<std::string> fields;
+    ProtUtilsN::ParseSubstrings(GetVarName(), fields, '?');
+    if (fields.size() != missingField.size())
+        return refuse("there must be 4 tag specification fields");
+    for (std::size_t index = 0; index < missingField.size(); ++index)
+        if (fields[index].empty()) return refuse(missingField[index]);
+
+    if (!resolveArea(*protocol, fields[0], fields[1])) return false;
+    if (!resolveType(fields[3])) return false;
+    if (driverArea_ == DriverArea::nodeOverride && GetVarType() != ICU_Type::unsignedByte)
+        return refuse("invalid access to node override");
+    if (!normalizeModbusOffset()) return refuse("invalid offset for this memory type");
+    getCodes();
+
+    if ((ProtUtilsN::GetTypeFlag(GetVarType()) & memoryType()->getIcomTypes()) == 0)
+        return refuse("not allowed icom type");
+    if (ProtUtilsN::GetDataLength(memoryType()->getNaturalType()) == 0)
+        return refuse("invalid natural data type for this memory type");
+    return true;
+}
+
+bool Tag_MRTU::resolveArea(const Protocol_MRTU& protocol, const std::string& node,
+                           const std::string& area) {
+    const _MRTU::ParamManager& params = *protocol.getParamManager();
+    commonParams_ = params.getCommonParams();
+    if (commonParams_ == nullptr) return refuse("Can't access protocol common parameters");
+
+    setNodeId(ProtUtilsN::ParseInteger(node.c_str()));
+    nodeParams_ = params.getNodeParams(nodeId());
+    if (nodeParams_ == nullptr) return refuse("Can't access protocol node parameters");
+
+    const MemoryManager& memory = *protocol.getMemoryManager();
+    setModel(memory.getModel(nodeParams_->model));
+    if (model() == nullptr) return refuse("Can't access model");
+
+    setMemoryType(memory.getMemoryType(model()->getName(), area));
+    if (memoryType() == nullptr) return refuse("Can't access memory type");
+
+    const _MRTU::MemoryRow* row = _MRTU::memoryRow(memoryType()->nameRef());
+    driverArea_ = row != nullptr ? row->area : DriverArea::none;
+    return true;
+}
+
+bool Tag_MRTU::resolveType(const std::string& text) {
+    ICU_Type type{};
+    ICU_Type itemType{};
+    int length = 0;
+    std::vector<std::string> conversions;
+    if (!ProtUtilsN::GetICOMType(text, type, itemType, length, conversions))
+        return refuse(text + ": data type unknown");
+    setDataType(type, itemType, length, std::move(conversions));
+    return true;
+}
+
+bool Tag_MRTU::normalizeModbusOffset() {
+    // The declared index range of "NO" is 0..1, yet only index 0 can be addressed.
+    if (driverArea_ != DriverArea::none) return offset() == 0;
+
+    const _MRTU::AddressRange* range = _MRTU::addressRange(memoryType()->nameRef());
+    if (range == nullptr) return false;
+    const bool asWritten = range->name == "LONG";
+    const bool shifted = isZeroBased(*model()) && !asWritten;
+    if (shifted && offset() < std::numeric_limits<int>::max()) setOffset(offset() + 1);
+
+    if (offset() >= range->shortMin && offset() <= range->shortMax)
+        setOffset(offset() - range->shortMin);
+    else if (offset() >= range->longMin && offset() <= range->longMax)
+        setOffset(offset() - range->longMin);
+    else
+        return false;
+    return true;
+}
+
+void Tag_MRTU::getCodes() {
+    const _MRTU::MemoryRow* row = _MRTU::memoryRow(memoryType()->nameRef());
+    if (row == nullptr || row->readFunction == 0) return;
+    readFunction_ = row->readFunction;
+    switch (row->write) {
+        case WriteChoice::keep:
+            break;
+        case WriteChoice::never:
+            writeFunction_ = 0;
+            break;
+        case WriteChoice::coils:
+            writeFunction_ = nodeParams_->forceFunction == "15" ? 15 : 5;
+            break;
+        case WriteChoice::registers:
+            writeFunction_ = nodeParams_->presetFunction == "16" ? 16 : 6;
+            break;
+        case WriteChoice::single:
+            writeFunction_ = 6;
+            break;
+    }
+}
