@@ -1,6 +1,11 @@
 // The Modbus master for serial lines.
 #pragma once
 
+#include <atomic>
+#include <cstdint>
+#include <string>
+#include <vector>
+
 #include "engine/ProtgenProtocol.h"
 #include "framework/AddressReplacer.h"
 #include "framework/MemoryManager.h"
@@ -56,39 +61,44 @@ class Protocol_MRTU : public ProtgenProtocol {
 
   private:
     class LineLock;
-    struct Attempt;
 
     int fail(const _MRTU::Fault& fault);
 
-    // Start
+    // The line, held between Start() and Stop()
     void applySerialOverrides();
     bool openPort();
     void releasePort();
     bool configurePort();
 
-    // Transactions
+    // One exchange with a slave. REQUIRES: the line lock is held, except for pauseBefore().
     void pauseBefore(const Tag_MRTU& tag) const;
-    std::uint16_t lineAddress(const Tag_MRTU& tag, int index);
     bool modiconMode(const Tag_MRTU& tag);
+    std::uint16_t lineAddress(const Tag_MRTU& tag, int index);
     std::uint8_t lineNode(const Tag_MRTU& tag) const;
     _MRTU::Fault exchange(const Tag_MRTU& tag, const _MRTU::Message& request, _MRTU::Reply& reply);
     void flushInput();
-    Attempt attempt(const _MRTU::Frame& frame, int timeoutMs, bool ascii, _MRTU::Reply& reply);
+    int receiveReply(const _MRTU::NodeParams& node, bool ascii, _MRTU::Reply& reply,
+                     bool& accepted);
 
+    // Reads and writes of device areas
     _MRTU::Fault readItems(const Tag_MRTU& tag, int index, unsigned char* data, int count);
-    _MRTU::Fault readTransaction(const Tag_MRTU& tag, int index, int count, int dataLength,
-                                 _MRTU::Reply& reply);
     int writeItems(const Tag_MRTU* tag, int index, const unsigned char* data, int count);
-    _MRTU::Fault writeTransaction(const Tag_MRTU& tag, int index, const unsigned char* data,
-                                  int count);
+    _MRTU::Fault writeRequest(const Tag_MRTU& tag, int index, const unsigned char* data, int count);
 
     // The driver's own areas
-    bool readDriverArea(const Tag_MRTU& tag, unsigned char* data);
+    void readDriverArea(const Tag_MRTU& tag, unsigned char* data);
     bool writeDriverArea(const Tag_MRTU& tag, const unsigned char* data);
-    int serialValue(const char* name, int current);
+    void setModiconMode(int node, bool on);
+    bool stage(const char* name, int value, bool allowed);
     void applyStaged();
+    int serialValue(const char* name, int current);
 
-    bool started_ = false;
+    // Console commands
+    int commandHelp(const char* command, char* answer, int size);
+    void commandSetId(const std::vector<std::string>& words, char* answer, int size);
+    void commandGetId(char* answer, int size) const;
+
+    std::atomic<bool> started_ = false;
     _MRTU::ParamManager params_;
     MemoryManager memoryManager_;
     _MRTU::SerialSettings line_;
@@ -100,3 +110,6 @@ class Protocol_MRTU : public ProtgenProtocol {
     IMultiTask2* multiTask_;
     ILock* lock_;
 };
+
+/// @return a new protocol object, owned by the caller.
+IProtocol* CreateProtocol_MRTU();

@@ -1,0 +1,156 @@
+// The life of a protocol object: construction, configuration, start, stop, reports.
+#include "mrtu/Protocol_MRTU.h"
+
+#include <algorithm>
+#include <memory>
+
+#include "description/Description.h"
+#include "framework/HostServicePointers.h"
+#include "framework/TextUtils.h"
+#include "mrtu/LineLock.h"
+#include "mrtu/Tag_MRTU.h"
+
+namespace {
+
+constexpr _MRTU::Fault kParity{-1, "Parser: parameter 'parity' has invalid value"};
+constexpr _MRTU::Fault kMode{-1, "Parser: parameter 'mode' has invalid value"};
+
+constexpr const char* uriNames[] = {"nodeid", "memorytype", "arrayindex.subindex", "datatype",
+                                    nullptr};
+
+constexpr int kExtensionQuery = 0;
+constexpr int kKnownExtension = 3;
+
+}  // namespace
+
+IProtocol* CreateProtocol_MRTU() {
+    return new Protocol_MRTU;
+}
+
+Protocol_MRTU::Protocol_MRTU()
+    : serialFactory_(serviceAs<ISerialFactory>(piSerialFactory, "ISerialFactory")),
+      multiTask_(serviceAs<IMultiTask2>(piMultiTask, "IMultiTask2")),
+      lock_(multiTask_ != nullptr ? multiTask_->createLock(0) : nullptr) {
+    _MRTU::registerModels(memoryManager_);
+}
+
+Protocol_MRTU::~Protocol_MRTU() {
+    if (lock_ != nullptr) multiTask_->deleteLock(lock_);
+    if (port_ != nullptr) releasePort();
+}
+
+void* Protocol_MRTU::ConvertTo(const char* name) {
+    if (CompareInterface(name, "Protocol_MRTU")) return this;
+    return ProtgenProtocol::ConvertTo(name);
+}
+
+int Protocol_MRTU::fail(const _MRTU::Fault& fault) {
+    SetError(fault.code, fault.text);
+    return 0;
+}
+
+int Protocol_MRTU::Config(const char* text) {
+    if (!params_.parse(text)) return fail({-1, params_.getLastError()});
+
+    const _MRTU::CommonParams& common = *params_.getCommonParams();
+    const int parity = _MRTU::parityCode(common.parity);
+    if (parity < 0) return fail(kParity);
+    const int mode = _MRTU::modeCode(common.mode);
+    if (mode < 0) return fail(kMode);
+
+    line_.portName = common.uart;
+    line_.baud = common.baudrate;
+    line_.dataBits = common.isRtu() ? 8 : common.bits;
+    line_.stopBits = common.stopbits;
+    line_.parity = parity;
+    line_.mode = mode;
+    line_.gapMs = _MRTU::interCharacterGap(line_.baud);
+    return 1;
+}
+
+int Protocol_MRTU::Start() {
+    if (started_) return 1;
+    nodeOverrides_.restore(GetIdent());
+    overrides_.setSection(GetIdent());
+    applySerialOverrides();
+    if (!openPort()) return fail(_MRTU::kCannotOpen);
+    started_ = true;
+    return 1;
+}
+
+void Protocol_MRTU::applySerialOverrides() {
+    constexpr int kNoNode = -1;
+    overrides_.get("baud", kNoNode, line_.baud, line_.baud);
+    overrides_.get("parity", kNoNode, line_.parity, line_.parity);
+    overrides_.get("stop", kNoNode, line_.stopBits, line_.stopBits);
+    overrides_.get("mode", kNoNode, line_.mode, line_.mode);
+    line_.gapMs = _MRTU::interCharacterGap(line_.baud);
+}
+
+bool Protocol_MRTU::openPort() {
+    // No line runs at 0 baud, and a host's port may divide by it.
+    if (line_.baud == 0 || serialFactory_ == nullptr || lock_ == nullptr) return false;
+    port_ = serialFactory_->openPort(line_.portName.c_str());
+    if (port_ == nullptr) return false;
+    if (configurePort()) return true;
+    releasePort();
+    return false;
+}
+
+bool Protocol_MRTU::configurePort() {
+    return port_->configure(line_.baud, line_.parity, line_.dataBits, line_.stopBits, line_.mode) !=
+           0;
+}
+
+void Protocol_MRTU::releasePort() {
+    serialFactory_->releasePort(port_);
+    port_ = nullptr;
+}
+
+int Protocol_MRTU::Stop() {
+    if (!started_) return 1;
+    const LineLock lock(*this);
+    if (port_ != nullptr) releasePort();
+    started_ = false;
+    return 1;
+}
+
+int Protocol_MRTU::GetMaxTm(const ITag* tag) const {
+    if (tag == nullptr) return params_.getMaxTm();
+    return _MRTU::maxTransactionTime(*static_cast<const Tag_MRTU*>(tag)->nodeParams());
+}
+
+const unsigned char* Protocol_MRTU::GetXml() const {
+    return GetXml_MRTU();
+}
+
+ITag* Protocol_MRTU::CreateTagBase(const char* uri) {
+    auto tag = std::make_unique<Tag_MRTU>(uri != nullptr ? uri : "", tagUriNames());
+    if (tag->parseTagUrl(this)) return tag.release();
+    SetTagError(tag.get());
+    return nullptr;
+}
+
+const char* const* Protocol_MRTU::tagUriNames() const {
+    return uriNames;
+}
+
+int Protocol_MRTU::vcsGetComParams(char* text, int size) const {
+    const std::string report = line_.portName + ',' + std::to_string(line_.baud) + ',' +
+                               _MRTU::parityWord(line_.parity) + ',' +
+                               std::to_string(line_.dataBits) + ',' +
+                               std::to_string(line_.stopBits) + ',' + _MRTU::modeWord(line_.mode);
+    ProtUtilsN::CopyBounded(text, report.c_str(), size);
+    return 1;
+}
+
+int Protocol_MRTU::Extend(int code, void* data) {
+    if (data == nullptr) return 0;
+    auto& record = *static_cast<ExtensionRecord*>(data);
+    if (code == kExtensionQuery) {
+        std::fill(std::begin(record.flags), std::end(record.flags), std::uint8_t{0});
+        if (record.queryCode == kKnownExtension) record.flags[0] = 1;
+        return 1;
+    }
+    return code == kKnownExtension ? record.value : 0;
+}

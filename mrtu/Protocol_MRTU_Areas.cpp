@@ -1,0 +1,125 @@
+// The driver's own memory areas: overrides of node address, Modicon mode and line settings. They
+// never reach the line and are served without the line lock; the host orders such accesses.
+#include "framework/TextUtils.h"
+#include "mrtu/Protocol_MRTU.h"
+#include "mrtu/Tag_MRTU.h"
+
+using _MRTU::DriverArea;
+
+namespace {
+
+constexpr int kMaxParity = 4;
+constexpr int kMaxLineMode = 2;
+
+std::int32_t loadInt(const unsigned char* data) {
+    std::uint32_t value = 0;
+    for (unsigned byte = 0; byte < 4; ++byte)
+        value |= static_cast<std::uint32_t>(data[byte]) << (8 * byte);
+    return static_cast<std::int32_t>(value);
+}
+
+void storeInt(unsigned char* data, std::int32_t value) {
+    for (unsigned byte = 0; byte < 4; ++byte)
+        data[byte] =
+            static_cast<unsigned char>((static_cast<std::uint32_t>(value) >> (8 * byte)) & 0xFFu);
+}
+
+unsigned char lowByte(int value) {
+    return static_cast<unsigned char>(static_cast<unsigned>(value) & 0xFFu);
+}
+
+}  // namespace
+
+void Protocol_MRTU::readDriverArea(const Tag_MRTU& tag, unsigned char* data) {
+    switch (tag.driverArea()) {
+        case DriverArea::nodeOverride:
+            data[0] = lowByte(nodeOverrides_.replacementOf(tag.nodeId()));
+            break;
+        case DriverArea::modiconMode:
+            data[0] = modiconMode(tag) ? 1 : 0;
+            break;
+        case DriverArea::baud:
+            storeInt(data, serialValue("baud", line_.baud));
+            break;
+        case DriverArea::parity:
+            data[0] = lowByte(serialValue("parity", line_.parity));
+            break;
+        case DriverArea::stopBits:
+            data[0] = lowByte(serialValue("stop", line_.stopBits));
+            break;
+        case DriverArea::lineMode:
+            data[0] = lowByte(serialValue("mode", line_.mode));
+            break;
+        case DriverArea::apply:
+            data[0] = 0;
+            break;
+        case DriverArea::none:
+            break;
+    }
+}
+
+bool Protocol_MRTU::writeDriverArea(const Tag_MRTU& tag, const unsigned char* data) {
+    switch (tag.driverArea()) {
+        case DriverArea::nodeOverride:
+            nodeOverrides_.setValue(tag.nodeId(), data[0], GetIdent());
+            return true;
+        case DriverArea::modiconMode:
+            setModiconMode(tag.nodeId(), data[0] != 0);
+            return true;
+        case DriverArea::baud:
+            return stage("baud", loadInt(data), _MRTU::isListedBaudRate(loadInt(data)));
+        case DriverArea::parity:
+            return stage("parity", data[0], data[0] <= kMaxParity);
+        case DriverArea::stopBits:
+            return stage("stop", data[0], data[0] == 1 || data[0] == 2);
+        case DriverArea::lineMode:
+            return stage("mode", data[0], data[0] <= kMaxLineMode);
+        case DriverArea::apply:
+            applyStaged();
+            return true;
+        case DriverArea::none:
+            break;
+    }
+    return false;
+}
+
+void Protocol_MRTU::setModiconMode(int node, bool on) {
+    ParameterReplacer::Variant value;
+    value.type = ParameterReplacer::boolean;
+    value.boolValue = on;
+    const std::string key = ParameterReplacer::makeFullName("ModiconMode", node);
+    overrides_.set(key, value);
+    overrides_.persist(key, value);
+}
+
+bool Protocol_MRTU::stage(const char* name, int value, bool allowed) {
+    constexpr int kNoGroup = -1;
+    if (allowed) stagedOverrides_.set(name, kNoGroup, value);
+    return allowed;
+}
+
+/// Commits what is staged and sets the open port to the settings in force. The staged values stay
+/// and keep shadowing the committed ones.
+void Protocol_MRTU::applyStaged() {
+    for (const auto& [key, staged] : stagedOverrides_.staged()) {
+        if (staged.group != -1) continue;
+        const ParameterReplacer::Variant value{staged.type, staged.boolValue, staged.intValue,
+                                               staged.stringValue};
+        overrides_.set(staged.name, value);
+        overrides_.persist(staged.name, value);
+    }
+    line_.baud = serialValue("baud", line_.baud);
+    line_.parity = serialValue("parity", line_.parity);
+    line_.stopBits = serialValue("stop", line_.stopBits);
+    line_.mode = serialValue("mode", line_.mode);
+    line_.gapMs = _MRTU::interCharacterGap(line_.baud);
+    if (port_ != nullptr) configurePort();
+}
+
+int Protocol_MRTU::serialValue(const char* name, int current) {
+    constexpr int kNoNode = -1;
+    constexpr int kNoGroup = -1;
+    int value = current;
+    if (!stagedOverrides_.get(name, kNoGroup, value)) overrides_.get(name, kNoNode, current, value);
+    return value;
+}

@@ -1,0 +1,123 @@
+// Writes of the device's areas.
+#include <array>
+
+#include "framework/BitUtils.h"
+#include "framework/DataTypes.h"
+#include "mrtu/LineLock.h"
+#include "mrtu/Tag_MRTU.h"
+
+using _MRTU::Fault;
+using _MRTU::Message;
+using _MRTU::Reply;
+
+namespace {
+
+constexpr std::uint8_t kWriteCoil = 5;
+constexpr std::uint8_t kWriteRegister = 6;
+constexpr std::uint8_t kDisabledNode = 0xFF;
+
+constexpr Fault kReadOnly{-3, "Memory type is read only"};
+constexpr Fault kTooMany{-1, "Too many items for one request"};
+
+bool isSingle(std::uint8_t function) {
+    return function == kWriteCoil || function == kWriteRegister;
+}
+
+bool bitOf(const unsigned char* data, int index) {
+    return (data[0] >> (static_cast<unsigned>(index) % 8u) & 1u) != 0;
+}
+
+std::uint8_t low(long long value) {
+    return static_cast<std::uint8_t>(value & 0xFF);
+}
+
+/// Count and byte count, which the requests for several items carry in front of their data.
+void putCounts(Message& request, bool bits, int count) {
+    request.putWord(static_cast<std::uint16_t>(static_cast<unsigned>(count) & 0xFFFFu));
+    request.put(low(bits ? (static_cast<long long>(count) + 7) / 8 : 2LL * count));
+}
+
+void putCoil(Message& request, bool on) {
+    request.putWord(on ? 0xFF00 : 0x0000);
+}
+
+bool putBits(Message& request, const unsigned char* data, int index, int count) {
+    const long long length = (static_cast<long long>(count) + 7) / 8;
+    std::array<unsigned char, _MRTU::kMaxMessage> packed{};
+    if (count < 0 || !request.fits(length)) return false;
+    ProtUtilsN::shiftBits(packed.data(), 0, data, index % 8, count);
+    for (std::size_t byte = 0; byte < static_cast<std::size_t>(length); ++byte)
+        request.put(packed[byte]);
+    return true;
+}
+
+/// Host (little-endian) items, each most significant byte first.
+bool putItems(Message& request, const unsigned char* data, int count, int itemLength) {
+    if (count < 0 || !request.fits(static_cast<long long>(count) * itemLength)) return false;
+    for (int item = 0; item < count; ++item, data += itemLength)
+        for (int byte = itemLength - 1; byte >= 0; --byte)
+            request.put(data[byte]);
+    return true;
+}
+
+}  // namespace
+
+int Protocol_MRTU::doWrite(const ProtgenTag* tag, int index, const unsigned char* data, int count) {
+    if (!started_) return fail(_MRTU::kNotStarted);
+    const Tag_MRTU& own = *static_cast<const Tag_MRTU*>(tag);
+    if (own.driverArea() != _MRTU::DriverArea::none) return writeDriverArea(own, data) ? 1 : 0;
+    if (!isSingle(own.writeFunction())) return writeItems(&own, index, data, count);
+
+    // One request for each item. Coils all look at the same first byte, each at the bit of its own
+    // number; registers walk through the data.
+    const int step = own.writeFunction() == kWriteCoil ? 0 : own.memoryItemLength();
+    for (int item = 0; item < count; ++item)
+        if (writeItems(&own, index + item, data + item * step, 1) == 0) return 0;
+    return 1;
+}
+
+int Protocol_MRTU::doWriteBits(const ProtgenTag* tag, int index, const unsigned char* data,
+                               int count) {
+    return doWrite(tag, index, data, count);
+}
+
+/// One transaction: builds, sends and checks one request.
+int Protocol_MRTU::writeItems(const Tag_MRTU* tag, int index, const unsigned char* data,
+                              int count) {
+    if (tag->writeFunction() == 0) return fail(kReadOnly);
+    pauseBefore(*tag);
+    const LineLock lock(*this);
+    if (const Fault fault = writeRequest(*tag, index, data, count)) return fail(fault);
+    return 1;
+}
+
+Fault Protocol_MRTU::writeRequest(const Tag_MRTU& tag, int index, const unsigned char* data,
+                                  int count) {
+    // A Stop() may have come while this thread waited for the line.
+    if (port_ == nullptr) return _MRTU::kNotStarted;
+
+    const std::uint16_t address = lineAddress(tag, index);
+    const std::uint8_t node = lineNode(tag);
+    if (node == kDisabledNode) return _MRTU::kNodeDisabled;
+
+    const bool bits = tag.inBitMemory();
+    const std::uint8_t function = tag.writeFunction();
+    Message request;
+    request.put(node);
+    request.put(function);
+    request.putWord(address);
+    if (!isSingle(function)) putCounts(request, bits, count);
+
+    bool complete = true;
+    if (!bits)
+        complete = putItems(request, data, count, tag.memoryItemLength());
+    else if (function == kWriteCoil)
+        putCoil(request, bitOf(data, index));
+    else
+        complete = putBits(request, data, index, count);
+    if (!complete) return kTooMany;
+
+    Reply reply;
+    if (const Fault fault = exchange(tag, request, reply)) return fault;
+    return _MRTU::checkWriteBody(request, reply);
+}
