@@ -1,0 +1,53 @@
+// The framing of the block, byte for byte.
+#include <gtest/gtest.h>
+
+#include <cstring>
+#include <string>
+
+#include "description/Description.h"
+#include "tests/unit/description/Document.h"
+
+namespace description_test {
+namespace {
+
+const char* characters(const unsigned char* bytes) {
+    return reinterpret_cast<const char*>(bytes);
+}
+
+TEST(DescriptionBlock, MarkerLineAndItsZeroStandInFrontOfThePointer) {
+    const std::string marker =
+        "<<ICOM_XML_START>>Name=MRTU?FullName=Modbus RTU?Version=126?Platform=KV58_LIN";
+    const std::size_t size = marker.size() + 1;
+    EXPECT_EQ(std::string(characters(GetXml_MRTU()) - size, size), marker + '\0');
+}
+
+TEST(DescriptionBlock, PointerIsAtTheLengthLine) {
+    const std::string line = "compressedXML=2224";
+    EXPECT_EQ(std::string(characters(GetXml_MRTU()), line.size() + 1), line + '\0');
+}
+
+TEST(DescriptionBlock, StreamBeginsBehindTheZeroOfTheLengthLine) {
+    EXPECT_EQ(stream(), GetXml_MRTU() + sizeof "compressedXML=2224");
+    EXPECT_EQ(stream()[0], 0x78) << "deflate with a 32 KiB window";
+    EXPECT_EQ((stream()[0] * 256 + stream()[1]) % 31, 0) << "check of the zlib header";
+}
+
+TEST(DescriptionBlock, StreamInflatesWithNothingLeftOver) {
+    const Inflated inflated = inflateDocument();
+    EXPECT_EQ(inflated.result, 1) << "Z_STREAM_END: complete and with the right Adler-32";
+    EXPECT_EQ(inflated.leftOver, 0U);
+    EXPECT_EQ(inflated.text.size(), 15055U);
+}
+
+TEST(DescriptionBlock, EndMarkerAndItsZeroFollowTheStreamAtOnce) {
+    const std::string marker = "<<ICOM_XML_END>>";
+    EXPECT_EQ(declaredStreamLength(), 2224U);
+    EXPECT_EQ(std::string(characters(stream()) + 2224, marker.size() + 1), marker + '\0');
+}
+
+TEST(DescriptionBlock, PointerIsAlwaysTheSame) {
+    EXPECT_EQ(GetXml_MRTU(), GetXml_MRTU());
+}
+
+}  // namespace
+}  // namespace description_test
