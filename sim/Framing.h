@@ -55,7 +55,7 @@ class FrameSplitter {
     bool waitsForSilence() const { return mode_ == Mode::rtu && !pending_.empty(); }
 
   private:
-    std::optional<Received> completeRtu();
+    std::optional<Received> addRtu(std::uint8_t byte);
     std::optional<Received> addAscii(std::uint8_t character);
 
     Mode mode_;

@@ -66,6 +66,8 @@ class Memory {
         std::vector<std::uint32_t> values;
     };
 
+    void addArea(Area area, std::uint8_t node, std::uint32_t base, std::uint32_t count,
+                 std::uint32_t mask);
     Cells& cells(Area area);
     const Cells& cells(Area area) const;
 

@@ -46,7 +46,7 @@ class PtyLine {
     /// For poll(): readable when a master has sent; -1 after hangUp().
     int descriptor() const { return master_.get(); }
 
-    /// @return what has arrived; empty when nothing has. Never waits.
+    /// @return what has arrived; empty when nothing has. Never waits. A line that fails hangs up.
     Bytes read();
 
     /// Sends. Never waits: bytes that nobody has room for are lost, as on a real line.

@@ -5,6 +5,7 @@
 //     openPort(simulator.path());
 #pragma once
 
+#include <atomic>
 #include <chrono>
 #include <condition_variable>
 #include <cstdint>
@@ -19,30 +20,11 @@
 #include "sim/Bytes.h"
 #include "sim/Fault.h"
 #include "sim/Framing.h"
+#include "sim/LineEvent.h"
 #include "sim/PtyLine.h"
 #include "sim/Slave.h"
 
 namespace sim {
-
-/// Something that happened on the line.
-struct LineEvent {
-    enum class Kind : std::uint8_t {
-        request,  ///< A frame with a right check, for whatever node.
-        damaged,  ///< Bytes that are no frame; they stay unanswered.
-        reply,    ///< What was sent, faults included.
-        hangUp,   ///< A fault ended the line; no bytes.
-    };
-    Kind kind = Kind::request;
-    Bytes raw;  ///< As on the line: RTU bytes or ASCII characters, check included.
-    std::chrono::steady_clock::time_point at{};
-};
-
-/// @return the kind's name: "request", "damaged", "reply", "hang-up".
-const char* nameOf(LineEvent::Kind kind);
-
-/// @return one line of text: the kind's name, then the bytes in hexadecimal (RTU) or the characters
-/// up to CR LF (ASCII). `request 01 03 00 00 00 01 84 0A`.
-std::string describe(const LineEvent& event, Mode mode);
 
 struct SimulatorOptions {
     Mode mode = Mode::rtu;
@@ -74,7 +56,8 @@ class Simulator {
     /// Ends serving, also in the middle of a reply, and closes the line: the port vanishes.
     void stop();
 
-    /// Asks for the end without waiting for it; wait() returns. Safe in a signal handler.
+    /// Asks for the end without waiting for it; wait() returns. Safe in a signal handler. Asked
+    /// before start(), serving ends as soon as it begins.
     void requestStop() noexcept;
 
     enum class End : std::uint8_t { stopped, hungUp };
@@ -105,15 +88,20 @@ class Simulator {
     using Clock = std::chrono::steady_clock;
 
     enum class Wake : std::uint8_t { time, bytes, stop };
-    Wake waitFor(Clock::time_point deadline, bool bytesToo) const;
+    Wake waitUntil(Clock::time_point deadline, bool bytesToo) const;
+    bool pause(std::uint32_t ms);
+    void joinServing();
+    void forgetStopRequest();
+    void rememberPaths(const PtyLine& line);
+
+    // The serving thread's steps.
     void serve();
-    void serveFrames(FrameSplitter& splitter);
+    void receive(FrameSplitter& splitter, Clock::time_point& silence);
     void handle(const Received& frame);
-    std::optional<Bytes> replyTo(const Received& frame, std::optional<Fault>& fault);
     void send(const Transmission& transmission);
-    bool drip(const Transmission& transmission, Bytes& sent);
+    void sendPieces(const Transmission& transmission);
+    void hangUp();
     void record(LineEvent::Kind kind, Bytes raw);
-    void endLine();
 
     SimulatorOptions options_;
     Slave slave_;
@@ -121,8 +109,8 @@ class Simulator {
     Descriptor stopEvent_;
     std::unique_ptr<PtyLine> line_;
     std::thread thread_;
-    bool lineEnded_ = false;  // The serving thread's: a hang-up or a stop was met.
-    bool hungUp_ = false;     // Written by the serving thread, read after the join.
+    std::atomic<bool> ended_ = false;  // The serving thread has met a stop or a hang-up.
+    bool hungUp_ = false;              // It was a hang-up. Others look after the join only.
 
     mutable std::mutex mutex_;  // Guards what follows.
     mutable std::condition_variable eventAdded_;

@@ -12,13 +12,6 @@
 
 namespace sim {
 
-/// Source of the codes: Modbus Application Protocol V1.1b3, 7.
-enum class Exception : std::uint8_t {
-    illegalFunction = 1,
-    illegalDataAddress = 2,
-    illegalDataValue = 3,
-};
-
 /// A node on the line.
 struct NodeOptions {
     std::uint8_t address = 1;  ///< 1..255; the standard assigns 1..247.
@@ -56,6 +49,7 @@ class Slave {
     void set(std::uint8_t node, Area area, std::uint32_t address, std::uint32_t value);
 
   private:
+    void broadcast(ByteView request);
     bool isLong(std::uint8_t node, std::uint16_t address) const;
 
     mutable std::mutex mutex_;

@@ -1,0 +1,199 @@
+#include "sim/Functions.h"
+
+#include <algorithm>
+#include <array>
+
+namespace sim {
+namespace {
+
+enum class Shape : std::uint8_t { read, writeOne, writeMany };
+
+/// A function code. Source of the limits: Modbus Application Protocol V1.1b3, 6.1 to 6.12.
+struct FunctionRow {
+    std::uint8_t code;
+    Shape shape;
+    Area area;
+    std::uint32_t maxCount;
+};
+
+constexpr std::array kFunctions{
+    FunctionRow{1, Shape::read, Area::coil, 2000},
+    FunctionRow{2, Shape::read, Area::discreteInput, 2000},
+    FunctionRow{3, Shape::read, Area::holdingRegister, 125},
+    FunctionRow{4, Shape::read, Area::inputRegister, 125},
+    FunctionRow{5, Shape::writeOne, Area::coil, 1},
+    FunctionRow{6, Shape::writeOne, Area::holdingRegister, 1},
+    FunctionRow{15, Shape::writeMany, Area::coil, 1968},
+    FunctionRow{16, Shape::writeMany, Area::holdingRegister, 123},
+};
+
+/// The 250 data bytes of 125 registers, 4 for each.
+constexpr std::uint32_t kMaxReadLongs = 125 * 2 / 4;
+
+constexpr std::size_t kHeader = 1 + 2 + 2;  // Function, address, count or value.
+
+const FunctionRow* rowOf(std::uint8_t code) {
+    const auto* row = std::find_if(kFunctions.begin(), kFunctions.end(),
+                                   [&](const FunctionRow& each) { return each.code == code; });
+    return row == kFunctions.end() ? nullptr : row;
+}
+
+std::uint16_t wordAt(ByteView bytes, std::size_t index) {
+    return static_cast<std::uint16_t>(bytes[index] << 8U | bytes[index + 1]);
+}
+
+/// Most significant byte first.
+void put(Bytes& out, std::uint32_t value, std::size_t width) {
+    for (std::size_t i = width; i > 0; --i) {
+        out.push_back(static_cast<std::uint8_t>(value >> (8 * (i - 1)) & 0xFFU));
+    }
+}
+
+std::uint32_t take(ByteView bytes) {
+    std::uint32_t value = 0;
+    for (const std::uint8_t byte : bytes)
+        value = value << 8U | byte;
+    return value;
+}
+
+bool isBit(Area area) {
+    return area == Area::coil || area == Area::discreteInput;
+}
+
+/// Bytes of one register on the line.
+std::size_t widthOf(Area area) {
+    return area == Area::longRegister ? 4 : 2;
+}
+
+std::size_t dataBytes(Area area, std::uint32_t count) {
+    return isBit(area) ? (count + 7) / 8 : count * widthOf(area);
+}
+
+/// The area that the request means: Enron registers hide behind functions 3 and 6.
+Area areaOf(const FunctionRow& row, const Memory& memory, std::uint16_t address) {
+    const bool mayBeLong = row.area == Area::holdingRegister && row.shape != Shape::writeMany;
+    const bool isLong = mayBeLong && memory.longs() && memory.longs()->contains(address);
+    return isLong ? Area::longRegister : row.area;
+}
+
+bool inReach(const Memory& memory, Area area, std::uint32_t address, std::uint32_t count) {
+    if (!memory.has(area, address, count)) return false;
+    if (area != Area::holdingRegister || !memory.longs()) return true;
+    const LongRange& longs = *memory.longs();
+    return address + count <= longs.base || address >= longs.base + longs.count;
+}
+
+Bytes refuse(ByteView request, Exception code) {
+    return exceptionReply(request[0], static_cast<std::uint8_t>(code));
+}
+
+Bytes packBits(const Memory& memory, Area area, std::uint32_t address, std::uint32_t count) {
+    Bytes bits(dataBytes(area, count), 0);
+    for (std::uint32_t i = 0; i < count; ++i) {
+        const std::uint32_t bit = memory.get(area, address + i) << (i % 8);
+        bits[i / 8] = static_cast<std::uint8_t>(bits[i / 8] | bit);
+    }
+    return bits;
+}
+
+Bytes packRegisters(const Memory& memory, Area area, std::uint32_t address, std::uint32_t count) {
+    Bytes data;
+    for (std::uint32_t i = 0; i < count; ++i) {
+        put(data, memory.get(area, address + i), widthOf(area));
+    }
+    return data;
+}
+
+Bytes read(const FunctionRow& row, const Memory& memory, ByteView request) {
+    if (request.size() != kHeader) return refuse(request, Exception::illegalDataValue);
+    const std::uint16_t address = wordAt(request, 1);
+    const std::uint16_t count = wordAt(request, 3);
+    const Area area = areaOf(row, memory, address);
+    const std::uint32_t limit = area == Area::longRegister ? kMaxReadLongs : row.maxCount;
+    if (count < 1 || count > limit) return refuse(request, Exception::illegalDataValue);
+    if (!inReach(memory, area, address, count)) {
+        return refuse(request, Exception::illegalDataAddress);
+    }
+    const Bytes data = isBit(area) ? packBits(memory, area, address, count)
+                                   : packRegisters(memory, area, address, count);
+    Bytes reply{row.code, static_cast<std::uint8_t>(data.size())};
+    reply.insert(reply.end(), data.begin(), data.end());
+    return reply;
+}
+
+Bytes writeOne(const FunctionRow& row, Memory& memory, ByteView request) {
+    if (request.size() < kHeader) return refuse(request, Exception::illegalDataValue);
+    const std::uint16_t address = wordAt(request, 1);
+    const Area area = areaOf(row, memory, address);
+    if (request.size() != 1 + 2 + widthOf(area)) {
+        return refuse(request, Exception::illegalDataValue);
+    }
+    const std::uint32_t value = take(request.subspan(3));
+    const bool legal = area != Area::coil || value == 0x0000 || value == 0xFF00;
+    if (!legal) return refuse(request, Exception::illegalDataValue);
+    if (!inReach(memory, area, address, 1)) return refuse(request, Exception::illegalDataAddress);
+    memory.set(area, address, area == Area::coil ? value >> 15U : value);
+    return {request.begin(), request.end()};
+}
+
+std::uint32_t itemAt(Area area, ByteView data, std::uint32_t index) {
+    if (isBit(area)) return static_cast<std::uint32_t>(data[index / 8]) >> (index % 8);
+    return wordAt(data, 2 * static_cast<std::size_t>(index));
+}
+
+Bytes writeMany(const FunctionRow& row, Memory& memory, ByteView request) {
+    if (request.size() < kHeader + 1) return refuse(request, Exception::illegalDataValue);
+    const std::uint16_t address = wordAt(request, 1);
+    const std::uint16_t count = wordAt(request, 3);
+    const ByteView data = request.subspan(kHeader + 1);
+    const bool legal = count >= 1 && count <= row.maxCount &&
+                       request[kHeader] == dataBytes(row.area, count) &&
+                       data.size() == request[kHeader];
+    if (!legal) return refuse(request, Exception::illegalDataValue);
+    if (!inReach(memory, row.area, address, count)) {
+        return refuse(request, Exception::illegalDataAddress);
+    }
+    for (std::uint32_t i = 0; i < count; ++i) {
+        memory.set(row.area, address + i, itemAt(row.area, data, i));
+    }
+    return {request.begin(), request.begin() + kHeader};
+}
+
+}  // namespace
+
+Bytes exceptionReply(std::uint8_t function, std::uint8_t code) {
+    return {static_cast<std::uint8_t>(function | 0x80U), code};
+}
+
+bool isWrite(std::uint8_t function) {
+    const FunctionRow* row = rowOf(function);
+    return row != nullptr && row->shape != Shape::read;
+}
+
+Bytes execute(Memory& memory, ByteView request) {
+    const FunctionRow* row = rowOf(request[0]);
+    if (row == nullptr) return refuse(request, Exception::illegalFunction);
+    if (row->shape == Shape::read) return read(*row, memory, request);
+    if (row->shape == Shape::writeOne) return writeOne(*row, memory, request);
+    return writeMany(*row, memory, request);
+}
+
+std::optional<std::uint16_t> addressOfRequest(ByteView firstBytes) {
+    if (firstBytes.size() < 1 + 1 + 2) return std::nullopt;
+    return wordAt(firstBytes, 2);
+}
+
+std::optional<std::size_t> lengthOfRequest(ByteView firstBytes, bool longAt) {
+    constexpr std::size_t kFixed = 1 + kHeader + 2;  // With node and check.
+    if (!addressOfRequest(firstBytes)) return std::nullopt;
+    const FunctionRow* row = rowOf(firstBytes[1]);
+    if (row == nullptr) return std::nullopt;
+    if (row->shape == Shape::read) return kFixed;
+    if (row->shape == Shape::writeOne) {
+        return row->area == Area::holdingRegister && longAt ? kFixed + 2 : kFixed;
+    }
+    if (firstBytes.size() <= 1 + kHeader) return std::nullopt;
+    return kFixed + 1 + firstBytes[1 + kHeader];
+}
+
+}  // namespace sim

@@ -1,0 +1,23 @@
+// Bytes as hexadecimal digits.
+#pragma once
+
+#include <optional>
+#include <string_view>
+
+#include "sim/Bytes.h"
+
+namespace sim {
+
+/// Upper-case digits, the only ones of the ASCII mode.
+inline constexpr std::string_view kHexDigits = "0123456789ABCDEF";
+
+/// @return 0..15; nothing for a character other than 0-9 and A-F.
+std::optional<std::uint8_t> hexValue(std::uint8_t character);
+
+/// Appends two digits.
+void putHex(Bytes& out, std::uint8_t byte);
+
+/// @return the bytes of an even number of digits; nothing for any other text.
+std::optional<Bytes> fromHex(ByteView characters);
+
+}  // namespace sim

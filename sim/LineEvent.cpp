@@ -1,0 +1,48 @@
+#include "sim/LineEvent.h"
+
+#include "sim/Hex.h"
+
+namespace sim {
+namespace {
+
+std::string hexText(ByteView bytes) {
+    Bytes text;
+    for (const std::uint8_t byte : bytes) {
+        if (!text.empty()) text.push_back(' ');
+        putHex(text, byte);
+    }
+    return {text.begin(), text.end()};
+}
+
+/// What cannot be printed becomes a point: the bytes come from outside.
+std::string characters(ByteView bytes) {
+    std::string text;
+    for (const std::uint8_t byte : bytes) {
+        if (byte == '\r' || byte == '\n') continue;
+        text.push_back(byte >= 0x20 && byte < 0x7F ? static_cast<char>(byte) : '.');
+    }
+    return text;
+}
+
+}  // namespace
+
+const char* nameOf(LineEvent::Kind kind) {
+    switch (kind) {
+        case LineEvent::Kind::request:
+            return "request";
+        case LineEvent::Kind::damaged:
+            return "damaged";
+        case LineEvent::Kind::reply:
+            return "reply";
+        case LineEvent::Kind::hangUp:
+            return "hang-up";
+    }
+    return "unknown";
+}
+
+std::string describe(const LineEvent& event, Mode mode) {
+    const std::string bytes = mode == Mode::rtu ? hexText(event.raw) : characters(event.raw);
+    return nameOf(event.kind) + (bytes.empty() ? "" : " " + bytes);
+}
+
+}  // namespace sim

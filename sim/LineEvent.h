@@ -1,0 +1,32 @@
+// What happened on the simulated line, for tests and for people.
+#pragma once
+
+#include <chrono>
+#include <string>
+
+#include "sim/Bytes.h"
+
+namespace sim {
+
+/// Something that happened on the line.
+struct LineEvent {
+    enum class Kind : std::uint8_t {
+        request,  ///< A frame with a right check, for whatever node.
+        damaged,  ///< Bytes that are no frame; they stay unanswered.
+        reply,    ///< What was sent, faults included.
+        hangUp,   ///< A fault ended the line; no bytes.
+    };
+    Kind kind = Kind::request;
+    Bytes raw;  ///< As on the line: RTU bytes or ASCII characters, check included.
+    std::chrono::steady_clock::time_point at{};
+};
+
+/// @return the kind's name: "request", "damaged", "reply", "hang-up".
+const char* nameOf(LineEvent::Kind kind);
+
+/// @return one line of text: the kind's name, then the bytes in hexadecimal (RTU) or the characters
+/// without CR and LF (ASCII, a point for what cannot be printed). `request 01 03 00 00 00 01 84
+/// 0A`.
+std::string describe(const LineEvent& event, Mode mode);
+
+}  // namespace sim
