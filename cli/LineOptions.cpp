@@ -1,0 +1,143 @@
+#include "cli/LineOptions.h"
+
+#include <fmt/format.h>
+
+#include <CLI/CLI.hpp>
+#include <cerrno>
+#include <cstring>
+#include <fstream>
+
+#include "cli/ConfigText.h"
+
+namespace cli {
+namespace {
+
+constexpr std::size_t kConfigLimit = 1024 * 1024;
+
+[[noreturn]] void refuseConfig(const std::string& file, const std::string& why) {
+    throw CommandError(ExitCode::Usage, fmt::format("configuration {}: {}", file, why));
+}
+
+std::string readConfigFile(const std::string& file) {
+    errno = 0;
+    std::ifstream in(file, std::ios::binary);
+    if (!in) refuseConfig(file, std::strerror(errno));
+    std::string text(kConfigLimit + 1, '\0');
+    in.read(text.data(), static_cast<std::streamsize>(text.size()));
+    if (in.bad()) refuseConfig(file, errno != 0 ? std::strerror(errno) : "can't be read");
+    text.resize(static_cast<std::size_t>(in.gcount()));
+    if (text.size() > kConfigLimit) refuseConfig(file, "longer than 1 MiB");
+    // The driver takes a C string: what stands behind a zero would be lost without a word.
+    if (text.find('\0') != std::string::npos) refuseConfig(file, "holds a zero byte");
+    return text;
+}
+
+void addShortForms(CLI::App& command, LineOptions& options) {
+    struct Row {
+        const char* name;
+        std::string LineOptions::*member;
+        const char* help;
+    };
+    static const Row rows[] = {
+        {"--baud", &LineOptions::baud, "Same as --set baudrate=N"},
+        {"--parity", &LineOptions::parity, "Same as --set parity=none|even|odd|mark"},
+        {"--stopbits", &LineOptions::stopBits, "Same as --set stopbits=1|2"},
+        {"--node", &LineOptions::node, "Same as --set defNodeId=N"},
+        {"--model", &LineOptions::model,
+         "Same as --set model=1|2|3|4 (1-based, 0-based, Enron 1-based, Enron 0-based)"},
+        {"--timeout", &LineOptions::timeout, "Same as --set timeout=MS"},
+    };
+    for (const Row& row : rows) {
+        command.add_option(row.name, options.*row.member, row.help)->group("Configuration");
+    }
+    command.add_flag("--ascii", options.ascii, "Same as --set txMode=ASCII")
+        ->group("Configuration");
+}
+
+std::vector<ConfigItem> itemsOf(const LineOptions& options) {
+    std::vector<ConfigItem> items;
+    for (const std::string& setting : options.settings)
+        items.push_back(parseConfigItem(setting));
+    const auto add = [&items](const std::string& key, const std::string& value) {
+        if (!value.empty()) items.push_back(parseConfigItem(key + '=' + value));
+    };
+    add("baudrate", options.baud);
+    add("parity", options.parity);
+    add("stopbits", options.stopBits);
+    add("defNodeId", options.node);
+    add("model", options.model);
+    add("timeout", options.timeout);
+    if (options.ascii) add("txMode", "ASCII");
+    return items;
+}
+
+bool namesPort(const std::string& text) {
+    return text.starts_with("com") && text.find('=') < text.find('/');
+}
+
+}  // namespace
+
+void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& context) {
+    command
+        .add_option("--port", options.ports,
+                    "Device of a port, com1=/dev/ttyUSB0; a device alone serves the "
+                    "configuration's port. Can be repeated")
+        ->type_name("[NAME=]DEVICE")
+        ->allow_extra_args(false)
+        ->group("Line");
+    command.add_flag("--sim", options.sim, "Talk to a simulated line instead of a port")
+        ->excludes("--port")
+        ->group("Line");
+    command.add_flag("--trace", options.trace, "Show every frame on standard error")->group("Line");
+    command.add_option("--config", options.configFile, "Configuration text of the driver")
+        ->type_name("FILE")
+        ->group("Configuration");
+    command
+        .add_option("--set", options.settings,
+                    "Add an item to the configuration or replace one, e.g. timeout=500 or "
+                    "Node5::model=2. Can be repeated")
+        ->type_name("KEY=VALUE")
+        ->allow_extra_args(false)
+        ->group("Configuration");
+    addShortForms(command, options);
+    command
+        .add_option("--storage", options.storage,
+                    "Where overrides are kept, or 'none'. With --sim the default is 'none'")
+        ->type_name("FILE")
+        ->group("Driver");
+    command.add_option("--ident", options.ident, "Whose overrides: the section of the storage")
+        ->type_name("NAME")
+        ->group("Driver");
+    command.add_option("--protocol", options.protocol, "Protocol of the plug-in")
+        ->type_name("NAME")
+        ->capture_default_str()
+        ->group("Driver");
+    addPluginOption(command, context);
+}
+
+std::string configTextOf(const LineOptions& options) {
+    const std::string base = options.configFile.empty() ? defaultConfig(options.sim ? "3" : "1")
+                                                        : readConfigFile(options.configFile);
+    std::vector<ConfigItem> items = itemsOf(options);
+    const bool bitsMissing = !itemOf(withItems(base, items), "bits");
+    if (options.ascii && bitsMissing) items.push_back({"bits", "8"});
+    return withItems(base, items);
+}
+
+std::vector<PortMapping> portsOf(const LineOptions& options, const std::string& configText) {
+    std::vector<PortMapping> mappings;
+    for (const std::string& port : options.ports) {
+        if (namesPort(port)) {
+            const std::size_t equals = port.find('=');
+            mappings.push_back({port.substr(0, equals), port.substr(equals + 1)});
+        } else {
+            mappings.push_back({itemOf(configText, "uart").value_or("com1"), port});
+        }
+        if (mappings.back().device.empty()) {
+            throw CommandError(ExitCode::Usage, fmt::format("--port {}: no device", port));
+        }
+    }
+    return mappings;
+}
+
+}  // namespace cli

@@ -1,0 +1,41 @@
+// The options of every sub-command that talks to a device: which line, which configuration.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "cli/Command.h"
+
+namespace cli {
+
+struct LineOptions {
+    std::string configFile;
+    std::vector<std::string> ports;     ///< "com1=/dev/ttyUSB0" or a device alone.
+    std::vector<std::string> settings;  ///< "key=value", in front of the configuration's own.
+    std::string baud, parity, stopBits, node, model, timeout;  ///< Short forms of settings.
+    bool ascii = false;
+    bool sim = false;
+    bool trace = false;
+    std::string storage;  ///< A file, "none", or empty for the default.
+    std::string ident;
+    std::string protocol = "MRTU";
+};
+
+/// A port name and its device file.
+struct PortMapping {
+    std::string name;
+    std::string device;
+};
+
+/// Declares the options, `--plugin` included.
+/// @param options  Must live until the callback has run.
+void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& context);
+
+/// @return the configuration text: the file's or the default one, with the options in front.
+/// Errors: CommandError (Usage) when the file can't be read or an option is malformed.
+std::string configTextOf(const LineOptions& options);
+
+/// @return what --port said. A device without a name serves the configuration's "uart".
+std::vector<PortMapping> portsOf(const LineOptions& options, const std::string& configText);
+
+}  // namespace cli
