@@ -1,0 +1,44 @@
+#include <fmt/format.h>
+
+#include <CLI/CLI.hpp>
+#include <filesystem>
+#include <system_error>
+
+#include "cli/Command.h"
+
+namespace cli {
+namespace {
+
+constexpr const char* kPluginName = "libmrtu.so";
+
+std::filesystem::path executableFolder() {
+    std::error_code ignored;
+    return std::filesystem::read_symlink("/proc/self/exe", ignored).parent_path();
+}
+
+}  // namespace
+
+void addPluginOption(CLI::App& command, CommandContext& context) {
+    command
+        .add_option("--plugin", context.pluginOption,
+                    "The driver; default is libmrtu.so beside mrtu or in ../lib/mrtu")
+        ->type_name("FILE")
+        ->group("Driver");
+}
+
+std::string pluginFile(const CommandContext& context) {
+    if (!context.pluginOption.empty()) return context.pluginOption;
+    const std::filesystem::path folder = executableFolder();
+    const std::filesystem::path beside = folder / kPluginName;
+    const std::filesystem::path installed =
+        (folder / "../lib/mrtu" / kPluginName).lexically_normal();
+    for (const std::filesystem::path& place : {beside, installed}) {
+        std::error_code ignored;
+        if (std::filesystem::exists(place, ignored)) return place.string();
+    }
+    throw CommandError(ExitCode::Other,
+                       fmt::format("no plug-in at {} or {}; --plugin FILE names another",
+                                   beside.string(), installed.string()));
+}
+
+}  // namespace cli

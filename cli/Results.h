@@ -1,0 +1,36 @@
+// What a command says about each tag: lines for people, or one JSON array.
+#pragma once
+
+#include <string>
+
+#include "cli/Bytes.h"
+#include "cli/Command.h"
+#include "cli/JsonValues.h"
+#include "cli/ValueTypes.h"
+#include "runtime/Channel.h"
+
+namespace cli {
+
+/// Values go to context.out as "URI = value", failures to context.err as
+/// "mrtu: URI: error CODE: text". With `json` both become members of an array that finish() prints
+/// on context.out: {"uri", "type", "value"} or {"uri", "error": {"code", "text"}}.
+class Results {
+  public:
+    Results(CommandContext& context, bool json) : context_(context), json_(json) {}
+
+    void value(const std::string& uri, ValueShape shape, ByteView value);
+
+    /// @param code  What the failure makes of the exit code when it is the first.
+    void failure(const std::string& uri, const runtime::ChannelError& error, ExitCode code);
+
+    /// Prints the array and stores the first failure's code in the context.
+    void finish();
+
+  private:
+    CommandContext& context_;
+    bool json_;
+    Json array_ = Json::array();
+    FirstFailure first_;
+};
+
+}  // namespace cli

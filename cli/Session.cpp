@@ -1,0 +1,150 @@
+#include "cli/Session.h"
+
+#include <fmt/format.h>
+
+#include <ostream>
+#include <system_error>
+
+#include "cli/ConfigText.h"
+#include "cli/SimNodes.h"
+#include "cli/TraceText.h"
+#include "runtime/HostServices.h"
+#include "runtime/PosixMultiTask.h"
+#include "runtime/PosixSerialFactory.h"
+#include "runtime/SqliteStorage.h"
+#include "runtime/TracingSerialFactory.h"
+
+namespace cli {
+namespace {
+
+using runtime::PluginError;
+
+/// Hands on a value or ends the command with the error's text.
+template <class Value, class Error>
+Value valueOr(runtime::Result<Value, Error> result, ExitCode code) {
+    if (!result) throw CommandError(code, result.error().text);
+    return std::move(result).value();
+}
+
+std::unique_ptr<runtime::Storage> openStorage(const LineOptions& options) {
+    const bool none = options.storage.empty() ? options.sim : options.storage == "none";
+    if (none) return nullptr;
+    const std::string path =
+        options.storage.empty() ? runtime::defaultStoragePath() : options.storage;
+    if (path.empty()) {
+        throw CommandError(ExitCode::Other,
+                           "no place for overrides: HOME is not set; --storage FILE or none");
+    }
+    return valueOr(runtime::SqliteStorage::open(path), ExitCode::Other);
+}
+
+std::unique_ptr<sim::Simulator> makeSimulator(const LineOptions& options,
+                                              const std::string& configText) {
+    if (!options.sim) return nullptr;
+    const bool ascii = itemOf(configText, "txMode") == "ASCII";
+    sim::SimulatorOptions simOptions;
+    simOptions.mode = ascii ? sim::Mode::ascii : sim::Mode::rtu;
+    simOptions.nodes = simNodesFor(configText);
+    return std::make_unique<sim::Simulator>(std::move(simOptions));
+}
+
+runtime::TracingSerialFactory::Callback tracer(std::ostream& err) {
+    return [&err](const runtime::TraceEvent& event) { err << traceText(event) << '\n'; };
+}
+
+runtime::ProtocolObject makeProtocol(const std::string& plugin, IInterfaceFactory& host,
+                                     const std::string& name) {
+    const auto library = valueOr(runtime::PluginLibrary::load(plugin), ExitCode::Other);
+    const auto module = valueOr(runtime::Module::bind(library, host), ExitCode::Other);
+    return valueOr(module.createProtocol(name), ExitCode::Other);
+}
+
+}  // namespace
+
+/// In the order of their making; the driver, last, goes first.
+struct Session::Parts {
+    Parts(const CommandContext& context, const LineOptions& options)
+        : configText(configTextOf(options)),
+          ports(portsOf(options, configText)),
+          plugin(pluginFile(context)),
+          storage(openStorage(options)),
+          simulator(makeSimulator(options, configText)),
+          tracing(serial,
+                  options.trace ? tracer(context.err) : runtime::TracingSerialFactory::Callback{}),
+          host(multiTask, tracing, storage.get()),
+          channel(makeProtocol(plugin, host, options.protocol)) {
+        for (const PortMapping& port : ports)
+            mapPort(port);
+    }
+
+    void mapPort(const PortMapping& port) {
+        if (!serial.mapPort(port.name, port.device)) {
+            throw CommandError(ExitCode::Usage, "--port: " + serial.lastError());
+        }
+    }
+
+    std::string configText;
+    std::vector<PortMapping> ports;
+    std::string plugin;
+    std::unique_ptr<runtime::Storage> storage;
+    std::unique_ptr<sim::Simulator> simulator;
+    runtime::PosixMultiTask multiTask;
+    runtime::PosixSerialFactory serial;
+    runtime::TracingSerialFactory tracing;
+    runtime::HostServices host;
+    runtime::Channel channel;
+};
+
+Session::Session(const CommandContext& context, const LineOptions& options)
+    : parts_(std::make_unique<Parts>(context, options)) {
+    if (!options.ident.empty()) parts_->channel.setIdent(options.ident);
+    if (const auto done = parts_->channel.configure(parts_->configText); !done) {
+        throw CommandError(ExitCode::Usage, "configuration: " + done.error().text);
+    }
+}
+
+Session::~Session() = default;
+
+void Session::start() {
+    if (!hasLine()) {
+        throw CommandError(ExitCode::Usage, "no line: --port com1=/dev/ttyUSB0, or --sim");
+    }
+    if (parts_->simulator) {
+        try {
+            parts_->simulator->start();
+        } catch (const std::system_error& error) {
+            throw CommandError(ExitCode::Port, fmt::format("simulated line: {}", error.what()));
+        }
+        parts_->mapPort(
+            {itemOf(parts_->configText, "uart").value_or("com1"), parts_->simulator->path()});
+    }
+    if (const auto done = parts_->channel.start(); !done) {
+        const std::string reason = parts_->serial.lastError();
+        throw CommandError(ExitCode::Port,
+                           reason.empty() ? done.error().text : done.error().text + ": " + reason);
+    }
+}
+
+bool Session::hasLine() const {
+    return parts_->simulator != nullptr || !parts_->ports.empty();
+}
+
+runtime::Channel& Session::channel() {
+    return parts_->channel;
+}
+
+runtime::Storage* Session::storage() {
+    return parts_->storage.get();
+}
+
+void Session::checkStorage() {
+    if (parts_->storage && parts_->storage->failed()) {
+        throw CommandError(ExitCode::Other, "storage: " + parts_->storage->lastError());
+    }
+}
+
+const std::string& Session::configText() const {
+    return parts_->configText;
+}
+
+}  // namespace cli
