@@ -35,6 +35,9 @@ void addPluginOption(CLI::App& command, CommandContext& context);
 /// Errors: CommandError (Other) naming the places looked at when there is none.
 std::string pluginFile(const CommandContext& context);
 
+/// Prints "mrtu: " and the text as one line on context.err.
+void complain(CommandContext& context, const std::string& text);
+
 /// Runs a whole command line, also `--help` and `--version`.
 /// @return what main() returns: the number of an ExitCode.
 int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::ostream& err);

@@ -1,0 +1,87 @@
+#include <fmt/format.h>
+
+#include <CLI/CLI.hpp>
+#include <ostream>
+
+#include "cli/Commands.h"
+
+namespace cli {
+namespace {
+
+constexpr const char* kFooter = R"(
+Examples:
+  mrtu read --sim '1?HREG?400001?unsignedShort' '1?OUTP?1?boolean-8'
+  mrtu read --port /dev/ttyUSB0 --baud 9600 --parity even '1?HREG?400010?float(swap2)'
+  mrtu write --port /dev/ttyUSB0 --verify '1?HREG?400001?short=-5'
+  mrtu console --sim getmaxtm
+  mrtu override set --port /dev/ttyUSB0 node 5=7 baud=38400
+  mrtu sim
+  mrtu info
+  mrtu COMMAND --help   (more examples)
+
+Exit codes:
+  0  all done
+  1  anything that no other code names
+  2  wrong usage, configuration, tag URI or value
+  3  the serial port can't be opened
+  4  no response
+  5  bad reply or exception
+Of several failing URIs the first one's code counts.)";
+
+void addCommands(CLI::App& app, CommandContext& context) {
+    addReadCommand(app, context);
+    addWriteCommand(app, context);
+    addConsoleCommand(app, context);
+    addOverrideCommand(app, context);
+    addInfoCommand(app, context);
+    addSimCommand(app, context);
+}
+
+/// @return the exit code of a command line that was not accepted, or was a question only.
+ExitCode answerParser(const CLI::App& app, const CLI::ParseError& error, CommandContext& context) {
+    const int code = app.exit(error, context.out, context.err);
+    return code == 0 ? ExitCode::Done : ExitCode::Usage;
+}
+
+ExitCode run(CLI::App& app, int argc, const char* const* argv, CommandContext& context) {
+    try {
+        app.parse(argc, argv);
+        return context.exitCode;
+    } catch (const CLI::ParseError& error) {
+        return answerParser(app, error, context);
+    } catch (const CommandError& error) {
+        complain(context, error.what());
+        return error.code();
+    } catch (const std::exception& error) {
+        complain(context, error.what());
+        return ExitCode::Other;
+    }
+}
+
+}  // namespace
+
+void complain(CommandContext& context, const std::string& text) {
+    // What was said before on the other stream stays before when both go to one file.
+    context.out.flush();
+    context.err << "mrtu: " << text << '\n';
+    context.err.flush();
+}
+
+int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::ostream& err) {
+    CommandContext context{.out = out, .err = err, .exitCode = ExitCode::Done, .pluginOption = {}};
+    CLI::App app("Reads and writes tags of Modbus RTU and ASCII devices through a driver plug-in.",
+                 "mrtu");
+    app.set_version_flag("--version", "mrtu " MRTU_VERSION);
+    app.footer(kFooter);
+    app.require_subcommand(1);
+    addCommands(app, context);
+    ExitCode code = run(app, argc, argv, context);
+    out.flush();
+    if (!out && code == ExitCode::Done) {
+        complain(context, "the output can't be written");
+        code = ExitCode::Other;
+    }
+    return static_cast<int>(code);
+}
+
+}  // namespace cli

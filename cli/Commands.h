@@ -1,0 +1,15 @@
+// The sub-commands of `mrtu`, one function each.
+#pragma once
+
+#include "cli/Command.h"
+
+namespace cli {
+
+void addReadCommand(CLI::App& app, CommandContext& context);
+void addWriteCommand(CLI::App& app, CommandContext& context);
+void addSimCommand(CLI::App& app, CommandContext& context);
+void addInfoCommand(CLI::App& app, CommandContext& context);
+void addConsoleCommand(CLI::App& app, CommandContext& context);
+void addOverrideCommand(CLI::App& app, CommandContext& context);
+
+}  // namespace cli

@@ -1,0 +1,142 @@
+#include <fmt/format.h>
+
+#include <CLI/CLI.hpp>
+#include <memory>
+#include <ostream>
+
+#include "cli/Commands.h"
+#include "cli/Overrides.h"
+
+namespace cli {
+namespace {
+
+constexpr const char* kFooter = R"(
+An override takes the place of what the configuration says, and stays until it is cleared:
+  node N=M              talk to slave address M where the configuration says node N; "off" disables
+  modicon N=on|off      count the registers of node N from 1 (on) or from 0 (off)
+  baud=, parity=, stop=, mode=   settings of the line
+
+Examples:
+  mrtu override list --port /dev/ttyUSB0
+  mrtu override set --port /dev/ttyUSB0 node 5=7 6=off modicon 5=on
+  mrtu override set --port /dev/ttyUSB0 baud=38400 parity=even stop=2 mode=RS-485
+  mrtu override clear --port /dev/ttyUSB0 node 5 6
+  mrtu override clear baud parity
+  mrtu override clear all)";
+
+struct OverrideOptions {
+    LineOptions line;
+    std::vector<std::string> words;
+};
+
+class Printer {
+  public:
+    Printer(std::ostream& out, Overrides& overrides) : out_(out), overrides_(overrides) {}
+
+    void node(int node) {
+        line(fmt::format("node {}", node), addressWord(overrides_.address(node)),
+             overrides_.storedAddress(node));
+    }
+    void modicon(int node) {
+        line(fmt::format("modicon {}", node), overrides_.modicon(node) ? "on" : "off",
+             overrides_.storedModicon(node));
+    }
+    void serial(const SerialSetting& setting) {
+        line(std::string(setting.name), wordOf(setting, overrides_.serial(setting)),
+             overrides_.stored(setting));
+    }
+
+  private:
+    void line(const std::string& what, const std::string& value, bool stored) {
+        out_ << fmt::format("{} = {}{}\n", what, value, stored ? " (stored)" : "");
+    }
+
+    std::ostream& out_;
+    Overrides& overrides_;
+};
+
+void list(CommandContext& context, const OverrideOptions& options) {
+    Session session(context, options.line);
+    session.start();
+    Overrides overrides(session);
+    Printer printer(context.out, overrides);
+    for (const int node : overrides.nodes()) {
+        printer.node(node);
+        printer.modicon(node);
+    }
+    for (const SerialSetting& setting : serialSettings())
+        printer.serial(setting);
+    session.checkStorage();
+}
+
+void set(CommandContext& context, const OverrideOptions& options) {
+    const OverrideChanges changes = parseChanges(options.words);
+    Session session(context, options.line);
+    session.start();
+    Overrides overrides(session);
+    Printer printer(context.out, overrides);
+    for (const NodeChange& change : changes.nodes) {
+        overrides.setAddress(change.node, change.address);
+        printer.node(change.node);
+    }
+    for (const ModiconChange& change : changes.modicon) {
+        overrides.setModicon(change.node, change.on);
+        printer.modicon(change.node);
+    }
+    overrides.setSerial(changes.serial);
+    for (const SerialChange& change : changes.serial)
+        printer.serial(*change.setting);
+    session.checkStorage();
+    if (session.storage() == nullptr) {
+        complain(context, "there is no storage: the overrides end with this command");
+    }
+}
+
+/// Node addresses go through the driver, which needs its line; everything else only leaves the
+/// storage, so that settings with which no port opens can still be cleared.
+void clear(CommandContext& context, const OverrideOptions& options) {
+    const OverrideRemovals removals = parseRemovals(options.words);
+    Session session(context, options.line);
+    if (session.storage() == nullptr) {
+        throw CommandError(ExitCode::Usage, "there is no storage to clear anything in");
+    }
+    Overrides overrides(session);
+    if (removals.all) overrides.forgetAll();
+    for (const int node : removals.modicon)
+        overrides.forgetModicon(node);
+    for (const SerialSetting* setting : removals.serial)
+        overrides.forget(*setting);
+    if (!removals.nodes.empty()) session.start();
+    for (const int node : removals.nodes) {
+        overrides.setAddress(node, static_cast<std::uint8_t>(node));
+    }
+    session.checkStorage();
+    context.out << "cleared\n";
+}
+
+using Action = void (*)(CommandContext&, const OverrideOptions&);
+
+CLI::App* addAction(CLI::App& parent, CommandContext& context, const char* name, const char* help,
+                    Action action, const char* words) {
+    const auto options = std::make_shared<OverrideOptions>();
+    CLI::App* const command = parent.add_subcommand(name, help);
+    addLineOptions(*command, options->line, context);
+    if (words != nullptr) command->add_option(words, options->words, "See below")->required();
+    command->footer(kFooter);
+    command->callback([options, &context, action] { action(context, *options); });
+    return command;
+}
+
+}  // namespace
+
+void addOverrideCommand(CLI::App& app, CommandContext& context) {
+    CLI::App* const command =
+        app.add_subcommand("override", "Look at and change what replaces the configuration");
+    command->require_subcommand(1);
+    command->footer(kFooter);
+    addAction(*command, context, "list", "Print the values in force", list, nullptr);
+    addAction(*command, context, "set", "Replace values", set, "WORDS");
+    addAction(*command, context, "clear", "Go back to the configuration", clear, "WORDS");
+}
+
+}  // namespace cli

@@ -1,0 +1,50 @@
+// The overrides of a started driver, reached through its special memory areas.
+#pragma once
+
+#include <set>
+#include <string>
+
+#include "cli/OverrideWords.h"
+#include "cli/Session.h"
+
+namespace cli {
+
+/// Errors of every operation: CommandError (Other) when the driver refuses.
+class Overrides {
+  public:
+    /// REQUIRES for all but the removals of stored keys: session.start() succeeded.
+    explicit Overrides(Session& session) : session_(session) {}
+
+    std::uint32_t address(int node);
+    bool modicon(int node);
+    std::uint32_t serial(const SerialSetting& setting);
+
+    void setAddress(int node, std::uint8_t address);
+    void setModicon(int node, bool on);
+    /// Stages all the changes, then applies them in one step.
+    void setSerial(const std::vector<SerialChange>& changes);
+
+    /// @return the nodes that the configuration names or that have an override, ascending.
+    std::set<int> nodes();
+
+    /// Tells whether the storage holds a value of its own.
+    bool storedAddress(int node);
+    bool storedModicon(int node);
+    bool stored(const SerialSetting& setting);
+
+    /// Takes values out of the storage; they are gone at the next start.
+    void forgetModicon(int node);
+    void forget(const SerialSetting& setting);
+    void forgetAll();
+
+  private:
+    std::uint32_t read(const std::string& uri);
+    void write(const std::string& uri, std::uint32_t value, std::size_t bytes);
+    bool hasKey(const std::string& key);
+    void removeKey(const std::string& key);
+    const char* section();
+
+    Session& session_;
+};
+
+}  // namespace cli

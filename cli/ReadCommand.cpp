@@ -1,0 +1,71 @@
+#include <CLI/CLI.hpp>
+#include <memory>
+
+#include "cli/Commands.h"
+#include "cli/Results.h"
+#include "cli/Session.h"
+
+namespace cli {
+namespace {
+
+constexpr const char* kFooter = R"(
+A URI is node?area?address?type, e.g. 1?HREG?400010?float or 1?OUTP?1?boolean-8; the shell needs
+quotes around it. Each URI gets a line "URI = value"; one that fails gets its error on standard
+error and does not stop the others.
+
+Examples:
+  mrtu read --sim '1?HREG?400001?unsignedShort'
+  mrtu read --sim --json '1?IREG?300001?float' '1?INP?100001?boolean-8'
+  mrtu read --port /dev/ttyUSB0 --baud 9600 --parity even --trace '1?HREG?400001?int-10'
+  mrtu read --config line.cfg --port com1=/dev/ttyUSB0 --port com2=/dev/ttyUSB1 '3?OUTP?17?boolean')";
+
+struct ReadOptions {
+    LineOptions line;
+    bool json = false;
+    std::vector<std::string> uris;
+};
+
+using TagResult = runtime::Result<ITag*, runtime::ChannelError>;
+
+std::vector<TagResult> createTags(runtime::Channel& channel, const std::vector<std::string>& uris) {
+    std::vector<TagResult> tags;
+    tags.reserve(uris.size());
+    for (const std::string& uri : uris)
+        tags.push_back(channel.createTag(uri));
+    return tags;
+}
+
+void readOne(runtime::Channel& channel, const std::string& uri, const TagResult& tag,
+             Results& results) {
+    if (!tag) return results.failure(uri, tag.error(), ExitCode::Usage);
+    const auto value = channel.read(*tag.value());
+    if (!value) return results.failure(uri, value.error(), exitCodeOf(value.error().code));
+    results.value(uri, shapeOf(*tag.value()), value.value());
+}
+
+void read(CommandContext& context, const ReadOptions& options) {
+    Session session(context, options.line);
+    const std::vector<TagResult> tags = createTags(session.channel(), options.uris);
+    // A line that nothing is asked on need not be there.
+    const bool anyTag = std::any_of(tags.begin(), tags.end(), [](auto& tag) { return tag.ok(); });
+    if (anyTag) session.start();
+    Results results(context, options.json);
+    for (std::size_t i = 0; i < tags.size(); ++i) {
+        readOne(session.channel(), options.uris[i], tags[i], results);
+    }
+    results.finish();
+}
+
+}  // namespace
+
+void addReadCommand(CLI::App& app, CommandContext& context) {
+    const auto options = std::make_shared<ReadOptions>();
+    CLI::App* const command = app.add_subcommand("read", "Read tags and print their values");
+    addLineOptions(*command, options->line, context);
+    command->add_flag("--json", options->json, "Print one JSON array");
+    command->add_option("URI", options->uris, "Tags to read")->required();
+    command->footer(kFooter);
+    command->callback([options, &context] { read(context, *options); });
+}
+
+}  // namespace cli

@@ -1,0 +1,144 @@
+#include <fmt/format.h>
+#include <signal.h>
+
+#include <CLI/CLI.hpp>
+#include <atomic>
+#include <memory>
+#include <ostream>
+
+#include "cli/Commands.h"
+#include "cli/SimNodes.h"
+#include "sim/Simulator.h"
+
+namespace cli {
+namespace {
+
+constexpr const char* kFooter = R"(
+Prints the device to open and serves it until Ctrl-C. docs/simulator.md tells what the nodes hold.
+
+Examples:
+  mrtu sim
+  mrtu sim --ascii --node 1 --node 17 --link /tmp/line --trace
+  mrtu sim --fault exception=2,times=3)";
+
+struct SimOptions {
+    bool ascii = false;
+    bool plain = false;
+    bool trace = false;
+    std::vector<int> nodes;
+    std::string link;
+    std::vector<std::string> faults;
+};
+
+std::atomic<sim::Simulator*> g_serving{nullptr};
+
+extern "C" void endServing(int) {
+    if (sim::Simulator* const simulator = g_serving.load()) simulator->requestStop();
+}
+
+/// Lets SIGINT and SIGTERM end the simulator while this object lives.
+class StopOnSignal {
+  public:
+    explicit StopOnSignal(sim::Simulator& simulator) {
+        g_serving.store(&simulator);
+        struct sigaction action {};
+        action.sa_handler = endServing;
+        sigaction(SIGINT, &action, &oldInterrupt_);
+        sigaction(SIGTERM, &action, &oldTerminate_);
+    }
+    ~StopOnSignal() {
+        sigaction(SIGINT, &oldInterrupt_, nullptr);
+        sigaction(SIGTERM, &oldTerminate_, nullptr);
+        g_serving.store(nullptr);
+    }
+    StopOnSignal(const StopOnSignal&) = delete;
+    StopOnSignal& operator=(const StopOnSignal&) = delete;
+
+  private:
+    struct sigaction oldInterrupt_ {};
+    struct sigaction oldTerminate_ {};
+};
+
+std::vector<sim::NodeOptions> nodesOf(const SimOptions& options) {
+    std::vector<sim::NodeOptions> nodes = defaultSimNodes(options.plain);
+    if (options.nodes.empty()) return nodes;
+    const sim::NodeOptions pattern = nodes.front();
+    nodes.clear();
+    for (const int address : options.nodes) {
+        nodes.push_back(pattern);
+        nodes.back().address = static_cast<std::uint8_t>(address);
+    }
+    return nodes;
+}
+
+std::unique_ptr<sim::Simulator> makeSimulator(CommandContext& context, const SimOptions& options) {
+    sim::SimulatorOptions simOptions;
+    simOptions.mode = options.ascii ? sim::Mode::ascii : sim::Mode::rtu;
+    simOptions.nodes = nodesOf(options);
+    simOptions.link = options.link;
+    if (options.trace) {
+        simOptions.trace = [&err = context.err, mode = simOptions.mode](const sim::LineEvent& e) {
+            err << sim::describe(e, mode) << std::endl;
+        };
+    }
+    try {
+        return std::make_unique<sim::Simulator>(std::move(simOptions));
+    } catch (const std::invalid_argument& error) {
+        throw CommandError(ExitCode::Usage, error.what());
+    }
+}
+
+void addFaults(sim::Simulator& simulator, const std::vector<std::string>& faults) {
+    for (const std::string& text : faults) {
+        std::string error;
+        const auto fault = sim::parseFault(text, error);
+        if (!fault) throw CommandError(ExitCode::Usage, "--fault " + text + ": " + error);
+        simulator.faults().add(*fault);
+    }
+}
+
+void announce(std::ostream& out, const sim::Simulator& simulator, const SimOptions& options) {
+    const int node = options.nodes.empty() ? 1 : options.nodes.front();
+    out << fmt::format("simulated {} line: {}\n", options.ascii ? "ASCII" : "RTU",
+                       simulator.path());
+    out << fmt::format("try: mrtu read --port {}{} '{}?HREG?400001?unsignedShort'\n",
+                       simulator.path(), options.ascii ? " --ascii" : "", node);
+    out << "Ctrl-C ends it." << std::endl;
+}
+
+void serve(CommandContext& context, const SimOptions& options) {
+    const auto simulator = makeSimulator(context, options);
+    addFaults(*simulator, options.faults);
+    const StopOnSignal stopOnSignal(*simulator);
+    try {
+        simulator->start();
+    } catch (const std::system_error& error) {
+        throw CommandError(ExitCode::Port, error.what());
+    }
+    announce(context.out, *simulator, options);
+    if (simulator->wait() == sim::Simulator::End::hungUp) {
+        throw CommandError(ExitCode::Port, "the line hung up");
+    }
+}
+
+}  // namespace
+
+void addSimCommand(CLI::App& app, CommandContext& context) {
+    const auto options = std::make_shared<SimOptions>();
+    CLI::App* const command = app.add_subcommand("sim", "Serve a simulated line");
+    command->add_flag("--ascii", options->ascii, "ASCII frames instead of RTU");
+    command->add_option("--node", options->nodes, "A node of the line; default is 1 to 10")
+        ->type_name("N")
+        ->check(CLI::Range(1, 247))
+        ->allow_extra_args(false);
+    command->add_flag("--plain", options->plain, "Nodes without 32-bit registers");
+    command->add_option("--link", options->link, "Symbolic link to the device")->type_name("PATH");
+    command->add_option("--fault", options->faults, "What goes wrong with the next answers")
+        ->type_name("TEXT")
+        ->allow_extra_args(false);
+    command->add_flag("--trace", options->trace, "Show every frame on standard error");
+    command->footer(kFooter);
+    command->callback([options, &context] { serve(context, *options); });
+}
+
+}  // namespace cli
