@@ -1,0 +1,327 @@
+#include "framework/CfgParser.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace {
+
+constexpr int kNoNode = -1;
+
+std::vector<int> NodesOf(const std::string& text) {
+    const CfgParser parser(text.c_str());
+    std::vector<int> nodes;
+    for (int i = 0; i < parser.GetNodeCount(); ++i)
+        nodes.push_back(parser.GetNodeID(i));
+    return nodes;
+}
+
+// The raw value, or "(none)".
+std::string ParamOf(const std::string& text, const char* name) {
+    CfgParser parser(text.c_str());
+    const char* value = parser.GetParam(name);
+    return value == nullptr ? "(none)" : value;
+}
+
+TEST(CfgParser, NeedsItsMarker) {
+    struct Row {
+        const char* text;
+        bool known;
+    };
+    const Row rows[] = {
+        {"", false},
+        {"timeout=5", false},
+        {"CfgVer=2 timeout=5", false},
+        {"cfgver=1", false},
+        {"CfgVer=", false},
+        {"CfgVer=1", true},
+        {"junk CfgVer=1 a=1", true},
+        {"CfgVer=12", true},
+    };
+    for (const Row& row : rows) {
+        EXPECT_EQ(CfgParser(row.text).KnownFormat(), row.known) << row.text;
+    }
+}
+
+TEST(CfgParser, TakesNoTextForAnEmptyOne) {
+    CfgParser parser(nullptr);
+    EXPECT_FALSE(parser.KnownFormat());
+    EXPECT_EQ(parser.GetParam("a"), nullptr);
+}
+
+TEST(CfgParser, KeepsTheWholeTextAndNoNodesWithoutItsMarker) {
+    CfgParser parser("timeout=5 Node3::timeout=7");
+    EXPECT_EQ(parser.GetNodeCount(), 0);
+    EXPECT_STREQ(parser.GetParam("timeout"), "5");
+    EXPECT_STREQ(parser.GetParam("Node3::timeout"), "7");
+}
+
+TEST(CfgParser, IgnoresWhatIsInFrontOfItsMarker) {
+    EXPECT_EQ(ParamOf("timeout=5 CfgVer=1 timeout=7", "timeout"), "7");
+    EXPECT_EQ(ParamOf("timeout=5 CfgVer=1", "timeout"), "(none)");
+    EXPECT_EQ(NodesOf("Node1::a=1 CfgVer=1 Node2::a=1"), std::vector<int>{2});
+}
+
+TEST(CfgParser, EndsAtTheNextMarkerOfAnyVersion) {
+    for (const char* second : {"CfgVer=1", "CfgVer=2", "CfgVer="}) {
+        const std::string text = std::string("CfgVer=1 a=1 ") + second + " b=2 Node4::a=3";
+        EXPECT_EQ(ParamOf(text, "a"), "1") << text;
+        EXPECT_EQ(ParamOf(text, "b"), "(none)") << text;
+        EXPECT_EQ(NodesOf(text), std::vector<int>{}) << text;
+    }
+}
+
+TEST(CfgParser, ListsNodesInOrderOfFirstAppearance) {
+    const std::vector<std::pair<std::string, std::vector<int>>> rows = {
+        {"", {}},
+        {"Node3::a=1 Node1::a=1 Node3::b=1", {3, 1}},
+        {"Node::x=1", {0}},
+        {"NodeA::x=1", {}},
+        {"Node-1::x=1", {}},
+        {"Node 1::x=1", {}},
+        {"node1::x=1", {}},
+        {"Node1:x=1 Node2::x=1", {2}},
+        {"Node1x=1 Node2::x=1", {2}},
+        {"Node07::x=1 Node7::y=1", {7}},
+        {"NodeNode5::x=1", {5}},
+        {"x=Node6::", {6}},
+        {"Node1:::x Node2:: Node", {1, 2}},
+        {"Node99999999999::x=1", {2147483647}},
+        {"Node", {}},
+        {"Node12", {}},
+        {"Node12:", {}},
+    };
+    for (const auto& [body, nodes] : rows) {
+        EXPECT_EQ(NodesOf("CfgVer=1 " + body), nodes) << body;
+    }
+}
+
+TEST(CfgParser, NumbersNodesFromZeroOnly) {
+    const CfgParser parser("CfgVer=1 Node3::a=1 Node9::a=1");
+    EXPECT_EQ(parser.GetNodeCount(), 2);
+    EXPECT_EQ(parser.GetNodeID(1), 9);
+    EXPECT_EQ(parser.GetNodeID(2), 0);
+    EXPECT_EQ(parser.GetNodeID(-1), 0);
+}
+
+TEST(GetParam, FindsItemsWhereTheyBegin) {
+    struct Row {
+        const char* body;
+        const char* name;
+        const char* value;
+    };
+    const Row rows[] = {
+        {" timeout=7", "timeout", "7"},
+        {"timeout=7", "timeout", "7"},  // the body begins right behind the marker
+        {" xtimeout=5 timeout=7", "timeout", "7"},
+        {" timeout=5 timeout=7", "timeout", "5"},
+        {" Node2::timeout=9", "timeout", "(none)"},
+        {" Node2::timeout=9", "Node2::timeout", "9"},
+        {" Node12::timeout=9", "Node2::timeout", "(none)"},
+        {" Timeout=5", "timeout", "(none)"},
+        {" timeout =5", "timeout", "(none)"},
+        {" timeout", "timeout", "(none)"},
+        {" timeout= repeat=2", "timeout", ""},
+        {" timeout=", "timeout", ""},
+        {" a=b=c", "a", "b=c"},
+        {" a=x;y,z\"q\" b=1", "a", "x;y,z\"q\""},
+        {" a=x&nbsp;y", "a", "x&nbsp;y"},
+        {"\na=1\tb=2\rc=3\vd=4\fe=5", "a", "1"},
+        {"\na=1\tb=2\rc=3\vd=4\fe=5", "b", "2"},
+        {"\na=1\tb=2\rc=3\vd=4\fe=5", "c", "3"},
+        {"\na=1\tb=2\rc=3\vd=4\fe=5", "d", "4"},
+        {"\na=1\tb=2\rc=3\vd=4\fe=5", "e", "5"},
+        {" aa=1 a=2", "a", "2"},
+        {" a=a=a a=3", "a", "a=a"},
+    };
+    for (const Row& row : rows) {
+        EXPECT_EQ(ParamOf(std::string("CfgVer=1") + row.body, row.name), row.value)
+            << row.body << " / " << row.name;
+    }
+}
+
+TEST(GetParam, KeepsItsValueUntilTheNextCall) {
+    CfgParser parser("CfgVer=1 a=first b=second");
+    EXPECT_STREQ(parser.GetParam("a"), "first");
+    const char* second = parser.GetParam("b");
+    EXPECT_STREQ(second, "second");
+}
+
+constexpr int kBoth = CfgParser::commonOnly | CfgParser::nodeOnly;
+
+struct LookupRow {
+    const char* body;
+    int node;
+    int flags;
+    int result;
+    const char* value;  // "before" where the result delivers none
+};
+
+constexpr LookupRow kLookups[] = {
+    // a node's own value, then the common one
+    {"uart=com1 Node2::uart=com2", 2, 0, 0, "com2"},
+    {"uart=com1 Node2::uart=com2", 3, 0, 0, "com1"},
+    {"uart=com1", 2, 0, 0, "com1"},
+    {"Node3::uart=com3", 2, 0, 2, "before"},
+    {"", 2, 0, 2, "before"},
+    {"Node2::uart=", 2, 0, 0, ""},
+    {"Node0::uart=com5", 0, 0, 0, "com5"},
+    // common only: the prefix counts when that node asks
+    {"Node2::uart=com2", 2, 1, 4, "before"},
+    {"uart=com1 Node2::uart=com2", 2, 1, 4, "before"},
+    {"uart=com1 Node2::uart=com2", 3, 1, 0, "com1"},
+    {"uart=com1 Node2::uart=com2", kNoNode, 1, 0, "com1"},
+    {"Node2::uart=com2", kNoNode, 1, 2, "before"},
+    // node only
+    {"uart=com1 Node2::x=1", kNoNode, 2, 5, "before"},
+    {"Node2::uart=com2", kNoNode, 2, 1, "before"},
+    {"uart=com1", kNoNode, 2, 0, "com1"},
+    {"", kNoNode, 2, 2, "before"},
+    {"uart=com1 Node2::x=1", 2, 2, 0, "com1"},
+    {"Node2::uart=com2", 2, 2, 0, "com2"},
+    // no node, any place
+    {"uart=com1 Node2::uart=com2", kNoNode, 0, 0, "com1"},
+    {"Node2::uart=com2", kNoNode, 0, 2, "before"},
+    // the value stays raw
+    {"uart=a&nbsp;b", kNoNode, 0, 0, "a&nbsp;b"},
+    // the impossible request is noticed first
+    {"uart=com1 Node2::uart=com2", 2, kBoth, 6, "before"},
+    {"", kNoNode, kBoth, 6, "before"},
+};
+
+TEST(getParam, AnswersByPlaceAndFlags) {
+    for (const LookupRow& row : kLookups) {
+        CfgParser parser((std::string("CfgVer=1 ") + row.body).c_str());
+        std::string value = "before";
+        EXPECT_EQ(parser.getParam("uart", row.node, value, row.flags), row.result)
+            << row.body << " node " << row.node << " flags " << row.flags;
+        EXPECT_EQ(value, row.value) << row.body << " node " << row.node << " flags " << row.flags;
+    }
+}
+
+TEST(parseValue, TurnsEveryNbspIntoABlank) {
+    const std::pair<const char*, const char*> rows[] = {
+        {"", ""},
+        {"abc", "abc"},
+        {"a&nbsp;b", "a b"},
+        {"&nbsp;&nbsp;", "  "},
+        {"&nbsp;a&nbsp;&nbsp;b&nbsp;", " a  b "},
+        {"&NBSP;", "&NBSP;"},
+        {"&nbsp", "&nbsp"},
+        {"&&nbsp;nbsp;", "& nbsp;"},
+    };
+    for (const auto& [raw, text] : rows) {
+        std::string value = "before";
+        EXPECT_TRUE(CfgParserN::parseValue(raw, value)) << raw;
+        EXPECT_EQ(value, text) << raw;
+    }
+}
+
+TEST(parseValue, MayDecodeInPlace) {
+    std::string value = "a&nbsp;b";
+    EXPECT_TRUE(CfgParserN::parseValue(value, value));
+    EXPECT_EQ(value, "a b");
+}
+
+TEST(getErrorString, SaysWhatIsWrong) {
+    const std::pair<int, const char*> rows[] = {
+        {0, "Parser: parameter 'uart' has unknown error"},
+        {1, "Parser: parameter 'uart' has unknown error"},
+        {2, "Parser: parameter 'uart' is not found"},
+        {3, "Parser: parameter 'uart' has illegal value"},
+        {4, "Parser: parameter 'uart' can't be prefixed"},
+        {5, "Parser: parameter 'uart' can't be node independent"},
+        {6, "Parser: parameter 'uart' has invalid internal specification"},
+    };
+    for (const auto& [result, text] : rows) {
+        EXPECT_EQ(CfgParserN::getErrorString(static_cast<CfgParser::parseResult>(result), "uart"),
+                  text);
+    }
+}
+
+struct Reading {
+    bool goOn = false;
+    int value = -77;
+    std::string error;
+};
+
+Reading ReadInt(const std::string& body, int node, int flags, bool optional) {
+    CfgParser parser(("CfgVer=1 " + body).c_str());
+    Reading reading;
+    reading.goOn =
+        readParam<int>(parser, "timeout", node, reading.value, flags, optional, reading.error);
+    return reading;
+}
+
+TEST(readParam, ReadsIntegersWithAutomaticBase) {
+    const std::pair<const char*, int> rows[] = {
+        {"timeout=0x10", 16}, {"timeout=010", 8},   {"timeout=12abc", 12},
+        {"timeout=abc", 0},   {"timeout=", 0},      {"timeout=-5", -5},
+        {"timeout=+5", 5},    {"timeout=0X1F", 31}, {"timeout=99999999999", 2147483647},
+    };
+    for (const auto& [body, value] : rows) {
+        const Reading reading = ReadInt(body, kNoNode, 0, false);
+        EXPECT_TRUE(reading.goOn) << body;
+        EXPECT_EQ(reading.value, value) << body;
+        EXPECT_EQ(reading.error, "") << body;
+    }
+}
+
+TEST(readParam, LeavesTheDefaultOfAnOptionalParameter) {
+    const Reading reading = ReadInt("repeat=2", kNoNode, 0, true);
+    EXPECT_TRUE(reading.goOn);
+    EXPECT_EQ(reading.value, -77);
+    EXPECT_EQ(reading.error, "");
+}
+
+TEST(readParam, ReportsARequiredParameterThatIsMissing) {
+    const Reading reading = ReadInt("repeat=2", kNoNode, 0, false);
+    EXPECT_FALSE(reading.goOn);
+    EXPECT_EQ(reading.value, -77);
+    EXPECT_EQ(reading.error, "Parser: parameter 'timeout' is not found");
+}
+
+TEST(readParam, GoesOnWithoutANodeParameterWhenNoNodeAsks) {
+    const Reading reading = ReadInt("Node1::timeout=5", kNoNode, CfgParser::nodeOnly, false);
+    EXPECT_TRUE(reading.goOn);
+    EXPECT_EQ(reading.value, -77);
+    EXPECT_EQ(reading.error, "");
+}
+
+TEST(readParam, ReportsMisplacedParametersEvenWhenOptional) {
+    struct Row {
+        const char* body;
+        int node;
+        int flags;
+        const char* error;
+    };
+    const Row rows[] = {
+        {"Node1::timeout=5", 1, 1, "Parser: parameter 'timeout' can't be prefixed"},
+        {"timeout=5 Node1::x=1", kNoNode, 2,
+         "Parser: parameter 'timeout' can't be node independent"},
+        {"timeout=5", kNoNode, 3, "Parser: parameter 'timeout' has invalid internal specification"},
+    };
+    for (const Row& row : rows) {
+        const Reading reading = ReadInt(row.body, row.node, row.flags, true);
+        EXPECT_FALSE(reading.goOn) << row.body;
+        EXPECT_EQ(reading.value, -77) << row.body;
+        EXPECT_EQ(reading.error, row.error);
+    }
+}
+
+TEST(readParam, DecodesTexts) {
+    CfgParser parser("CfgVer=1 name=a&nbsp;b Node2::name=c");
+    std::string value = "before";
+    std::string error;
+    EXPECT_TRUE(readParam<std::string>(parser, "name", kNoNode, value, 0, false, error));
+    EXPECT_EQ(value, "a b");
+    EXPECT_TRUE(readParam<std::string>(parser, "name", 2, value, 0, false, error));
+    EXPECT_EQ(value, "c");
+    EXPECT_FALSE(readParam<std::string>(parser, "other", 2, value, 0, false, error));
+    EXPECT_EQ(value, "c");
+    EXPECT_EQ(error, "Parser: parameter 'other' is not found");
+}
+
+}  // namespace
