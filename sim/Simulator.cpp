@@ -224,10 +224,11 @@ bool Simulator::pause(std::uint32_t ms) {
 }
 
 void Simulator::hangUp() {
-    record(LineEvent::Kind::hangUp, {});
-    line_->hangUp();
+    // Marked and noted first: who has seen the line go may start() at once and finds it in the log.
     hungUp_ = true;
     ended_ = true;
+    record(LineEvent::Kind::hangUp, {});
+    line_->hangUp();
 }
 
 }  // namespace sim

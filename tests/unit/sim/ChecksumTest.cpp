@@ -1,0 +1,53 @@
+// Golden values: Modbus over Serial Line V1.02 and the catalogued check value of CRC-16/MODBUS.
+#include "sim/Checksum.h"
+
+#include <gtest/gtest.h>
+
+#include <string_view>
+
+namespace sim {
+namespace {
+
+Bytes bytesOf(std::string_view text) {
+    return {text.begin(), text.end()};
+}
+
+TEST(CrcTest, CheckValueIsTheCataloguedOne) {
+    EXPECT_EQ(crc16(bytesOf("123456789")), 0x4B37);
+}
+
+TEST(CrcTest, StandardsExampleOfFunctionSevenAtNodeTwo) {
+    EXPECT_EQ(crc16(Bytes{0x02, 0x07}), 0x1241);
+}
+
+TEST(CrcTest, NothingGivesTheStartValue) {
+    EXPECT_EQ(crc16({}), 0xFFFF);
+}
+
+TEST(CrcTest, EverySingleBitErrorChangesIt) {
+    const Bytes good{0x01, 0x03, 0x00, 0x00, 0x00, 0x0A};
+    for (std::size_t bit = 0; bit < good.size() * 8; ++bit) {
+        Bytes bad = good;
+        bad[bit / 8] = static_cast<std::uint8_t>(bad[bit / 8] ^ (1U << (bit % 8)));
+        EXPECT_NE(crc16(bad), crc16(good)) << "bit " << bit;
+    }
+}
+
+TEST(LrcTest, KnownRequest) {
+    EXPECT_EQ(lrc8(Bytes{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03}), 0x7E);
+}
+
+TEST(LrcTest, SumWithTheBytesIsZero) {
+    const Bytes bytes{0xFF, 0xFF, 0x80, 0x7F, 0x01};
+    std::uint32_t sum = lrc8(bytes);
+    for (const std::uint8_t byte : bytes)
+        sum += byte;
+    EXPECT_EQ(sum % 256, 0U);
+}
+
+TEST(LrcTest, NothingGivesZero) {
+    EXPECT_EQ(lrc8({}), 0);
+}
+
+}  // namespace
+}  // namespace sim

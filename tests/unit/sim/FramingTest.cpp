@@ -1,0 +1,176 @@
+#include "sim/Framing.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <string_view>
+
+namespace sim {
+namespace {
+
+Bytes bytesOf(std::string_view text) {
+    return {text.begin(), text.end()};
+}
+std::string textOf(const Bytes& bytes) {
+    return {bytes.begin(), bytes.end()};
+}
+
+const Bytes kReadRequest{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03};
+const Bytes kReadRequestRtu{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03, 0x76, 0x87};
+constexpr std::string_view kReadRequestAscii = ":1103006B00037E\r\n";
+
+/// Requests of eight bytes, once the function is there.
+std::optional<std::size_t> eightBytes(ByteView firstBytes) {
+    return firstBytes.size() < 2 ? std::nullopt : std::optional<std::size_t>(8);
+}
+
+std::optional<std::size_t> unknownLength(ByteView) {
+    return std::nullopt;
+}
+
+TEST(EncodeFrameTest, RtuCarriesTheLowByteOfTheCrcFirst) {
+    EXPECT_EQ(encodeFrame(Mode::rtu, kReadRequest), kReadRequestRtu);
+}
+
+TEST(EncodeFrameTest, AsciiCarriesUpperCaseDigitsAndCrLf) {
+    EXPECT_EQ(textOf(encodeFrame(Mode::ascii, kReadRequest)), kReadRequestAscii);
+}
+
+TEST(EncodeFrameTest, BrokenCheckDiffersInAllItsBitsOnly) {
+    const Bytes rtu{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03, 0x89, 0x78};
+    EXPECT_EQ(encodeFrame(Mode::rtu, kReadRequest, true), rtu);
+    EXPECT_EQ(textOf(encodeFrame(Mode::ascii, kReadRequest, true)), ":1103006B000381\r\n");
+}
+
+TEST(DecodeFrameTest, GoodFramesGiveTheMessage) {
+    EXPECT_EQ(decodeFrame(Mode::rtu, kReadRequestRtu).message, kReadRequest);
+    EXPECT_EQ(decodeFrame(Mode::ascii, bytesOf(kReadRequestAscii)).message, kReadRequest);
+}
+
+TEST(DecodeFrameTest, EveryTruncationIsDamagedAndKeepsItsBytes) {
+    for (std::size_t length = 0; length < kReadRequestRtu.size(); ++length) {
+        const auto frame = decodeFrame(Mode::rtu, ByteView(kReadRequestRtu).first(length));
+        EXPECT_TRUE(frame.damaged()) << length;
+        EXPECT_EQ(frame.raw.size(), length);
+    }
+    const Bytes ascii = bytesOf(kReadRequestAscii);
+    for (std::size_t length = 0; length < ascii.size(); ++length) {
+        EXPECT_TRUE(decodeFrame(Mode::ascii, ByteView(ascii).first(length)).damaged()) << length;
+    }
+}
+
+TEST(DecodeFrameTest, DamagedAsciiFrames) {
+    for (const std::string_view text : {
+             ":1103006B00037F\r\n",   // wrong LRC
+             ":1103006b00037E\r\n",   // lower case
+             ":1103006G00037E\r\n",   // no digit
+             ":1103006B00037E0\r\n",  // odd number of digits
+             ";1103006B00037E\r\n",   // no colon
+             ":1103006B00037E\n\r",   // ends swapped
+             ":11EF\r\n",             // no function
+         }) {
+        EXPECT_TRUE(decodeFrame(Mode::ascii, bytesOf(text)).damaged()) << text;
+    }
+}
+
+TEST(DecodeFrameTest, RtuFrameOf256BytesIsTheLongest) {
+    EXPECT_FALSE(decodeFrame(Mode::rtu, encodeFrame(Mode::rtu, Bytes(254, 0x55))).damaged());
+    EXPECT_TRUE(decodeFrame(Mode::rtu, encodeFrame(Mode::rtu, Bytes(255, 0x55))).damaged());
+}
+
+TEST(DecodeFrameTest, AsciiFrameOf254BytesIsTheLongest) {
+    EXPECT_FALSE(decodeFrame(Mode::ascii, encodeFrame(Mode::ascii, Bytes(254, 0x55))).damaged());
+    EXPECT_TRUE(decodeFrame(Mode::ascii, encodeFrame(Mode::ascii, Bytes(255, 0x55))).damaged());
+}
+
+TEST(RtuSplitterTest, AnnouncedLengthEndsAFrameAtOnce) {
+    FrameSplitter splitter(Mode::rtu, eightBytes);
+    const auto frames = splitter.add(kReadRequestRtu);
+    ASSERT_EQ(frames.size(), 1U);
+    EXPECT_EQ(frames[0].message, kReadRequest);
+    EXPECT_FALSE(splitter.waitsForSilence());
+}
+
+TEST(RtuSplitterTest, BytesMayArriveOneByOne) {
+    FrameSplitter splitter(Mode::rtu, eightBytes);
+    for (std::size_t i = 0; i + 1 < kReadRequestRtu.size(); ++i) {
+        EXPECT_TRUE(splitter.add(ByteView(kReadRequestRtu).subspan(i, 1)).empty()) << i;
+    }
+    EXPECT_EQ(splitter.add(ByteView(kReadRequestRtu).last(1)).size(), 1U);
+}
+
+TEST(RtuSplitterTest, FramesMayFollowOneAnotherInOneRead) {
+    FrameSplitter splitter(Mode::rtu, eightBytes);
+    Bytes twice = kReadRequestRtu;
+    twice.insert(twice.end(), kReadRequestRtu.begin(), kReadRequestRtu.end());
+    twice.push_back(0x11);
+    EXPECT_EQ(splitter.add(twice).size(), 2U);
+    EXPECT_TRUE(splitter.waitsForSilence());
+}
+
+TEST(RtuSplitterTest, UnknownLengthEndsAtSilence) {
+    FrameSplitter splitter(Mode::rtu, unknownLength);
+    EXPECT_TRUE(splitter.add(kReadRequestRtu).empty());
+    const auto frame = splitter.silence();
+    ASSERT_TRUE(frame);
+    EXPECT_EQ(frame->message, kReadRequest);
+    EXPECT_FALSE(splitter.silence());
+}
+
+TEST(RtuSplitterTest, WrongCrcWaitsForSilenceAndTakesAllWithIt) {
+    FrameSplitter splitter(Mode::rtu, eightBytes);
+    Bytes bad = kReadRequestRtu;
+    bad[7] ^= 0x01;
+    EXPECT_TRUE(splitter.add(bad).empty());
+    EXPECT_TRUE(splitter.add(kReadRequestRtu).empty());
+    const auto frame = splitter.silence();
+    ASSERT_TRUE(frame);
+    EXPECT_TRUE(frame->damaged());
+    EXPECT_EQ(frame->raw.size(), 16U);
+    EXPECT_EQ(splitter.add(kReadRequestRtu).size(), 1U);
+}
+
+TEST(RtuSplitterTest, EndlessBytesStayBounded) {
+    FrameSplitter splitter(Mode::rtu, unknownLength);
+    for (int i = 0; i < 100; ++i)
+        EXPECT_TRUE(splitter.add(Bytes(1000, 0xAA)).empty());
+    const auto frame = splitter.silence();
+    ASSERT_TRUE(frame);
+    EXPECT_TRUE(frame->damaged());
+    EXPECT_EQ(frame->raw.size(), kMaxRtuFrame + 1);
+}
+
+TEST(AsciiSplitterTest, FrameBeginsAtTheLastColonAndEndsAtCrLf) {
+    FrameSplitter splitter(Mode::ascii, unknownLength);
+    const auto frames = splitter.add(bytesOf("noise\r\n:1103:1103006B00037E\r\n:11"));
+    ASSERT_EQ(frames.size(), 1U);
+    EXPECT_EQ(frames[0].message, kReadRequest);
+    EXPECT_EQ(textOf(frames[0].raw), kReadRequestAscii);
+}
+
+TEST(AsciiSplitterTest, SilenceDoesNotEndAFrame) {
+    FrameSplitter splitter(Mode::ascii, unknownLength);
+    EXPECT_TRUE(splitter.add(bytesOf(":1103006B0")).empty());
+    EXPECT_FALSE(splitter.waitsForSilence());
+    EXPECT_FALSE(splitter.silence());
+    EXPECT_EQ(splitter.add(bytesOf("0037E\r\n")).size(), 1U);
+}
+
+TEST(AsciiSplitterTest, WrongLrcIsReportedAndTheNextFrameIsFound) {
+    FrameSplitter splitter(Mode::ascii, unknownLength);
+    const auto frames = splitter.add(bytesOf(":1103006B000300\r\n:1103006B00037E\r\n"));
+    ASSERT_EQ(frames.size(), 2U);
+    EXPECT_TRUE(frames[0].damaged());
+    EXPECT_FALSE(frames[1].damaged());
+}
+
+TEST(AsciiSplitterTest, EndlessFrameIsGivenUpAsDamaged) {
+    FrameSplitter splitter(Mode::ascii, unknownLength);
+    const auto frames = splitter.add(bytesOf(":" + std::string(2000, '0')));
+    ASSERT_EQ(frames.size(), 1U);
+    EXPECT_TRUE(frames[0].damaged());
+    EXPECT_EQ(frames[0].raw.size(), kMaxAsciiFrame + 1);
+}
+
+}  // namespace
+}  // namespace sim

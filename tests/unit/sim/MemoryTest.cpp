@@ -1,0 +1,76 @@
+#include "sim/Memory.h"
+
+#include <gtest/gtest.h>
+
+#include <stdexcept>
+
+namespace sim {
+namespace {
+
+struct ContentsCase {
+    Area area;
+    std::uint8_t node;
+    std::uint16_t address;
+    std::uint32_t value;
+};
+
+TEST(MemoryTest, ContentsFollowTheFormula) {
+    for (const ContentsCase& each : {
+             ContentsCase{Area::coil, 1, 0, 0},
+             ContentsCase{Area::coil, 1, 2, 1},
+             ContentsCase{Area::coil, 3, 0, 1},
+             ContentsCase{Area::discreteInput, 1, 0, 1},
+             ContentsCase{Area::discreteInput, 1, 1, 0},
+             ContentsCase{Area::discreteInput, 1, 4, 1},
+             ContentsCase{Area::holdingRegister, 1, 5, 1005},
+             ContentsCase{Area::holdingRegister, 66, 0, 464},
+             ContentsCase{Area::inputRegister, 1, 5, 31005},
+             ContentsCase{Area::inputRegister, 247, 9999, 24855},
+             ContentsCase{Area::longRegister, 1, 5, 100503015},
+             ContentsCase{Area::longRegister, 247, 65535, 1189666533},
+         }) {
+        EXPECT_EQ(initialValue(each.area, each.node, each.address), each.value)
+            << "area " << static_cast<int>(each.area) << " node " << int{each.node} << " address "
+            << each.address;
+    }
+}
+
+TEST(MemoryTest, EndsAtItsSizes) {
+    const Memory memory(1, {.coils = 8, .discreteInputs = 0, .holdingRegisters = 65536}, {});
+    EXPECT_TRUE(memory.has(Area::coil, 0, 8));
+    EXPECT_TRUE(memory.has(Area::coil, 7, 1));
+    EXPECT_FALSE(memory.has(Area::coil, 7, 2));
+    EXPECT_FALSE(memory.has(Area::coil, 8, 1));
+    EXPECT_FALSE(memory.has(Area::discreteInput, 0, 1));
+    EXPECT_TRUE(memory.has(Area::holdingRegister, 65535, 1));
+    EXPECT_FALSE(memory.has(Area::holdingRegister, 65535, 2));
+    EXPECT_FALSE(memory.has(Area::longRegister, 0, 1));
+}
+
+TEST(MemoryTest, LongRegistersCountFromTheirBase) {
+    const Memory memory(1, {}, LongRange{.base = 5000, .count = 10});
+    EXPECT_FALSE(memory.has(Area::longRegister, 4999, 1));
+    EXPECT_TRUE(memory.has(Area::longRegister, 5000, 10));
+    EXPECT_FALSE(memory.has(Area::longRegister, 5000, 11));
+    EXPECT_EQ(memory.get(Area::longRegister, 5000), 600018000U);
+}
+
+TEST(MemoryTest, KeepsOnlyTheBitsOfTheArea) {
+    Memory memory(1, {}, LongRange{});
+    memory.set(Area::coil, 0, 0xFFFFFFFF);
+    memory.set(Area::holdingRegister, 0, 0x12345678);
+    memory.set(Area::longRegister, 5000, 0x12345678);
+    EXPECT_EQ(memory.get(Area::coil, 0), 1U);
+    EXPECT_EQ(memory.get(Area::holdingRegister, 0), 0x5678U);
+    EXPECT_EQ(memory.get(Area::longRegister, 5000), 0x12345678U);
+}
+
+TEST(MemoryTest, RefusesWhatNoAddressReaches) {
+    EXPECT_THROW(Memory(1, {.coils = 65537}, {}), std::invalid_argument);
+    EXPECT_THROW(Memory(1, {}, LongRange{.base = 65535, .count = 2}), std::invalid_argument);
+    EXPECT_THROW(Memory(1, {}, LongRange{.base = 1, .count = 0xFFFFFFFF}), std::invalid_argument);
+    EXPECT_NO_THROW(Memory(1, {}, LongRange{.base = 65535, .count = 1}));
+}
+
+}  // namespace
+}  // namespace sim
