@@ -34,6 +34,7 @@ void addCommands(CLI::App& app, CommandContext& context) {
     addConsoleCommand(app, context);
     addOverrideCommand(app, context);
     addInfoCommand(app, context);
+    addDescribeCommand(app, context);
     addSimCommand(app, context);
 }
 

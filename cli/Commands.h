@@ -11,5 +11,6 @@ void addSimCommand(CLI::App& app, CommandContext& context);
 void addInfoCommand(CLI::App& app, CommandContext& context);
 void addConsoleCommand(CLI::App& app, CommandContext& context);
 void addOverrideCommand(CLI::App& app, CommandContext& context);
+void addDescribeCommand(CLI::App& app, CommandContext& context);
 
 }  // namespace cli
