@@ -66,7 +66,7 @@ typename Pattern<Real>::Bits parsePattern(std::string_view text, std::string_vie
     const char* const end = digits.data() + digits.size();
     const auto format = hex ? std::chars_format::hex : std::chars_format::general;
     const auto [stop, error] = std::from_chars(digits.data(), end, value, format);
-    const bool infinity = digits == "inf";
+    const bool infinity = !hex && digits == "inf";
     if (error == std::errc::invalid_argument || stop != end || std::isnan(value) ||
         (std::isinf(value) && !infinity && digits.find_first_of("iI") == 0)) {
         refuse(text, "no number for", type);

@@ -1,0 +1,125 @@
+#include "cli/LineOptions.h"
+
+#include <gtest/gtest.h>
+
+#include <CLI/CLI.hpp>
+#include <cstdio>
+#include <fstream>
+#include <sstream>
+
+#include "cli/ConfigText.h"
+
+namespace {
+
+/// @return what the words of a command line set.
+cli::LineOptions parsed(std::vector<std::string> words) {
+    CLI::App app;
+    cli::LineOptions options;
+    std::ostringstream sink;
+    cli::CommandContext context{
+        .out = sink, .err = sink, .exitCode = cli::ExitCode::Done, .pluginOption = {}};
+    std::vector<std::string> uris;
+    cli::addLineOptions(app, options, context);
+    app.add_option("URI", uris);
+    std::reverse(words.begin(), words.end());
+    app.parse(words);
+    return options;
+}
+
+std::string configOf(std::vector<std::string> words) {
+    return cli::configTextOf(parsed(std::move(words)));
+}
+
+/// A file of its own for each test, gone afterwards.
+class ConfigFile {
+  public:
+    explicit ConfigFile(const std::string& text)
+        : path_(testing::TempDir() + "line_options_" +
+                testing::UnitTest::GetInstance()->current_test_info()->name()) {
+        std::ofstream(path_, std::ios::binary) << text;
+    }
+    ~ConfigFile() { std::remove(path_.c_str()); }
+    ConfigFile(const ConfigFile&) = delete;
+    ConfigFile& operator=(const ConfigFile&) = delete;
+    const std::string& path() const { return path_; }
+
+  private:
+    std::string path_;
+};
+
+TEST(LineOptions, WithoutAFileTheDefaultConfigurationServes) {
+    EXPECT_EQ(configOf({}), cli::defaultConfig("1"));
+    EXPECT_EQ(configOf({"--sim"}), cli::defaultConfig("3"));
+}
+
+TEST(LineOptions, ShortFormsSetTheirItems) {
+    const std::string text =
+        configOf({"--baud", "9600", "--parity", "even", "--stopbits", "2", "--node", "5", "--model",
+                  "2", "--timeout", "100", "--ascii", "--set", "repeat=0"});
+    EXPECT_EQ(cli::itemOf(text, "baudrate"), "9600");
+    EXPECT_EQ(cli::itemOf(text, "parity"), "even");
+    EXPECT_EQ(cli::itemOf(text, "stopbits"), "2");
+    EXPECT_EQ(cli::itemOf(text, "defNodeId"), "5");
+    EXPECT_EQ(cli::itemOf(text, "model"), "2");
+    EXPECT_EQ(cli::itemOf(text, "timeout"), "100");
+    EXPECT_EQ(cli::itemOf(text, "txMode"), "ASCII");
+    EXPECT_EQ(cli::itemOf(text, "repeat"), "0");
+}
+
+TEST(LineOptions, OptionsWinOverTheFile) {
+    const ConfigFile file("CfgVer=1\ntimeout=1\nbits=7\nuart=com3\n");
+    const std::string text = configOf({"--config", file.path(), "--set", "timeout=2", "--ascii"});
+    EXPECT_EQ(cli::itemOf(text, "timeout"), "2");
+    EXPECT_EQ(cli::itemOf(text, "bits"), "7");
+    EXPECT_EQ(cli::itemOf(text, "uart"), "com3");
+}
+
+TEST(LineOptions, AsciiNeedsDataBitsAndGetsThem) {
+    const ConfigFile file("CfgVer=1 uart=com1");
+    EXPECT_EQ(cli::itemOf(configOf({"--config", file.path(), "--ascii"}), "bits"), "8");
+    EXPECT_EQ(cli::itemOf(configOf({"--config", file.path()}), "bits"), std::nullopt);
+}
+
+TEST(LineOptions, AFileThatCannotBeTakenIsAUsageError) {
+    const ConfigFile zero(std::string("CfgVer=1 \0 x=1", 14));
+    const ConfigFile* const files[] = {&zero};
+    for (const std::string& path : {files[0]->path(), std::string("/nowhere/at/all"),
+                                    testing::TempDir(), std::string("/dev/zero")}) {
+        try {
+            configOf({"--config", path});
+            ADD_FAILURE() << path << " was taken";
+        } catch (const cli::CommandError& error) {
+            EXPECT_EQ(error.code(), cli::ExitCode::Usage) << path;
+            EXPECT_NE(std::string(error.what()).find(path), std::string::npos) << error.what();
+        }
+    }
+}
+
+TEST(LineOptions, APortTakesOneWordAndCanBeRepeated) {
+    const cli::LineOptions options =
+        parsed({"--port", "com1=/dev/a", "--port", "com2=/dev/b", "1?HREG?400001?int"});
+    const auto ports = cli::portsOf(options, "CfgVer=1 uart=com1");
+    ASSERT_EQ(ports.size(), 2U);
+    EXPECT_EQ(ports[0].name, "com1");
+    EXPECT_EQ(ports[0].device, "/dev/a");
+    EXPECT_EQ(ports[1].name, "com2");
+    EXPECT_EQ(ports[1].device, "/dev/b");
+}
+
+TEST(LineOptions, ADeviceAloneServesTheConfiguredPort) {
+    const auto ports =
+        cli::portsOf(parsed({"--port", "/dev/serial/by-id/com=1"}), "CfgVer=1 uart=com5");
+    ASSERT_EQ(ports.size(), 1U);
+    EXPECT_EQ(ports[0].name, "com5");
+    EXPECT_EQ(ports[0].device, "/dev/serial/by-id/com=1");
+}
+
+TEST(LineOptions, APortWithoutDeviceIsRefused) {
+    EXPECT_THROW(cli::portsOf(parsed({"--port", "com1="}), "CfgVer=1"), cli::CommandError);
+}
+
+TEST(LineOptions, SimulatorAndPortExcludeEachOther) {
+    EXPECT_THROW(parsed({"--sim", "--port", "/dev/a"}), CLI::ParseError);
+}
+
+}  // namespace

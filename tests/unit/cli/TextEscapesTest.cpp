@@ -1,0 +1,60 @@
+// Texts of devices on a terminal.
+#include "cli/TextEscapes.h"
+
+#include <gtest/gtest.h>
+
+#include "tests/unit/cli/ValueSupport.h"
+
+namespace {
+
+using cli::escapeText;
+using cli::unescapeText;
+using cli_test::bytesOf;
+
+struct Row {
+    std::string_view bytes;
+    std::string_view text;
+};
+
+using namespace std::string_view_literals;
+
+constexpr Row kRows[] = {
+    {"plain"sv, "plain"},
+    {"say \"hi\""sv, "say \\\"hi\\\""},
+    {"back\\slash"sv, "back\\\\slash"},
+    {"a\nb\rc\td"sv, "a\\nb\\rc\\td"},
+    {"a\0b"sv, "a\\0b"},
+    {"\x1b[2J"sv, "\\x1b[2J"},  // would clear the screen
+    {"\x7f"sv, "\\x7f"},
+    {"K\xc3\xbchler"sv, "K\xc3\xbchler"},            // u umlaut in UTF-8
+    {"K\xfchler"sv, "K\\xfchler"},                   // u umlaut in Latin-1
+    {"\xc2\x9b"sv, "\\xc2\\x9b"},                    // a control character in UTF-8
+    {"\xc0\x80"sv, "\\xc0\\x80"},                    // overlong
+    {"\xed\xa0\x80"sv, "\\xed\\xa0\\x80"},           // surrogate
+    {"\xf4\x90\x80\x80"sv, "\\xf4\\x90\\x80\\x80"},  // beyond U+10FFFF
+    {"\xe2\x82\xac"sv, "\xe2\x82\xac"},              // euro sign
+    {"\xe2\x82"sv, "\\xe2\\x82"},                    // cut
+    {"\xf0\x9f\x94\xa7"sv, "\xf0\x9f\x94\xa7"},      // four bytes
+};
+
+TEST(TextEscapes, KeepPrintableTextAndHideTheRest) {
+    for (const Row& row : kRows)
+        EXPECT_EQ(escapeText(bytesOf(row.bytes)), row.text);
+}
+
+TEST(TextEscapes, AreUndone) {
+    for (const Row& row : kRows) {
+        EXPECT_EQ(unescapeText(row.text), bytesOf(row.bytes)) << row.text;
+        EXPECT_EQ(unescapeText('"' + std::string(row.text) + '"'), bytesOf(row.bytes)) << row.text;
+    }
+}
+
+TEST(TextEscapes, QuotesInsideAnUnquotedTextStandForThemselves) {
+    EXPECT_EQ(unescapeText("a\"b\""), bytesOf("a\"b\""));
+}
+
+TEST(TextEscapes, HexadecimalDigitsMayBeUpperCase) {
+    EXPECT_EQ(unescapeText("\\xAf"), bytesOf("\xaf"));
+}
+
+}  // namespace

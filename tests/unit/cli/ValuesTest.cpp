@@ -1,0 +1,184 @@
+// Values that are accepted, and the way back.
+#include "cli/Values.h"
+
+#include <gtest/gtest.h>
+
+#include <bit>
+#include <cmath>
+#include <limits>
+#include <random>
+
+#include "cli/Numbers.h"
+#include "tests/unit/cli/ValueSupport.h"
+
+namespace {
+
+using cli::Bytes;
+using cli::formatValue;
+using cli::parseValue;
+using cli::ValueShape;
+using enum ICU_Type;
+
+struct Accepted {
+    ValueShape shape;
+    std::string_view text;
+    Bytes bytes;
+    std::string_view printed;  ///< Empty: as `text`.
+};
+
+const Accepted kAccepted[] = {
+    {{boolean, 1}, "0", {0}, ""},
+    {{boolean, 1}, "1", {1}, ""},
+    {{boolean, 1}, "false", {0}, "0"},
+    {{boolean, 1}, "true", {1}, "1"},
+    {{byte, 1}, "-128", {0x80}, ""},
+    {{byte, 1}, "127", {0x7F}, ""},
+    {{byte, 1}, "-0x80", {0x80}, "-128"},
+    {{short_, 2}, "-32768", {0x00, 0x80}, ""},
+    {{short_, 2}, "32767", {0xFF, 0x7F}, ""},
+    {{short_, 2}, "0x7fff", {0xFF, 0x7F}, "32767"},
+    {{short_, 2}, "-1", {0xFF, 0xFF}, ""},
+    {{short_, 2}, "-0", {0x00, 0x00}, "0"},
+    {{int_, 4}, "-2147483648", {0, 0, 0, 0x80}, ""},
+    {{int_, 4}, "2147483647", {0xFF, 0xFF, 0xFF, 0x7F}, ""},
+    {{int_, 4}, "+16909060", {4, 3, 2, 1}, "16909060"},
+    {{unsignedByte, 1}, "255", {255}, ""},
+    {{unsignedByte, 1}, "0XfF", {255}, "255"},
+    {{unsignedShort, 2}, "65535", {0xFF, 0xFF}, ""},
+    {{unsignedShort, 2}, " \t258 ", {2, 1}, "258"},
+    {{unsignedShort, 2}, "010", {10, 0}, "10"},
+    {{unsignedShort, 2}, "-0", {0, 0}, "0"},
+    {{unsignedInt, 4}, "4294967295", {0xFF, 0xFF, 0xFF, 0xFF}, ""},
+    {{unsignedInt, 4}, "0x01020304", {4, 3, 2, 1}, "16909060"},
+    {{uint64, 8}, "18446744073709551615", {255, 255, 255, 255, 255, 255, 255, 255}, ""},
+    {{uint64, 8}, "0x0102030405060708", {8, 7, 6, 5, 4, 3, 2, 1}, "72623859790382856"},
+    {{int64, 8}, "-9223372036854775808", {0, 0, 0, 0, 0, 0, 0, 0x80}, ""},
+    {{int64, 8}, "9223372036854775807", {255, 255, 255, 255, 255, 255, 255, 0x7F}, ""},
+    {{float_, 4}, "1.5", {0, 0, 0xC0, 0x3F}, ""},
+    {{float_, 4}, "-0", {0, 0, 0, 0x80}, ""},
+    {{float_, 4}, "0.1", {0xCD, 0xCC, 0xCC, 0x3D}, ""},
+    {{float_, 4}, "+2", {0, 0, 0, 0x40}, "2"},
+    {{float_, 4}, "16777216", {0, 0, 0x80, 0x4B}, "16777216"},
+    {{float_, 4}, "3.4028235e+38", {0xFF, 0xFF, 0x7F, 0x7F}, ""},
+    {{float_, 4}, "1e-45", {1, 0, 0, 0}, ""},
+    {{float_, 4}, "0e99", {0, 0, 0, 0}, "0"},
+    {{float_, 4}, "inf", {0, 0, 0x80, 0x7F}, ""},
+    {{float_, 4}, "-inf", {0, 0, 0x80, 0xFF}, ""},
+    {{float_, 4}, "nan", {0, 0, 0xC0, 0x7F}, ""},
+    {{float_, 4}, "-nan", {0, 0, 0xC0, 0xFF}, ""},
+    {{float_, 4}, "nan(0x7f800001)", {1, 0, 0x80, 0x7F}, ""},
+    {{float_, 4}, "0x10", {0, 0, 0x80, 0x41}, "16"},
+    {{float_, 4}, "0x1.8p3", {0, 0, 0x40, 0x41}, "12"},
+    {{float_, 4}, "-0x0p0", {0, 0, 0, 0x80}, "-0"},
+    {{double_, 8}, "0.1", {0x9A, 0x99, 0x99, 0x99, 0x99, 0x99, 0xB9, 0x3F}, ""},
+    {{double_, 8}, "5e-324", {1, 0, 0, 0, 0, 0, 0, 0}, ""},
+    {{double_, 8}, "1.7976931348623157e+308", {255, 255, 255, 255, 255, 255, 0xEF, 0x7F}, ""},
+    {{double_, 8}, "nan(0x7ff0000000000001)", {1, 0, 0, 0, 0, 0, 0xF0, 0x7F}, ""},
+    {{string, 4}, "\"ab\"", {'a', 'b', 0, 0}, ""},
+    {{string, 4}, "ab", {'a', 'b', 0, 0}, "\"ab\""},
+    {{string, 4}, "", {0, 0, 0, 0}, "\"\""},
+    {{string, 4}, "\"\"", {0, 0, 0, 0}, ""},
+    {{string, 4}, "abcd", {'a', 'b', 'c', 'd'}, "\"abcd\""},
+    {{string, 4}, " a=b", {' ', 'a', '=', 'b'}, "\" a=b\""},
+    {{string, 4}, "\"\\0a\"", {0, 'a', 0, 0}, ""},
+    {{string, 0}, "\"\"", {}, ""},
+    {{binary, 3}, "0x0102ff", {1, 2, 255}, ""},
+    {{binary, 3}, "0102FF", {1, 2, 255}, "0x0102ff"},
+    {{booleanArray, 3}, "1,0,1", {1, 0, 1}, ""},
+    {{booleanArray, 3}, "true, 0 ,false", {1, 0, 0}, "1,0,0"},
+    {{byteArray, 2}, "-1,1", {255, 1}, ""},
+    {{shortArray, 4}, "-2,258", {0xFE, 0xFF, 2, 1}, ""},
+    {{intArray, 4}, "7", {7, 0, 0, 0}, ""},
+    {{intArray, 0}, "", {}, ""},
+    {{unsignedByteArray, 2}, "0x10,255", {16, 255}, "16,255"},
+    {{unsignedShortArray, 4}, "1,2", {1, 0, 2, 0}, ""},
+    {{unsignedIntArray, 8}, "1,4294967295", {1, 0, 0, 0, 255, 255, 255, 255}, ""},
+    {{floatArray, 8}, "1.5,-2", {0, 0, 0xC0, 0x3F, 0, 0, 0, 0xC0}, ""},
+    {{doubleArray, 8}, "2", {0, 0, 0, 0, 0, 0, 0, 0x40}, ""},
+    {{uint64Array, 8}, "1", {1, 0, 0, 0, 0, 0, 0, 0}, ""},
+    {{int64Array, 8}, "-1", {255, 255, 255, 255, 255, 255, 255, 255}, ""},
+};
+
+TEST(Values, AreReadByTheTagsType) {
+    for (const Accepted& row : kAccepted) {
+        SCOPED_TRACE(cli::typeName(row.shape) + ": " + std::string(row.text));
+        EXPECT_EQ(parseValue(row.shape, row.text), row.bytes);
+    }
+}
+
+TEST(Values, ArePrintedInOneForm) {
+    for (const Accepted& row : kAccepted) {
+        const std::string_view expected = row.printed.empty() ? row.text : row.printed;
+        EXPECT_EQ(formatValue(row.shape, row.bytes), expected) << cli::typeName(row.shape);
+    }
+}
+
+/// Every type that has a text form, with room for a few items.
+std::vector<ValueShape> writableShapes() {
+    std::vector<ValueShape> shapes;
+    for (const cli::ValueType& row : cli::kValueTypes) {
+        if (row.kind == cli::ValueKind::Opaque) continue;
+        shapes.push_back({row.type, row.name.ends_with('-') ? row.bytes * std::size_t{5}
+                                                            : std::size_t{row.bytes}});
+    }
+    return shapes;
+}
+
+bool countsBits(ICU_Type type) {
+    return type == boolean || type == booleanArray;
+}
+
+TEST(Values, ReadBackExactlyWhateverTheirBits) {
+    std::mt19937 random(20240501);
+    ASSERT_EQ(writableShapes().size(), 24U);
+    for (const ValueShape shape : writableShapes()) {
+        for (int round = 0; round < 2000; ++round) {
+            Bytes bytes(shape.bytes);
+            for (auto& b : bytes) {
+                b = static_cast<std::uint8_t>(random() & (countsBits(shape.type) ? 1 : 255));
+            }
+            const std::string text = formatValue(shape, bytes);
+            ASSERT_EQ(parseValue(shape, text), bytes) << cli::typeName(shape) << ": " << text;
+        }
+    }
+}
+
+TEST(Values, EveryKindOfFloatReadsBackExactly) {
+    // Sign and exponent whole, the mantissa at its ends and in between.
+    for (std::uint32_t top = 0; top < 512; ++top) {
+        for (const std::uint32_t low : {0U, 1U, 0x2AAAAAU, 0x400000U, 0x7FFFFFU}) {
+            Bytes bytes;
+            cli::appendLittleEndian(bytes, top << 23 | low, 4);
+            const std::string text = formatValue({float_, 4}, bytes);
+            ASSERT_EQ(parseValue({float_, 4}, text), bytes) << text;
+        }
+    }
+}
+
+TEST(Values, WholeNumberRangesEndWhereTheTypesEnd) {
+    const auto range = [](ICU_Type type) { return cli::rangeText(cli::rowOf(type)); };
+    EXPECT_EQ(range(byte), "-128..127");
+    EXPECT_EQ(range(short_), "-32768..32767");
+    EXPECT_EQ(range(int_), "-2147483648..2147483647");
+    EXPECT_EQ(range(int64), "-9223372036854775808..9223372036854775807");
+    EXPECT_EQ(range(unsignedByte), "0..255");
+    EXPECT_EQ(range(unsignedShort), "0..65535");
+    EXPECT_EQ(range(unsignedInt), "0..4294967295");
+    EXPECT_EQ(range(uint64), "0..18446744073709551615");
+}
+
+TEST(Values, TypesWithoutATextFormAreShownAsBytes) {
+    EXPECT_EQ(formatValue({time, 10}, Bytes{1, 2, 3, 4, 5, 6, 7, 8, 9, 10}),
+              "0x0102030405060708090a");
+    EXPECT_EQ(formatValue({object, 0}, Bytes{}), "0x");
+}
+
+TEST(Values, TypesAreNamedAsUrisNameThem) {
+    EXPECT_EQ(cli::typeName({int_, 4}), "int");
+    EXPECT_EQ(cli::typeName({intArray, 40}), "int-10");
+    EXPECT_EQ(cli::typeName({string, 20}), "string-20");
+    EXPECT_EQ(cli::typeName({booleanArray, 16}), "boolean-16");
+    EXPECT_EQ(cli::typeName({int64Array, 16}), "int64-2");
+}
+
+}  // namespace
