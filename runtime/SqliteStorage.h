@@ -8,8 +8,11 @@
 
 #include "runtime/Result.h"
 #include "runtime/Storage.h"
+#include "runtime/StoragePath.h"
 
 namespace runtime {
+
+class SqliteDatabase;
 
 /// Why a storage file could not be opened.
 enum class StorageFault {
@@ -24,13 +27,6 @@ struct StorageError {
     StorageFault fault;
     std::string text;  ///< One line for a person; names the file.
 };
-
-/// The default place: "$XDG_STATE_HOME/mrtu/overrides.db", else
-/// "$HOME/.local/state/mrtu/overrides.db". A variable that is unset, empty or not an absolute path
-/// does not count. Empty when neither does.
-std::string defaultStoragePath();
-/// The same from given values; null for an unset variable.
-std::string storagePathFrom(const char* xdgStateHome, const char* home);
 
 /// A value whose write has returned without a failure survives the death of the process and of
 /// the system. Several processes may use one file at a time. docs/storage.md shows the layout.
@@ -77,16 +73,17 @@ class SqliteStorage final : public Storage {
     static constexpr int kBusyTimeoutMs = 5000;
 
   private:
-    class Database;
-    SqliteStorage(std::unique_ptr<Database> database, std::string path);
+    SqliteStorage(std::unique_ptr<SqliteDatabase> database, std::string path);
 
     void write(const char* section, const char* key, const StoredValue& value);
     bool find(const char* section, const char* key, StoredValue& value);
     bool findName(const char* section, int index, std::string& name);
     void fail(const std::string& what);
+    void failStep(const std::string& what);
+    bool complete(const char* section, const char* key);
 
     mutable std::mutex mutex_;
-    std::unique_ptr<Database> database_;
+    std::unique_ptr<SqliteDatabase> database_;
     std::string path_;
     std::string failure_;
 };

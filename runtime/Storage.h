@@ -31,6 +31,13 @@ class Storage : public IPermanentStorage2 {
     virtual std::vector<std::string> sections() = 0;
     /// @return every key of a section with its value, ordered byte by byte.
     virtual std::vector<StoredEntry> entries(const std::string& section) = 0;
+
+  protected:
+    /// Keeps a text until the calling thread's next call of this.
+    static const char* keptForThread(std::string text);
+    /// Copies a text with its terminating zero. @return 1, or 0 with `buffer` untouched when it
+    /// does not fit.
+    static int copyInto(const std::string& text, char* buffer, int size);
 };
 
 }  // namespace runtime

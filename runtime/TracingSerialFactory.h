@@ -1,7 +1,6 @@
 // A serial factory that shows every frame that passes through another one.
 #pragma once
 
-#include <atomic>
 #include <chrono>
 #include <cstdint>
 #include <functional>

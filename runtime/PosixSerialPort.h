@@ -1,0 +1,77 @@
+// One open serial port on a POSIX terminal.
+#pragma once
+
+#include <linux/serial.h>
+#include <termios.h>
+
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "platform/ISerialFactory.h"
+#include "runtime/FileDescriptor.h"
+#include "runtime/PosixLine.h"
+#include "runtime/PosixSerialFactory.h"
+#include "runtime/Result.h"
+#include "runtime/SerialSettings.h"
+
+namespace runtime {
+
+/// What a port is opened with.
+struct PortRequest {
+    std::string name;    ///< "com1" ..
+    std::string device;  ///< "/dev/ttyS0" ..
+    int gapFloorMs = 0;  ///< The shortest silence that ends a frame.
+};
+
+/// A terminal that this object alone has open. Its destruction puts back the settings that were
+/// found and closes it.
+class PosixSerialPort final : public ISerialPort {
+  public:
+    /// Opens a device exclusively and notes its settings.
+    /// @param errors  Told what configure() complains about.
+    /// @return the port, or why there is none, e.g. "com1: /dev/ttyS9: Permission denied",
+    /// "com1: /dev/null: not a terminal", "com1: /dev/ttyS0: in use".
+    static Result<std::unique_ptr<PosixSerialPort>, std::string> open(
+        const PortRequest& request, std::shared_ptr<SerialErrors> errors);
+
+    ~PosixSerialPort();
+    PosixSerialPort(const PosixSerialPort&) = delete;
+    PosixSerialPort& operator=(const PosixSerialPort&) = delete;
+
+    /// Also checks that the terminal took the settings over, and starts with empty queues. In the
+    /// RS-485 modes the kernel switches the direction where the port has that ability; elsewhere
+    /// the port is used as it is, since adapters commonly switch by themselves.
+    int configure(int baud, int parity, int dataBits, int stopBits, int mode) override;
+    void purge() override;
+    int receiveByte(unsigned char* byte, int timeoutMs, int reserved) override;
+    /// Returns when the bytes are on the wire. Fails when that takes a second longer than the
+    /// characters themselves do; what is left is thrown away then.
+    int send(const unsigned char* data, int length) override;
+    int receiveFrame(unsigned char* data, int maxLength, int timeoutMs, int gapMs, int* received,
+                     int reserved) override;
+
+    /// The open terminal, for questions that the interface does not answer.
+    int descriptor() const { return fd_.get(); }
+
+  private:
+    PosixSerialPort(const PortRequest& request, std::shared_ptr<SerialErrors> errors,
+                    FileDescriptor fd, const termios& found);
+    std::string applyFormat();
+    std::string applyDirection();
+    bool changeDirection(serial_rs485 wanted);
+    void restore();
+
+    std::string label_;
+    int gapFloorMs_;
+    std::shared_ptr<SerialErrors> errors_;
+    FileDescriptor fd_;
+    PosixLine line_;
+    termios found_;
+    std::optional<serial_rs485> foundDirection_;  ///< Nothing for a port without the ability.
+    std::optional<serial_rs485> direction_;       ///< In force now.
+    bool pseudo_;
+    SerialSettings settings_;
+};
+
+}  // namespace runtime

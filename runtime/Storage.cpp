@@ -1,0 +1,21 @@
+#include "runtime/Storage.h"
+
+#include <cstring>
+#include <utility>
+
+namespace runtime {
+
+const char* Storage::keptForThread(std::string text) {
+    thread_local std::string kept;
+    kept = std::move(text);
+    return kept.c_str();
+}
+
+int Storage::copyInto(const std::string& text, char* buffer, int size) {
+    const std::size_t needed = std::strlen(text.c_str()) + 1;
+    if (buffer == nullptr || size < 0 || needed > static_cast<std::size_t>(size)) return 0;
+    std::memcpy(buffer, text.c_str(), needed);
+    return 1;
+}
+
+}  // namespace runtime
