@@ -1,0 +1,120 @@
+// From the configuration to the settings of the line.
+#include "tests/unit/mrtu/DriverTest.h"
+
+#include "mrtu/SerialSettings.h"
+
+namespace {
+
+using driver_test::configText;
+using driver_test::DriverTest;
+using driver_test::ScriptedPort;
+
+class ConfigTest : public DriverTest {
+  protected:
+    /// The settings that the port gets.
+    ScriptedPort::Settings opened(const std::string& items) {
+        port.forget();
+        start(items);
+        driver->Stop();
+        return port.settings().empty() ? ScriptedPort::Settings{} : port.settings().back();
+    }
+
+    /// The message of a refused configuration.
+    std::string refusal(const std::string& text) {
+        plantError();
+        EXPECT_EQ(0, driver->Config(text.c_str())) << text;
+        EXPECT_EQ(-1, driver->GetLastError()) << text;
+        return driver->GetLastErrorString();
+    }
+};
+
+TEST_F(ConfigTest, SettingsReachThePort) {
+    EXPECT_EQ((ScriptedPort::Settings{9600, 0, 8, 1, 0}), opened(""));
+    EXPECT_EQ((ScriptedPort::Settings{115200, 1, 7, 2, 2}),
+              opened("txMode=ASCII baudrate=115200 parity=even bits=7 stopbits=2 mode=RS-422"));
+}
+
+TEST_F(ConfigTest, ParityWordsWithoutRegardToCase) {
+    const std::pair<const char*, int> words[] = {
+        {"none", 0}, {"NONE", 0}, {"even", 1}, {"EVEN", 1}, {"Even", 1},
+        {"odd", 2},  {"oDD", 2},  {"mark", 3}, {"Mark", 3},
+    };
+    for (const auto& [word, code] : words)
+        EXPECT_EQ(code, opened(std::string("parity=") + word).parity) << word;
+}
+
+TEST_F(ConfigTest, OtherParityWordsAreRefused) {
+    for (const char* word : {"space", "n", "0", "evenn", "non"})
+        EXPECT_EQ("Parser: parameter 'parity' has invalid value",
+                  refusal(configText(std::string("parity=") + word)))
+            << word;
+    EXPECT_EQ("Parser: parameter 'parity' has invalid value", refusal(configText("parity=")));
+}
+
+TEST_F(ConfigTest, ModeWordsInExactCase) {
+    EXPECT_EQ(0, opened("mode=RS-232").mode);
+    EXPECT_EQ(1, opened("mode=RS-485").mode);
+    EXPECT_EQ(2, opened("mode=RS-422").mode);
+    for (const char* word : {"rs-485", "RS485", "RS-485P", "0"})
+        EXPECT_EQ("Parser: parameter 'mode' has invalid value",
+                  refusal(configText(std::string("mode=") + word)))
+            << word;
+}
+
+TEST_F(ConfigTest, ParityIsReportedBeforeMode) {
+    EXPECT_EQ("Parser: parameter 'parity' has invalid value",
+              refusal(configText("parity=x mode=y")));
+}
+
+TEST_F(ConfigTest, ManagersMessagesAreTheProtocolsErrors) {
+    EXPECT_EQ("Parser: unknown format", refusal("timeout=5"));
+    EXPECT_EQ("parameter 'maxOptLen' out of range", refusal(configText("maxOptLen=-1")));
+    EXPECT_EQ("Parser: parameter 'defNodeId' is not found", refusal("CfgVer=1 "));
+    EXPECT_EQ("Parser: parameter 'uart' is not found", refusal("CfgVer=1 defNodeId=1"));
+}
+
+TEST_F(ConfigTest, DataBitsFollowTheTransmissionMode) {
+    EXPECT_EQ(8, opened("txMode=RTU bits=7").dataBits);
+    EXPECT_EQ(7, opened("txMode=ASCII bits=7").dataBits);
+    EXPECT_EQ(7, opened("txMode=rtu bits=7").dataBits);
+    EXPECT_EQ(8, opened("bits=7").dataBits) << "RTU is the default";
+}
+
+TEST_F(ConfigTest, RtuNeedsNoDataBits) {
+    EXPECT_NE(0, driver->Config("CfgVer=1 txMode=RTU defNodeId=1 uart=com1 baudrate=9600 "
+                                "parity=none stopbits=1 mode=RS-232"));
+    EXPECT_EQ("Parser: parameter 'bits' is not found",
+              refusal("CfgVer=1 txMode=ASCII defNodeId=1 uart=com1 baudrate=9600 parity=none "
+                      "stopbits=1 mode=RS-232"));
+}
+
+TEST_F(ConfigTest, RecordsStayFilledWhenParityIsRefused) {
+    refusal(configText("timeout=77 parity=x"));
+    EXPECT_EQ(77, driver->getParamManager()->getNodeParams(1)->timeout);
+}
+
+TEST_F(ConfigTest, RecordsStayAsTheyWereWhenTheTextIsRefused) {
+    configure("timeout=77");
+    refusal("CfgVer=1 timeout=5");
+    EXPECT_EQ(77, driver->getParamManager()->getNodeParams(1)->timeout);
+}
+
+TEST(SerialSettingsTest, InterCharacterGap) {
+    const std::pair<int, int> gaps[] = {
+        {150, 800},  {300, 400},      {600, 200},           {1200, 100}, {2400, 50},  {4800, 25},
+        {9600, 13},  {19200, 7},      {38400, 4},           {57600, 3},  {115200, 2}, {119999, 2},
+        {120000, 1}, {120001, 1},     {500000, 1},          {1, 120000}, {0, 1},      {-1, 1},
+        {-9600, 1},  {2147483647, 1}, {-2147483647 - 1, 1},
+    };
+    for (const auto& [baud, gap] : gaps)
+        EXPECT_EQ(gap, _MRTU::interCharacterGap(baud)) << baud;
+}
+
+TEST(SerialSettingsTest, ListedBaudRates) {
+    for (const int baud : {150, 300, 600, 1200, 2400, 4800, 9600, 19200, 38400, 57600, 115200})
+        EXPECT_TRUE(_MRTU::isListedBaudRate(baud)) << baud;
+    for (const int baud : {0, 1, 110, 149, 14400, 28800, 115201, 230400, -9600})
+        EXPECT_FALSE(_MRTU::isListedBaudRate(baud)) << baud;
+}
+
+}  // namespace
