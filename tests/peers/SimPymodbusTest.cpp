@@ -1,0 +1,51 @@
+// The client of pymodbus against the simulator, in both modes.
+#include <gtest/gtest.h>
+
+#include "RunProgram.h"
+#include "sim/Simulator.h"
+
+namespace {
+
+using sim::Area;
+
+// Debian's own interpreter: it is the one that sees Debian's python3-pymodbus.
+constexpr const char* kPython = "/usr/bin/python3";
+
+class SimPymodbusTest : public testing::TestWithParam<std::pair<sim::Mode, const char*>> {};
+
+TEST_P(SimPymodbusTest, EveryFunctionCodeAgrees) {
+    const auto installed = peers::runProgram({kPython, "-c", "import pymodbus.client"});
+    ASSERT_EQ(installed.exitCode, 0)
+        << "pymodbus is missing: apt-get install python3-pymodbus python3-serial-asyncio\n"
+        << installed.output;
+
+    const auto [mode, name] = GetParam();
+    sim::Simulator simulator({.mode = mode, .nodes = {{.address = 7}}});
+    simulator.start();
+    const auto result = peers::runProgram(
+        {kPython, PEERS_DIRECTORY "/pymodbus_client.py", name, simulator.path(), "7"});
+    EXPECT_EQ(result.exitCode, 0);
+    EXPECT_EQ(result.output,
+              "coils 1 0 0 1 0 0 1 0 0\n"
+              "inputs 0 0 0 1 1 0 0 0 1\n"
+              "holding 7005 7006 7007\n"
+              "input 37005 37006 37007\n"
+              "coil written\n"
+              "register written\n"
+              "coils written\n"
+              "registers written\n"
+              "back 7200 1 65535 256 7204\n"
+              "beyond 2\n");
+    EXPECT_EQ(simulator.slave().get(7, Area::coil, 100), 1U);
+    EXPECT_EQ(simulator.slave().get(7, Area::holdingRegister, 100), 4711U);
+    EXPECT_EQ(simulator.slave().get(7, Area::coil, 201), 1U);
+    EXPECT_EQ(simulator.slave().get(7, Area::coil, 202), 0U);
+    EXPECT_EQ(simulator.slave().get(7, Area::coil, 203), 1U);
+}
+
+INSTANTIATE_TEST_SUITE_P(Modes, SimPymodbusTest,
+                         testing::Values(std::pair{sim::Mode::rtu, "rtu"},
+                                         std::pair{sim::Mode::ascii, "ascii"}),
+                         [](const auto& each) { return std::string(each.param.second); });
+
+}  // namespace
