@@ -138,7 +138,11 @@ const char* ProtocolBase::GetIdent() const {
 }
 
 void ProtocolBase::SetIdent(const char* ident) {
-    ident_ = orEmpty(ident);
+    try {
+        ident_ = orEmpty(ident);
+    } catch (const std::bad_alloc&) {
+        SetError(-1, "Out of memory");
+    }
 }
 
 int ProtocolBase::GetLastError() const {
