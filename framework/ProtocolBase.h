@@ -128,9 +128,10 @@ class ProtocolBase : public IProtocol7 {
     void SetTagError(const TagBase* tag);
     /// Destroys every tag that this object owns.
     void DeleteTags();
+    /// @return whether the tag is an array that has item `index`; sets the error when not.
+    bool arrayItemInRange(const ITag* tag, int index);
 
   private:
-    bool arrayItemInRange(const ITag* tag, int index);
     int refuseEvents();
     int runCommand(const std::vector<std::string>& words, char* answer, int size);
     int commandInfo(char* answer, int size) const;
