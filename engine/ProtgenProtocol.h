@@ -2,6 +2,7 @@
 // blocks that one request can carry and calls the driver's hooks.
 #pragma once
 
+#include <cstdint>
 #include <mutex>
 
 #include "engine/ProtgenTag.h"
@@ -12,6 +13,10 @@
 /// bits and writes it back; all writes of one object exclude each other meanwhile, so that two
 /// threads writing different bits of one register lose no update. When such a read fails nothing is
 /// written.
+/// Addresses in front of, or behind the memory type's index range, lengths below 1 and writes to a
+/// read-only memory are refused with -1 before anything is sent. What a failed read would have
+/// stored is not stored, whichever of its requests failed; a failed write leaves the blocks in
+/// front of the failed one written.
 /// Every ITag that comes in was made by CreateTagBase() of the same object.
 /// Threads: reads and writes may run concurrently when the driver's hooks may.
 class ProtgenProtocol : public ProtocolBase {
@@ -60,5 +65,16 @@ class ProtgenProtocol : public ProtocolBase {
                                 idal_error_t* status);
 
   private:
+    int readBits(const ProtgenTag& tag, unsigned char* data, std::int64_t count);
+    bool readItems(const ProtgenTag& tag, int address, unsigned char* data, int count);
+    int writeBits(const ProtgenTag& tag, const unsigned char* data, std::int64_t count);
+    bool writeItems(const ProtgenTag& tag, int address, const unsigned char* data, int count);
+    bool itemsAreAddressed(const ProtgenTag& tag, bool write) const;
+    int requestLimit(const ProtgenTag& tag, int count, bool write) const;
+    bool refuseWrite(const ProtgenTag& tag, std::int64_t items);
+    bool refuse(const char* fault);
+    int fail(int code, const char* text);
+
+    // Held by every write from its first read to its last request.
     std::mutex writeMutex_;
 };
