@@ -1,0 +1,168 @@
+// What the engine answers about tags without touching a device.
+#include <gtest/gtest.h>
+
+#include <array>
+
+#include "tests/unit/engine/FakeDriver.h"
+
+namespace {
+
+class Queries : public testing::Test {
+  protected:
+    const ITag* tag(const std::string& uri) { return driver_.tag(uri); }
+    bool optimized(const char* a, const char* b, bool write) {
+        return driver_.CanBeOptimized(tag(a), tag(b), write);
+    }
+    bool before(const char* a, const char* b) { return driver_.IsBefore(tag(a), tag(b)); }
+
+    FakeDriver driver_;
+};
+
+}  // namespace
+
+TEST_F(Queries, OneBlockServesTagsOfTheSameMemoryOfOneNode) {
+    EXPECT_TRUE(optimized("1?REG?0?short", "1?REG?900?double", false));
+    EXPECT_TRUE(optimized("1?REG?0?short", "1?REG?900?double", true));
+    EXPECT_TRUE(optimized("1?COIL?0?boolean", "1?COIL?9?boolean-7", false));
+}
+
+TEST_F(Queries, NodesModelsAndMemoriesNeverMix) {
+    EXPECT_FALSE(optimized("1?REG?0?short", "2?REG?1?short", false));
+    EXPECT_FALSE(optimized("1?REG?0?short", "9?REG?1?short", false));
+    EXPECT_FALSE(optimized("1?REG?0?short", "1?IREG?1?short", false));
+    EXPECT_FALSE(optimized("1?REG?0?short", "1?COIL?1?boolean", false));
+    EXPECT_FALSE(optimized("1?NOWHERE?0?short", "1?NOWHERE?1?short", false));
+}
+
+TEST_F(Queries, ReadOnlyMemoryIsOptimizedForReadingOnly) {
+    EXPECT_TRUE(optimized("1?IREG?0?short", "1?IREG?1?short", false));
+    EXPECT_FALSE(optimized("1?IREG?0?short", "1?IREG?1?short", true));
+}
+
+TEST_F(Queries, AreasOfTheDriverItselfAreNotOptimized) {
+    EXPECT_FALSE(optimized("1?AREA?0?unsignedInt", "1?AREA?0?unsignedInt", false));
+    EXPECT_FALSE(optimized("1?FLAG?0?boolean", "1?FLAG?0?boolean", true));
+}
+
+TEST_F(Queries, RegisterTagsAreOrderedByBit) {
+    EXPECT_TRUE(before("1?REG?1?short", "1?REG?2?short"));
+    EXPECT_FALSE(before("1?REG?2?short", "1?REG?2?int"));
+    EXPECT_TRUE(before("1?REG?2.3?boolean", "1?REG?2.4?boolean"));
+    EXPECT_FALSE(before("1?REG?2.4?boolean", "1?REG?2.3?boolean"));
+    EXPECT_FALSE(before("1?REG?2.16?boolean", "1?REG?3.0?boolean"));
+    EXPECT_TRUE(before("1?REG?3.0?boolean", "1?REG?2.17?boolean"));
+    EXPECT_FALSE(before("1?REG?2.0?short", "1?REG?2.9?short")) << "no bits, no sub-index";
+}
+
+TEST_F(Queries, BitTagsAreOrderedByTheirBit) {
+    EXPECT_TRUE(before("1?COIL?8?boolean", "1?COIL?9?boolean"));
+    EXPECT_FALSE(before("1?COIL?9?boolean", "1?COIL?8?boolean"));
+    EXPECT_FALSE(before("1?COIL?9.1?boolean", "1?COIL?9.2?boolean"));
+}
+
+TEST_F(Queries, NodeIsTheTagsNode) {
+    EXPECT_EQ(driver_.GetNodeID(tag("7?REG?0?short")), 7);
+}
+
+TEST_F(Queries, BitBlocksBelongToBitMemories) {
+    EXPECT_TRUE(driver_.CanReadBitBlock(tag("1?COIL?0?boolean")));
+    EXPECT_TRUE(driver_.CanWriteBitBlock(tag("1?COIL?0?boolean")));
+    EXPECT_FALSE(driver_.CanReadBitBlock(tag("1?REG?0?boolean")));
+    EXPECT_FALSE(driver_.CanWriteBitBlock(tag("1?REG?0?boolean")));
+}
+
+TEST_F(Queries, PartOfARegisterNeedsAReadBeforeAWrite) {
+    struct Row {
+        const char* uri;
+        bool needed;
+    };
+    constexpr Row kRows[] = {
+        {"1?REG?0?short", false},         {"1?REG?0?byte", true},
+        {"1?REG?0?string-3", true},       {"1?REG?0?string-4", false},
+        {"1?REG?0.3?boolean", true},      {"1?REG?0.3?boolean-16", true},
+        {"1?REG?0?boolean-16", false},    {"1?LONG?0?short", true},
+        {"1?LONG?0?float", false},        {"1?COIL?3?boolean", false},
+        {"1?COIL?3?boolean-9", false},    {"1?IREG?0?byte", false},
+        {"1?AREA?0?unsignedByte", false}, {"1?FLAG?0?unsignedByte", false},
+        {"1?REG?0?int-0", false},         {"1?NOWHERE?0?byte", false},
+    };
+    for (const Row& row : kRows)
+        EXPECT_EQ(driver_.NeedsReadBeforeWrite(tag(row.uri)), row.needed) << row.uri;
+}
+
+TEST_F(Queries, BitLimitFollowsTheItemLimit) {
+    const auto* coil = static_cast<const ProtgenTag*>(tag("1?COIL?0?boolean"));
+    EXPECT_EQ(driver_.getMaxBitCount(coil, false), 2000);
+    EXPECT_EQ(driver_.getMaxBitCount(coil, true), 1968);
+}
+
+TEST_F(Queries, DatagramLimitsComeFromTheModel) {
+    EXPECT_EQ(driver_.MaxDatagramItems(tag("1?REG?0?short")), 3);
+    EXPECT_EQ(driver_.MaxDatagramLength(tag("1?REG?0?short")), 10);
+    const ProtgenTag loose("1?REG?0?short", nullptr);
+    EXPECT_EQ(driver_.MaxDatagramItems(&loose), 0);
+    EXPECT_EQ(driver_.MaxDatagramLength(&loose), 0);
+}
+
+TEST_F(Queries, DatagramHoldsTagsOfOneNodeWhoseMemoriesTakePart) {
+    const ITag* reg = tag("1?REG?0?short");
+    EXPECT_TRUE(driver_.CanCoexistInDatagram(reg, tag("1?LONG?0?int")));
+    EXPECT_FALSE(driver_.CanCoexistInDatagram(reg, tag("1?COIL?0?boolean")));
+    EXPECT_FALSE(driver_.CanCoexistInDatagram(tag("1?COIL?0?boolean"), reg));
+    EXPECT_FALSE(driver_.CanCoexistInDatagram(reg, tag("2?REG?0?short")));
+    EXPECT_FALSE(driver_.CanCoexistInDatagram(reg, tag("9?REG?0?short")));
+    EXPECT_FALSE(driver_.CanCoexistInDatagram(reg, tag("1?NOWHERE?0?short")));
+}
+
+TEST_F(Queries, DatagramGrowsToItsLimits) {
+    const std::array<const ITag*, 3> tags = {tag("1?REG?0?int"), tag("1?REG?4?int"),
+                                             tag("1?REG?8?byte")};
+    EXPECT_TRUE(driver_.CanAddToDatagram(tags.data(), 0, tags[0]));
+    EXPECT_TRUE(driver_.CanAddToDatagram(tags.data(), 2, tag("1?REG?9?short")));
+    EXPECT_FALSE(driver_.CanAddToDatagram(tags.data(), 2, tag("1?REG?9?int"))) << "12 bytes of 10";
+    EXPECT_FALSE(driver_.CanAddToDatagram(tags.data(), 3, tag("1?REG?9?byte"))) << "4 tags of 3";
+    EXPECT_FALSE(driver_.CanAddToDatagram(tags.data(), 1, tag("2?REG?9?byte")));
+}
+
+TEST_F(Queries, DatagramReadIsRefusedUnlessTheDriverHasIt) {
+    const ITag* reg = tag("1?REG?0?short");
+    unsigned char data[2] = {7, 7};
+    idal_error_t status = 5;
+    EXPECT_EQ(driver_.ReadDatagram(&reg, 1, data), 0);
+    EXPECT_EQ(driver_.GetLastError(), -3);
+    EXPECT_STREQ(driver_.GetLastErrorString(), "Datagrams not supported");
+    EXPECT_EQ(driver_.ReadDatagramWithStatus(&reg, 1, data, &status), 0);
+    EXPECT_EQ(status, 5);
+    EXPECT_EQ(data[0], 7);
+    EXPECT_EQ(driver_.calls(), "");
+}
+
+namespace {
+
+class DatagramDriver : public FakeDriver {
+  public:
+    bool doReadDatagram(const ProtgenTag* const* tags, int count, unsigned char* data,
+                        idal_error_t* status) override {
+        for (int i = 0; i < count; ++i) {
+            data[i] = static_cast<unsigned char>(tags[i]->offset());
+            status[i] = kItemDone;
+        }
+        return true;
+    }
+};
+
+}  // namespace
+
+TEST(DatagramHook, ReceivesTheTagsAndStoresTheStatus) {
+    DatagramDriver driver;
+    const std::array<const ITag*, 2> tags = {driver.tag("1?REG?4?byte"),
+                                             driver.tag("1?REG?6?byte")};
+    std::array<unsigned char, 2> data{};
+    std::array<idal_error_t, 2> status{};
+    EXPECT_NE(driver.ReadDatagramWithStatus(tags.data(), 2, data.data(), status.data()), 0);
+    EXPECT_EQ(data, (std::array<unsigned char, 2>{4, 6}));
+    EXPECT_EQ(status, (std::array<idal_error_t, 2>{kItemDone, kItemDone}));
+    data = {};
+    EXPECT_NE(driver.ReadDatagram(tags.data(), 2, data.data()), 0);
+    EXPECT_EQ(data, (std::array<unsigned char, 2>{4, 6}));
+}
