@@ -1,0 +1,102 @@
+#include "runtime/Channel.h"
+
+#include <gmock/gmock.h>
+
+#include "tests/unit/runtime/FakeHost.h"
+
+namespace {
+
+using ::testing::ElementsAre;
+using namespace runtime;
+
+class ChannelTest : public ::testing::Test {
+  protected:
+    ChannelTest()
+        : module_(Module::bind(PluginLibrary::load(fakePlugin("works_plugin.so")).value(),
+                               host_.services)
+                      .value()),
+          channel_(module_.createProtocol("FAKE").value()) {}
+
+    FakeHost host_;
+    Module module_;
+    Channel channel_;
+};
+
+TEST_F(ChannelTest, RefusedConfigurationCarriesCodeAndText) {
+    const auto done = channel_.configure("bad");
+    ASSERT_FALSE(done);
+    EXPECT_EQ(done.error().code, -1);
+    EXPECT_EQ(done.error().text, "bad configuration");
+    EXPECT_TRUE(channel_.configure("good"));
+}
+
+TEST_F(ChannelTest, RefusedTagCarriesCodeAndText) {
+    const auto tag = channel_.createTag("bad");
+    ASSERT_FALSE(tag);
+    EXPECT_EQ(tag.error().text, "bad tag");
+}
+
+TEST_F(ChannelTest, ReadBeforeStartFails) {
+    const auto tag = channel_.createTag("tag");
+    ASSERT_TRUE(tag);
+    const auto value = channel_.read(*tag.value());
+    ASSERT_FALSE(value);
+    EXPECT_EQ(value.error().code, -3);
+    channel_.freeTag(tag.value());
+}
+
+TEST_F(ChannelTest, ReadsBackWhatWasWritten) {
+    const auto tag = channel_.createTag("tag");
+    ASSERT_TRUE(tag);
+    ASSERT_TRUE(channel_.start());
+    const std::uint8_t written[] = {0x12, 0x34};
+    ASSERT_TRUE(channel_.write(*tag.value(), written));
+    const auto value = channel_.read(*tag.value());
+    ASSERT_TRUE(value);
+    EXPECT_THAT(value.value(), ElementsAre(0x12, 0x34));
+    channel_.freeTag(tag.value());
+}
+
+TEST_F(ChannelTest, ValueOfWrongSizeNeverReachesTheDriver) {
+    const auto tag = channel_.createTag("tag");
+    ASSERT_TRUE(tag);
+    ASSERT_TRUE(channel_.start());
+    const std::uint8_t tooLong[] = {9, 9, 9};
+    const auto done = channel_.write(*tag.value(), tooLong);
+    ASSERT_FALSE(done);
+    EXPECT_EQ(done.error().code, -1);
+    EXPECT_EQ(done.error().text, "the value has 3 bytes, the tag takes 2");
+    EXPECT_THAT(channel_.read(*tag.value()).value(), ElementsAre(0, 0));
+    channel_.freeTag(tag.value());
+}
+
+TEST_F(ChannelTest, AnswerThatFillsTheBufferNeedsNoTerminator) {
+    EXPECT_EQ(channel_.command("count", 4), "0123");
+    EXPECT_EQ(channel_.command("count", 64), "0123456789");
+}
+
+TEST_F(ChannelTest, UnknownCommandHasNoAnswer) {
+    EXPECT_EQ(channel_.command("what"), std::nullopt);
+}
+
+TEST_F(ChannelTest, DriverOfEarlierGenerationReportsNoParameters) {
+    EXPECT_EQ(channel_.communicationParameters(), std::nullopt);
+}
+
+TEST_F(ChannelTest, StopEndsReading) {
+    const auto tag = channel_.createTag("tag");
+    ASSERT_TRUE(tag);
+    ASSERT_TRUE(channel_.start());
+    EXPECT_TRUE(channel_.started());
+    channel_.stop();
+    EXPECT_FALSE(channel_.started());
+    EXPECT_FALSE(channel_.read(*tag.value()));
+    channel_.freeTag(tag.value());
+}
+
+TEST_F(ChannelTest, IdentReachesTheDriver) {
+    channel_.setIdent("line 1");
+    EXPECT_STREQ(channel_.protocol().GetIdent(), "line 1");
+}
+
+}  // namespace

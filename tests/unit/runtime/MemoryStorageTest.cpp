@@ -1,0 +1,47 @@
+#include "runtime/MemoryStorage.h"
+
+#include <gmock/gmock.h>
+
+#include "tests/unit/runtime/StorageContract.h"
+
+namespace {
+
+using runtime::MemoryStorage;
+
+struct MemoryMaker {
+    MemoryStorage storage;
+};
+
+INSTANTIATE_TYPED_TEST_SUITE_P(InMemory, StorageContract, MemoryMaker);
+
+TEST(MemoryStorage, RefusedWriteChangesNothingAndSaysWhy) {
+    MemoryStorage storage;
+    storage.writeInt("line1", "baud", 9600);
+    storage.refuseWrites("no space left");
+    storage.writeInt("line1", "baud", 300);
+    storage.removeKey("line1", "baud");
+    EXPECT_TRUE(storage.failed());
+    EXPECT_EQ(storage.lastError(), "no space left");
+    EXPECT_EQ(storage.readInt("line1", "baud"), 9600);
+    EXPECT_EQ(storage.writes(), 1);
+
+    storage.refuseWrites("");
+    storage.clearFailure();
+    storage.writeInt("line1", "baud", 300);
+    EXPECT_FALSE(storage.failed());
+    EXPECT_EQ(storage.readInt("line1", "baud"), 300);
+}
+
+TEST(MemoryStorage, RefusedReadFindsNothingAndSaysWhy) {
+    MemoryStorage storage;
+    storage.writeString("line1", "tempNode1", "7");
+    storage.refuseReads("disk gone");
+    char untouched[] = "before";
+    EXPECT_STREQ(storage.readString("line1", "tempNode1"), "");
+    EXPECT_EQ(storage.keyCount("line1"), 0);
+    EXPECT_EQ(storage.readStringInto("line1", "tempNode1", untouched, sizeof untouched), 0);
+    EXPECT_STREQ(untouched, "before");
+    EXPECT_EQ(storage.lastError(), "disk gone");
+}
+
+}  // namespace
