@@ -11,8 +11,10 @@ using driver_test::ScriptedPort;
 
 class ConfigTest : public DriverTest {
   protected:
-    /// The settings that the port gets.
+    /// The settings that the port gets from a new driver: one that has started before keeps the
+    /// settings of its first start.
     ScriptedPort::Settings opened(const std::string& items) {
+        restartDriver();
         port.forget();
         start(items);
         driver->Stop();
