@@ -12,5 +12,6 @@ void addInfoCommand(CLI::App& app, CommandContext& context);
 void addConsoleCommand(CLI::App& app, CommandContext& context);
 void addOverrideCommand(CLI::App& app, CommandContext& context);
 void addDescribeCommand(CLI::App& app, CommandContext& context);
+void addCheckCommand(CLI::App& app, CommandContext& context);
 
 }  // namespace cli

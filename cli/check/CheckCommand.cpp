@@ -1,0 +1,171 @@
+// The sub-command `mrtu check`.
+#include <fmt/format.h>
+
+#include <CLI/CLI.hpp>
+#include <fstream>
+#include <iterator>
+#include <memory>
+#include <ostream>
+
+#include "cli/Commands.h"
+#include "cli/check/LintConfig.h"
+#include "cli/check/LintTags.h"
+#include "cli/describe/OfflineDriver.h"
+
+namespace cli {
+namespace {
+
+struct Options {
+    std::string configFile;
+    std::string tagsFile;
+    std::vector<std::string> uris;
+    std::string protocol = "MRTU";
+    bool json = false;
+    bool strict = false;
+};
+
+/// What came out of one run.
+struct Report {
+    Findings findings;
+    std::size_t tags = 0;
+    bool configAccepted = false;
+};
+
+std::string readFile(const std::string& name) {
+    std::ifstream file(name, std::ios::binary);
+    std::string text{std::istreambuf_iterator<char>(file), {}};
+    if (!file.is_open() || file.bad()) {
+        throw CommandError(ExitCode::Usage, fmt::format("can't read {}", name));
+    }
+    return text;
+}
+
+std::vector<TagLine> tagsOf(const Options& options) {
+    if (!options.tagsFile.empty()) return tagLines(options.tagsFile, readFile(options.tagsFile));
+    std::vector<TagLine> tags;
+    for (const std::string& uri : options.uris) {
+        tags.push_back(tagLine(uri, "argument", static_cast<int>(tags.size()) + 1, 1));
+    }
+    return tags;
+}
+
+void append(Findings& all, const Findings& more) {
+    all.insert(all.end(), more.begin(), more.end());
+}
+
+/// @return what the driver knows of the tag; nothing, with its message in `refusal`, when it
+/// refuses the tag.
+std::optional<TagFacts> factsOf(IProtocol& protocol, const std::string& uri, std::string& refusal) {
+    ITag* tag = protocol.CreateTag(uri.c_str());
+    if (tag == nullptr) {
+        refusal = protocol.GetLastErrorString();
+        return std::nullopt;
+    }
+    const auto* nodes = static_cast<IProtocol4*>(protocol.ConvertTo("IProtocol4"));
+    const TagFacts facts{.node = nodes != nullptr ? nodes->GetNodeID(tag) : 0,
+                         .byteOffset = tag->GetByteOffset(),
+                         .bitIndex = tag->GetBitIndex(),
+                         .type = tag->GetVarType(),
+                         .itemType = tag->GetItemType(),
+                         .length = tag->GetVarLength(),
+                         .readOnly = tag->IsReadOnly()};
+    protocol.FreeTag(tag);
+    return facts;
+}
+
+void checkTags(IProtocol& protocol, const TagSurroundings& surroundings, std::vector<TagLine>& tags,
+               Findings& out) {
+    for (TagLine& tag : tags) {
+        std::string refusal;
+        tag.facts = factsOf(protocol, tag.uri, refusal);
+        if (!tag.facts) out.push_back(tagRefusal(tag, surroundings, refusal));
+        append(out, lintTag(tag, surroundings));
+    }
+    append(out, lintOverlaps(tags, surroundings.description));
+}
+
+Report check(const Options& options, const std::string& plugin) {
+    const std::string text = readFile(options.configFile);
+    std::vector<TagLine> tags = tagsOf(options);
+    const OfflineDriver driver(plugin, options.protocol);
+    const Description description = parseDescription(driver.description());
+    const ScannedConfig config = scanConfig(options.configFile, text);
+
+    Report report;
+    report.tags = tags.size();
+    report.configAccepted = driver.protocol().Config(text.c_str()) != 0;
+    append(report.findings, lintConfig(config, description));
+    if (report.configAccepted) {
+        checkTags(driver.protocol(), surroundingsOf(text, description), tags, report.findings);
+    } else {
+        report.findings.push_back(
+            configRefusal(config, description, driver.protocol().GetLastErrorString()));
+    }
+    sortByPlace(report.findings);
+    return report;
+}
+
+std::string counted(int count, const char* word) {
+    return fmt::format("{} {}{}", count, word, count == 1 ? "" : "s");
+}
+
+std::string summary(const Report& report) {
+    std::string text = counted(countOf(report.findings, Severity::Error), "error") + ", " +
+                       counted(countOf(report.findings, Severity::Warning), "warning");
+    if (report.tags == 0) return text;
+    const std::string tags = counted(static_cast<int>(report.tags), "tag");
+    return text + (report.configAccepted
+                       ? fmt::format(" ({} checked)", tags)
+                       : fmt::format(" ({} not checked: the configuration is refused)", tags));
+}
+
+void print(const Report& report, bool json, std::ostream& out) {
+    if (!json) {
+        out << findingsText(report.findings) << summary(report) << '\n';
+        return;
+    }
+    const Json object{{"errors", countOf(report.findings, Severity::Error)},
+                      {"warnings", countOf(report.findings, Severity::Warning)},
+                      {"tagsChecked", report.configAccepted ? report.tags : 0},
+                      {"findings", findingsJson(report.findings)}};
+    // File names and texts may be anything; what is not UTF-8 is shown as such.
+    out << object.dump(2, ' ', false, Json::error_handler_t::replace) << '\n';
+}
+
+constexpr const char* kFooter = R"(
+Examples:
+  mrtu check --config line.cfg --tags tags.txt
+  mrtu check --config line.cfg --strict '1?HREG?400001?unsignedShort'
+
+The tags file has one URI a line; "#" begins a comment. No port is opened.
+Exit codes: 0 no errors, 1 warnings with --strict, 2 errors.)";
+
+}  // namespace
+
+void addCheckCommand(CLI::App& app, CommandContext& context) {
+    auto options = std::make_shared<Options>();
+    CLI::App* command =
+        app.add_subcommand("check", "Check a configuration and tags without touching a port");
+    command->add_option("--config", options->configFile, "The configuration's file")
+        ->type_name("FILE")
+        ->required();
+    CLI::Option* uris = command->add_option("uri", options->uris, "Tags to check");
+    command->add_option("--tags", options->tagsFile, "A file with one tag URI a line")
+        ->type_name("FILE")
+        ->excludes(uris);
+    command->add_flag("--json", options->json, "Print JSON");
+    command->add_flag("--strict", options->strict, "Warnings make the exit code 1");
+    command->add_option("--protocol", options->protocol, "The protocol's name in the plug-in")
+        ->type_name("NAME")
+        ->capture_default_str()
+        ->group("Driver");
+    addPluginOption(*command, context);
+    command->footer(kFooter);
+    command->callback([options, &context] {
+        const Report report = check(*options, pluginFile(context));
+        print(report, options->json, context.out);
+        context.exitCode = verdictOf(report.findings, options->strict);
+    });
+}
+
+}  // namespace cli

@@ -1,0 +1,75 @@
+#include "cli/check/ConfigScan.h"
+
+#include <algorithm>
+
+namespace cli {
+namespace {
+
+constexpr std::string_view kMarker = "CfgVer=1";
+constexpr std::string_view kNextMarker = "CfgVer=";
+constexpr std::string_view kWhite = " \t\n\v\f\r";
+constexpr std::string_view kNode = "Node";
+
+void splitNodePrefix(ScannedItem& item) {
+    const std::size_t colons = item.name.find("::");
+    if (!item.name.starts_with(kNode) || colons == std::string::npos) return;
+    item.node = item.name.substr(kNode.size(), colons - kNode.size());
+    item.key = item.name.substr(colons + 2);
+}
+
+ScannedItem itemOf(std::string_view word, Place place) {
+    ScannedItem item{};
+    const std::size_t equals = word.find('=');
+    item.word = word;
+    item.name = word.substr(0, equals);
+    item.key = item.name;
+    item.place = place;
+    item.valuePlace = place;
+    if (equals != std::string_view::npos) {
+        item.value = std::string(word.substr(equals + 1));
+        item.valuePlace.column += static_cast<int>(equals) + 1;
+    }
+    splitNodePrefix(item);
+    return item;
+}
+
+}  // namespace
+
+Place placeIn(const std::string& source, std::string_view text, std::size_t index) {
+    const std::string_view front = text.substr(0, index);
+    const auto lines = std::count(front.begin(), front.end(), '\n');
+    const std::size_t lineStart = front.rfind('\n');
+    const std::size_t column = lineStart == std::string_view::npos ? index : index - lineStart - 1;
+    return {source, static_cast<int>(lines) + 1, static_cast<int>(column) + 1};
+}
+
+const ScannedItem* ScannedConfig::item(std::string_view name) const {
+    const auto found = std::find_if(items.begin(), items.end(), [name](const ScannedItem& each) {
+        return each.name == name && each.value.has_value();
+    });
+    return found != items.end() ? &*found : nullptr;
+}
+
+ScannedConfig scanConfig(const std::string& source, std::string_view text) {
+    ScannedConfig config;
+    config.end = placeIn(source, text, text.size());
+    const std::size_t marker = text.find(kMarker);
+    if (marker == std::string_view::npos) return config;
+    config.marked = true;
+    if (const std::size_t word = text.find_first_not_of(kWhite); word < marker) {
+        config.ignoredFront = placeIn(source, text, word);
+    }
+
+    const std::size_t begin = marker + kMarker.size();
+    const std::size_t next = text.find(kNextMarker, begin);
+    if (next != std::string_view::npos) config.ignoredRemainder = placeIn(source, text, next);
+    const std::string_view body = text.substr(0, next);
+    for (std::size_t at = body.find_first_not_of(kWhite, begin); at != std::string_view::npos;) {
+        const std::size_t end = std::min(body.find_first_of(kWhite, at), body.size());
+        config.items.push_back(itemOf(body.substr(at, end - at), placeIn(source, text, at)));
+        at = body.find_first_not_of(kWhite, end);
+    }
+    return config;
+}
+
+}  // namespace cli

@@ -1,0 +1,64 @@
+#include "cli/check/Finding.h"
+
+#include <fmt/format.h>
+
+#include <algorithm>
+#include <map>
+#include <tuple>
+
+namespace cli {
+namespace {
+
+const char* word(Severity severity) {
+    return severity == Severity::Error ? "error" : "warning";
+}
+
+}  // namespace
+
+int countOf(const Findings& findings, Severity severity) {
+    return static_cast<int>(
+        std::count_if(findings.begin(), findings.end(),
+                      [&](const Finding& each) { return each.severity == severity; }));
+}
+
+void sortByPlace(Findings& findings) {
+    std::map<std::string, std::size_t> sources;
+    for (const Finding& finding : findings)
+        sources.emplace(finding.place.source, sources.size());
+    std::stable_sort(findings.begin(), findings.end(), [&](const Finding& a, const Finding& b) {
+        return std::tuple(sources[a.place.source], a.place.line, a.place.column) <
+               std::tuple(sources[b.place.source], b.place.line, b.place.column);
+    });
+}
+
+std::string findingsText(const Findings& findings) {
+    std::string text;
+    for (const Finding& finding : findings) {
+        text += fmt::format("{}:{}:{}: {}: {} [{}]\n", finding.place.source, finding.place.line,
+                            finding.place.column, word(finding.severity), finding.message,
+                            finding.rule);
+        if (!finding.suggestion.empty()) text += "    " + finding.suggestion + '\n';
+    }
+    return text;
+}
+
+Json findingsJson(const Findings& findings) {
+    Json json = Json::array();
+    for (const Finding& finding : findings) {
+        json.push_back({{"severity", word(finding.severity)},
+                        {"rule", finding.rule},
+                        {"source", finding.place.source},
+                        {"line", finding.place.line},
+                        {"column", finding.place.column},
+                        {"message", finding.message},
+                        {"suggestion", finding.suggestion}});
+    }
+    return json;
+}
+
+ExitCode verdictOf(const Findings& findings, bool warningsCount) {
+    if (countOf(findings, Severity::Error) > 0) return ExitCode::Usage;
+    return warningsCount && !findings.empty() ? ExitCode::Other : ExitCode::Done;
+}
+
+}  // namespace cli

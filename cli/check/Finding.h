@@ -1,0 +1,52 @@
+// What `mrtu check` has to say about one place of a text.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "cli/ExitCode.h"
+#include "cli/JsonValues.h"
+
+namespace cli {
+
+enum class Severity : std::uint8_t {
+    Warning,  ///< The driver accepts it, but hardly as it was meant.
+    Error,    ///< The driver refuses it.
+};
+
+/// Where something stands. Lines and columns count from 1, columns in bytes.
+struct Place {
+    std::string source;  ///< A file's name, or "argument" for tags of the command line.
+    int line;
+    int column;
+
+    bool operator==(const Place&) const = default;
+};
+
+struct Finding {
+    Severity severity;
+    std::string rule;  ///< A name that does not change, e.g. "unknown-key".
+    Place place;
+    std::string message;
+    std::string suggestion;  ///< What to write instead; may be empty.
+};
+
+using Findings = std::vector<Finding>;
+
+int countOf(const Findings& findings, Severity severity);
+
+/// Sorts by source (in order of first appearance), line and column; what shares a place keeps its
+/// order.
+void sortByPlace(Findings& findings);
+
+/// @return two lines a finding: "source:line:column: warning: message [rule]" and, where there is
+/// one, the suggestion below; nothing for no findings.
+std::string findingsText(const Findings& findings);
+/// @return an array with one object a finding.
+Json findingsJson(const Findings& findings);
+
+/// @return 2 (Usage) with errors, 1 (Other) with warnings that count, else 0 (Done).
+ExitCode verdictOf(const Findings& findings, bool warningsCount);
+
+}  // namespace cli

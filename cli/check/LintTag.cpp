@@ -1,0 +1,163 @@
+// The rules that look at one tag.
+#include <fmt/format.h>
+#include <fmt/ranges.h>
+
+#include <algorithm>
+
+#include "cli/ValueTypes.h"
+#include "cli/check/LintTags.h"
+#include "cli/check/NearestName.h"
+#include "cli/check/NumberText.h"
+
+namespace cli {
+namespace {
+
+constexpr std::size_t kNodeField = 0;
+constexpr std::size_t kAddressField = 2;
+constexpr std::size_t kTypeField = 3;
+
+/// The areas' address ranges begin a hundred thousand apart; in the five-digit form, ten thousand.
+constexpr long kDecade = 100000;
+constexpr long kShortDecade = 10000;
+
+void warn(Findings& out, const char* rule, const Place& place, std::string message,
+          std::string suggestion) {
+    out.push_back({Severity::Warning, rule, place, std::move(message), std::move(suggestion)});
+}
+
+void unnamedNode(const TagLine& tag, const TagSurroundings& around, Findings& out) {
+    const int node = static_cast<int>(readNumber(tag.node()).value);
+    if (around.nodes.contains(node)) return;
+    std::vector<std::string> names;
+    for (const int each : around.nodes)
+        names.push_back(std::to_string(each));
+    warn(
+        out, "unnamed-node", tag.placeOf(kNodeField),
+        fmt::format(
+            "the configuration does not name node {}; its parameters are those of all nodes", node),
+        names.empty() ? fmt::format("give it parameters of its own: Node{}::...", node)
+                      : fmt::format("named: {}", fmt::join(names, ", ")));
+}
+
+void oddNumber(const TagLine& tag, std::size_t field, const char* what, const std::string& text,
+               Findings& out) {
+    const NumberReading number = readNumber(text);
+    if (number.octal) {
+        warn(out, "octal-number", tag.placeOf(field),
+             fmt::format("{} '{}' begins with a zero and is read as octal: {}", what, text,
+                         number.value),
+             fmt::format("write {} for the decimal number", withoutLeadingZeroes(text)));
+    } else if (number.partial) {
+        warn(out, "not-a-number", tag.placeOf(field),
+             fmt::format("{} '{}' is no number and is read as {}", what, text, number.value),
+             "write a decimal number, or 0x and a hexadecimal one");
+    }
+}
+
+void oddNumbers(const TagLine& tag, const TagSurroundings& /*around*/, Findings& out) {
+    oddNumber(tag, kNodeField, "node", tag.node(), out);
+    oddNumber(tag, kAddressField, "address", tag.address(), out);
+    if (const auto subIndex = tag.subIndex()) {
+        oddNumber(tag, kAddressField, "sub-index", *subIndex, out);
+    }
+}
+
+bool hasFiveDigits(long address) {
+    return address >= kShortDecade && address < kDecade;
+}
+
+/// Five digits in an area whose addresses have six: the short form of the first ten thousand items.
+void shortAddress(const TagLine& tag, const TagSurroundings& around, Findings& out) {
+    const AreaInfo* area = around.description.area(tag.area());
+    const long address = readNumber(tag.address()).value;
+    if (area == nullptr || area->min < kDecade || !hasFiveDigits(address)) return;
+    const long base = area->min / kDecade * kDecade;
+    const long item = address - base / kDecade * kShortDecade;
+    warn(out, "short-address", tag.placeOf(kAddressField),
+         fmt::format("{} {} is taken as the five-digit form of {}, not as item {} of the area ({})",
+                     tag.area(), address, base + item, address, base + address),
+         fmt::format("write {} or {}", base + item, base + address));
+}
+
+/// Five digits in an area that begins at 0 or 1, as another area's short form would begin.
+void foreignAddress(const TagLine& tag, const TagSurroundings& around, Findings& out) {
+    const AreaInfo* area = around.description.area(tag.area());
+    const long address = readNumber(tag.address()).value;
+    const bool low = area != nullptr && area->min < kShortDecade && area->max >= kShortDecade;
+    if (!low || !area->bitRead || !hasFiveDigits(address)) return;
+    for (const AreaInfo& other : around.description.areas) {
+        if (other.min < kDecade || other.min / kDecade != address / kShortDecade) continue;
+        warn(out, "foreign-address", tag.placeOf(kAddressField),
+             fmt::format("{0} {1} is item {1} of {0}, although {1} looks like the five-digit form "
+                         "of an address in {2}",
+                         tag.area(), address, other.name),
+             fmt::format(
+                 "if {0} is meant, write {0} and the six-digit form {1}", other.name,
+                 address - other.min / kDecade * kShortDecade + other.min / kDecade * kDecade));
+        return;
+    }
+}
+
+bool isBitType(ICU_Type type) {
+    return type == ICU_Type::boolean || type == ICU_Type::booleanArray;
+}
+
+void ignoredSubIndex(const TagLine& tag, const TagSurroundings& around, Findings& out) {
+    const auto subIndex = tag.subIndex();
+    if (!tag.facts || !subIndex || readNumber(*subIndex).value == 0) return;
+    const AreaInfo* area = around.description.area(tag.area());
+    const bool bitArea = area != nullptr && area->naturalType == "boolean";
+    if (!bitArea && isBitType(tag.facts->type)) return;
+    warn(out, "ignored-subindex", tag.placeOf(kAddressField),
+         fmt::format("the sub-index '.{}' has no effect: {}", *subIndex,
+                     bitArea ? "an item of the area is a bit already"
+                             : "the data type begins with a register's first byte"),
+         bitArea ? fmt::format("write {}", tag.address())
+                 : fmt::format("write {}, or a data type of bits", tag.address()));
+}
+
+std::uint32_t flagOf(const std::string& name) {
+    for (std::size_t row = 0; row < kValueTypes.size(); ++row) {
+        if (kValueTypes[row].name == name) return std::uint32_t{1} << row;
+    }
+    return 0;
+}
+
+/// A conversion that can't be carried out is found when the tag is read or written, not before.
+void oddConversions(const TagLine& tag, const TagSurroundings& around, Findings& out) {
+    const DataTypeText type = dataTypeText(tag.dataType());
+    std::vector<std::string> names;
+    for (const ConversionInfo& each : around.description.conversions)
+        names.push_back(each.name);
+    for (const std::string& name : type.conversions) {
+        const ConversionInfo* conversion = around.description.conversion(name);
+        if (conversion == nullptr) {
+            const std::string nearest = nearestName(name, names);
+            warn(out, "unknown-conversion", tag.placeOf(kTypeField),
+                 fmt::format("unknown conversion '{}': every access will fail", name),
+                 nearest.empty() ? fmt::format("choices: {}", fmt::join(names, ", "))
+                                 : fmt::format("did you mean '{}'?", nearest));
+        } else if ((conversion->types & flagOf(type.name)) == 0) {
+            warn(out, "unsuitable-conversion", tag.placeOf(kTypeField),
+                 fmt::format("conversion '{}' is not meant for the data type {}", name, type.name),
+                 "'mrtu describe conversions' lists the data types");
+        }
+    }
+}
+
+constexpr void (*kRules[])(const TagLine&, const TagSurroundings&, Findings&) = {
+    unnamedNode, oddNumbers, shortAddress, foreignAddress, ignoredSubIndex, oddConversions,
+};
+
+}  // namespace
+
+Findings lintTag(const TagLine& tag, const TagSurroundings& surroundings) {
+    Findings out;
+    if (!tag.wellFormed() || !tag.facts) return out;
+    for (const auto rule : kRules)
+        rule(tag, surroundings, out);
+    sortByPlace(out);
+    return out;
+}
+
+}  // namespace cli
