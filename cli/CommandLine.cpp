@@ -8,8 +8,9 @@
 namespace cli {
 namespace {
 
-constexpr const char* kFooter = R"(
-Examples:
+constexpr const char* kNoCommand = "what shall be done? mrtu --help lists the commands";
+
+constexpr const char* kFooter = R"(Examples:
   mrtu read --sim '1?HREG?400001?unsignedShort' '1?OUTP?1?boolean-8'
   mrtu read --port /dev/ttyUSB0 --baud 9600 --parity even '1?HREG?400010?float(swap2)'
   mrtu write --port /dev/ttyUSB0 --verify '1?HREG?400001?short=-5'
@@ -23,7 +24,7 @@ Exit codes:
   0  all done
   1  anything that no other code names
   2  wrong usage, configuration, tag URI or value
-  3  the serial port can't be opened
+  3  the serial port can't be opened, or is gone
   4  no response
   5  bad reply or exception
 Of several failing URIs the first one's code counts.)";
@@ -35,6 +36,7 @@ void addCommands(CLI::App& app, CommandContext& context) {
     addOverrideCommand(app, context);
     addInfoCommand(app, context);
     addDescribeCommand(app, context);
+    addCheckCommand(app, context);
     addSimCommand(app, context);
 }
 
@@ -47,6 +49,8 @@ ExitCode answerParser(const CLI::App& app, const CLI::ParseError& error, Command
 ExitCode run(CLI::App& app, int argc, const char* const* argv, CommandContext& context) {
     try {
         app.parse(argc, argv);
+        // CLI11's own demand comes before its complaint about a misspelt command.
+        if (app.get_subcommands().empty()) throw CommandError(ExitCode::Usage, kNoCommand);
         return context.exitCode;
     } catch (const CLI::ParseError& error) {
         return answerParser(app, error, context);
@@ -74,7 +78,6 @@ int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::os
                  "mrtu");
     app.set_version_flag("--version", "mrtu " MRTU_VERSION);
     app.footer(kFooter);
-    app.require_subcommand(1);
     addCommands(app, context);
     ExitCode code = run(app, argc, argv, context);
     out.flush();

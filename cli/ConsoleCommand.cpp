@@ -12,8 +12,8 @@
 namespace cli {
 namespace {
 
-constexpr const char* kFooter = R"(
-With a COMMAND the driver's console is asked once and its answer printed as it is; an unknown
+constexpr const char* kFooter =
+    R"(With a COMMAND the driver's console is asked once and its answer printed as it is; an unknown
 command ends with exit code 2. Without one, commands are taken line by line, from a terminal with
 editing and history; "quit" or the end of the input ends the session. Without --port and --sim the
 driver stays stopped: commands that need no line still answer. Answers are cut at 16 KiB.

@@ -14,8 +14,7 @@
 namespace cli {
 namespace {
 
-constexpr const char* kFooter = R"(
-Examples:
+constexpr const char* kFooter = R"(Examples:
   mrtu info
   mrtu info --plugin ./libmrtu.so)";
 

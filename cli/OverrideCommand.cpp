@@ -10,8 +10,8 @@
 namespace cli {
 namespace {
 
-constexpr const char* kFooter = R"(
-An override takes the place of what the configuration says, and stays until it is cleared:
+constexpr const char* kFooter =
+    R"(An override takes the place of what the configuration says, and stays until it is cleared:
   node N=M              talk to slave address M where the configuration says node N; "off" disables
   modicon N=on|off      count the registers of node N from 1 (on) or from 0 (off)
   baud=, parity=, stop=, mode=   settings of the line

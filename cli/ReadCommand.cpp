@@ -8,8 +8,8 @@
 namespace cli {
 namespace {
 
-constexpr const char* kFooter = R"(
-A URI is node?area?address?type, e.g. 1?HREG?400010?float or 1?OUTP?1?boolean-8; the shell needs
+constexpr const char* kFooter =
+    R"(A URI is node?area?address?type, e.g. 1?HREG?400010?float or 1?OUTP?1?boolean-8; the shell needs
 quotes around it. Each URI gets a line "URI = value"; one that fails gets its error on standard
 error and does not stop the others.
 
@@ -35,11 +35,10 @@ std::vector<TagResult> createTags(runtime::Channel& channel, const std::vector<s
     return tags;
 }
 
-void readOne(runtime::Channel& channel, const std::string& uri, const TagResult& tag,
-             Results& results) {
+void readOne(Session& session, const std::string& uri, const TagResult& tag, Results& results) {
     if (!tag) return results.failure(uri, tag.error(), ExitCode::Usage);
-    const auto value = channel.read(*tag.value());
-    if (!value) return results.failure(uri, value.error(), exitCodeOf(value.error().code));
+    const auto value = session.channel().read(*tag.value());
+    if (!value) return results.failure(uri, value.error(), session.exitCodeFor(value.error()));
     results.value(uri, shapeOf(*tag.value()), value.value());
 }
 
@@ -51,9 +50,10 @@ void read(CommandContext& context, const ReadOptions& options) {
     if (anyTag) session.start();
     Results results(context, options.json);
     for (std::size_t i = 0; i < tags.size(); ++i) {
-        readOne(session.channel(), options.uris[i], tags[i], results);
+        readOne(session, options.uris[i], tags[i], results);
     }
     results.finish();
+    if (session.portGone()) complain(context, "the port is gone");
 }
 
 }  // namespace

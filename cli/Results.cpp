@@ -7,6 +7,11 @@
 #include "cli/Values.h"
 
 namespace cli {
+namespace {
+
+const std::string kNoReason = "refused";
+
+}  // namespace
 
 void Results::value(const std::string& uri, ValueShape shape, ByteView value) {
     if (json_) {
@@ -19,17 +24,26 @@ void Results::value(const std::string& uri, ValueShape shape, ByteView value) {
 
 void Results::failure(const std::string& uri, const runtime::ChannelError& error, ExitCode code) {
     first_.note(code);
+    // The driver's own areas refuse a value without a word.
+    const std::string& text = error.text.empty() ? kNoReason : error.text;
     if (json_) {
-        array_.push_back({{"uri", uri}, {"error", {{"code", error.code}, {"text", error.text}}}});
+        array_.push_back({{"uri", uri}, {"error", {{"code", error.code}, {"text", text}}}});
     } else {
-        complain(context_, fmt::format("{}: error {}: {}", uri, error.code, error.text));
+        complain(context_, fmt::format("{}: error {}: {}", uri, error.code, text));
     }
 }
 
 void Results::finish() {
-    constexpr auto kReplace = Json::error_handler_t::replace;  // A URI may hold any bytes.
-    if (json_) context_.out << array_.dump(2, ' ', false, kReplace) << '\n';
     context_.exitCode = first_.code();
+    if (!json_) return;
+    // One line for each tag: short enough to read, and long arrays do not run down the screen.
+    constexpr auto kReplace = Json::error_handler_t::replace;  // A URI may hold any bytes.
+    const char* separator = "[\n  ";
+    for (const Json& result : array_) {
+        context_.out << separator << result.dump(-1, ' ', false, kReplace);
+        separator = ",\n  ";
+    }
+    context_.out << "\n]\n";
 }
 
 }  // namespace cli

@@ -48,8 +48,12 @@ std::unique_ptr<sim::Simulator> makeSimulator(const LineOptions& options,
     return std::make_unique<sim::Simulator>(std::move(simOptions));
 }
 
-runtime::TracingSerialFactory::Callback tracer(std::ostream& err) {
-    return [&err](const runtime::TraceEvent& event) { err << traceText(event) << '\n'; };
+/// Notes a vanished port and, with --trace, shows the frames.
+runtime::TracingSerialFactory::Callback watcher(bool& portGone, std::ostream* trace) {
+    return [&portGone, trace](const runtime::TraceEvent& event) {
+        if (!event.complete) portGone = true;
+        if (trace != nullptr) *trace << traceText(event) << '\n';
+    };
 }
 
 runtime::ProtocolObject makeProtocol(const std::string& plugin, IInterfaceFactory& host,
@@ -69,8 +73,7 @@ struct Session::Parts {
           plugin(pluginFile(context)),
           storage(openStorage(options)),
           simulator(makeSimulator(options, configText)),
-          tracing(serial,
-                  options.trace ? tracer(context.err) : runtime::TracingSerialFactory::Callback{}),
+          tracing(serial, watcher(portGone, options.trace ? &context.err : nullptr)),
           host(multiTask, tracing, storage.get()),
           channel(makeProtocol(plugin, host, options.protocol)) {
         for (const PortMapping& port : ports)
@@ -90,6 +93,7 @@ struct Session::Parts {
     std::unique_ptr<sim::Simulator> simulator;
     runtime::PosixMultiTask multiTask;
     runtime::PosixSerialFactory serial;
+    bool portGone = false;
     runtime::TracingSerialFactory tracing;
     runtime::HostServices host;
     runtime::Channel channel;
@@ -104,6 +108,14 @@ Session::Session(const CommandContext& context, const LineOptions& options)
 }
 
 Session::~Session() = default;
+
+bool Session::portGone() const {
+    return parts_->portGone;
+}
+
+ExitCode Session::exitCodeFor(const runtime::ChannelError& error) const {
+    return portGone() ? ExitCode::Port : exitCodeOf(error.code);
+}
 
 void Session::start() {
     if (!hasLine()) {

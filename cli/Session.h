@@ -31,6 +31,12 @@ class Session {
 
     runtime::Channel& channel();
 
+    /// Tells whether a frame could not be sent or was cut short because the port vanished.
+    [[nodiscard]] bool portGone() const;
+    /// @return the exit code of a failed read or write: Port when the port is gone, else as the
+    /// driver's error code says.
+    [[nodiscard]] ExitCode exitCodeFor(const runtime::ChannelError& error) const;
+
     /// @return null with --storage none.
     runtime::Storage* storage();
     /// Errors: CommandError (Other) when the storage has refused anything so far.

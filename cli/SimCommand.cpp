@@ -13,8 +13,8 @@
 namespace cli {
 namespace {
 
-constexpr const char* kFooter = R"(
-Prints the device to open and serves it until Ctrl-C. docs/simulator.md tells what the nodes hold.
+constexpr const char* kFooter =
+    R"(Prints the device to open and serves it until Ctrl-C. docs/simulator.md tells what the nodes hold.
 
 Examples:
   mrtu sim

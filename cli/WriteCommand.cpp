@@ -12,8 +12,8 @@
 namespace cli {
 namespace {
 
-constexpr const char* kFooter = R"(
-Values are written as `mrtu read` prints them: numbers (0x... too), 0 or 1 (false, true), arrays as
+constexpr const char* kFooter =
+    R"(Values are written as `mrtu read` prints them: numbers (0x... too), 0 or 1 (false, true), arrays as
 comma lists, strings with or without double quotes, binary as 0x and two digits a byte. All values
 are looked at first: when one is wrong, nothing is sent. Every written tag gets a line
 "URI = value", with --verify the value that was read back.
@@ -65,9 +65,9 @@ std::vector<Job> prepareAll(CommandContext& context, runtime::Channel& channel,
     return jobs;
 }
 
-void verifyOne(runtime::Channel& channel, const Job& job, Results& results) {
-    const auto back = channel.read(*job.tag);
-    if (!back) return results.failure(job.uri, back.error(), exitCodeOf(back.error().code));
+void verifyOne(Session& session, const Job& job, Results& results) {
+    const auto back = session.channel().read(*job.tag);
+    if (!back) return results.failure(job.uri, back.error(), session.exitCodeFor(back.error()));
     const ValueShape shape = shapeOf(*job.tag);
     if (back.value() != job.value) {
         const std::string text =
@@ -78,10 +78,10 @@ void verifyOne(runtime::Channel& channel, const Job& job, Results& results) {
     results.value(job.uri, shape, back.value());
 }
 
-void writeOne(runtime::Channel& channel, const Job& job, bool verify, Results& results) {
-    const auto done = channel.write(*job.tag, job.value);
-    if (!done) return results.failure(job.uri, done.error(), exitCodeOf(done.error().code));
-    if (verify) return verifyOne(channel, job, results);
+void writeOne(Session& session, const Job& job, bool verify, Results& results) {
+    const auto done = session.channel().write(*job.tag, job.value);
+    if (!done) return results.failure(job.uri, done.error(), session.exitCodeFor(done.error()));
+    if (verify) return verifyOne(session, job, results);
     results.value(job.uri, shapeOf(*job.tag), job.value);
 }
 
@@ -91,8 +91,9 @@ void write(CommandContext& context, const WriteOptions& options) {
     session.start();
     Results results(context, options.json);
     for (const Job& job : jobs)
-        writeOne(session.channel(), job, options.verify, results);
+        writeOne(session, job, options.verify, results);
     results.finish();
+    if (session.portGone()) complain(context, "the port is gone");
     session.checkStorage();
 }
 
