@@ -1,0 +1,352 @@
+// The storage's file: its birth, its look, and files that are not fit for it.
+#include <gmock/gmock.h>
+#include <sys/resource.h>
+
+#include <csignal>
+
+#include "tests/line/StorageFile.h"
+#include "tests/unit/runtime/StorageContract.h"
+
+namespace {
+
+using runtime::SqliteStorage;
+using runtime::StorageFault;
+using ::testing::HasSubstr;
+using ::testing::StartsWith;
+
+/// A fresh storage in a directory of its own.
+class SqliteMaker {
+    struct Folder {
+        Folder() { path = ::mkdtemp(path.data()); }
+        ~Folder() { std::filesystem::remove_all(path); }
+        std::string path = ::testing::TempDir() + "contract-XXXXXX";
+    };
+    Folder folder_;
+    std::unique_ptr<SqliteStorage> owned_ =
+        SqliteStorage::open(folder_.path + "/overrides.db").value();
+
+  public:
+    SqliteStorage& storage = *owned_;
+};
+
+INSTANTIATE_TYPED_TEST_SUITE_P(InSqlite, StorageContract, SqliteMaker);
+
+TEST_F(StorageFileTest, ValuesOutlastTheStorage) {
+    {
+        const auto storage = open();
+        storage->writeString("line1", "tempNode5", "9");
+        storage->writeBool("line1", "node5_ModiconMode", true);
+        storage->writeInt("line1", "baud", 19200);
+    }
+    const auto storage = open();
+    EXPECT_STREQ(storage->readString("line1", "tempNode5"), "9");
+    EXPECT_TRUE(storage->readBool("line1", "node5_ModiconMode"));
+    EXPECT_EQ(storage->readInt("line1", "baud"), 19200);
+}
+
+TEST_F(StorageFileTest, ShellShowsSectionKeyTypeAndValue) {
+    const auto storage = open();
+    storage->writeString("line1", "tempNode5", "9");
+    storage->writeBool("line1", "flag", true);
+    storage->writeInt("line1", "baud", 19200);
+    EXPECT_EQ(ask("SELECT section||' '||key||' '||type||' '||value FROM settings ORDER BY key"),
+              "line1 baud int 19200\nline1 flag bool 1\nline1 tempNode5 text 9\n");
+    EXPECT_EQ(ask("SELECT typeof(value) FROM settings ORDER BY key"), "integer\ninteger\ntext\n");
+}
+
+TEST_F(StorageFileTest, WritesGoThroughALogThatIsSynced) {
+    const auto storage = open();
+    EXPECT_EQ(ask("PRAGMA journal_mode"), "wal\n");
+    EXPECT_FALSE(storage->readOnly());
+}
+
+TEST_F(StorageFileTest, FilesAndDirectoriesAreForTheirOwnerAlone) {
+    const mode_t before = ::umask(0);
+    path = folder + "/state/mrtu/overrides.db";
+    {
+        const auto storage = open();
+        storage->writeInt("s", "k", 1);
+        for (const char* ending : {"", "-wal", "-shm"}) {
+            EXPECT_EQ(modeOf(path + ending), 0600u) << ending;
+        }
+    }
+    EXPECT_EQ(modeOf(folder + "/state"), 0700u);
+    EXPECT_EQ(modeOf(folder + "/state/mrtu"), 0700u);
+    ::umask(before);
+}
+
+TEST_F(StorageFileTest, NamesWithAMeaningInUrisAreJustNames) {
+    for (const char* name : {"a?mode=memory", "50%41", "#1", "file:x", ":memory:", "bl ank"}) {
+        path = folder + "/" + name;
+        open()->writeInt("s", "k", 7);
+        EXPECT_TRUE(std::filesystem::file_size(path) > 0) << name;
+        EXPECT_EQ(open()->readInt("s", "k"), 7) << name;
+    }
+}
+
+TEST_F(StorageFileTest, BareNameMeansTheWorkingDirectory) {
+    const auto before = std::filesystem::current_path();
+    std::filesystem::current_path(folder);
+    path = ":memory:";
+    open()->writeInt("s", "k", 7);
+    EXPECT_EQ(open()->readInt("s", "k"), 7);
+    std::filesystem::current_path(before);
+    EXPECT_TRUE(std::filesystem::exists(folder + "/:memory:"));
+}
+
+TEST_F(StorageFileTest, LeadingSlashesAreNoHostName) {
+    path = "//" + path;
+    open()->writeInt("s", "k", 7);
+    EXPECT_EQ(open()->readInt("s", "k"), 7);
+}
+
+TEST_F(StorageFileTest, EmptyFileBecomesAStorage) {
+    std::ofstream(path).close();
+    open()->writeInt("s", "k", 7);
+    EXPECT_EQ(open()->readInt("s", "k"), 7);
+}
+
+TEST_F(StorageFileTest, DirectoryThatCannotBeMadeIsNamed) {
+    std::ofstream(folder + "/file") << "in the way";
+    const auto opened = SqliteStorage::open(folder + "/file/sub/overrides.db");
+    ASSERT_FALSE(opened);
+    EXPECT_EQ(opened.error().fault, StorageFault::NoDirectory);
+    EXPECT_EQ(opened.error().text,
+              folder + "/file/sub/overrides.db: cannot make " + folder + "/file: Not a directory");
+    EXPECT_EQ(contentOf(folder + "/file"), "in the way");
+}
+
+TEST_F(StorageFileTest, DirectoryInPlaceOfTheFileIsRefused) {
+    const auto opened = SqliteStorage::open(folder);
+    ASSERT_FALSE(opened);
+    EXPECT_EQ(opened.error().fault, StorageFault::CannotOpen);
+    EXPECT_EQ(opened.error().text, folder + ": not a regular file");
+}
+
+TEST_F(StorageFileTest, EmptyNameIsRefused) {
+    const auto opened = SqliteStorage::open("");
+    ASSERT_FALSE(opened);
+    EXPECT_EQ(opened.error().fault, StorageFault::CannotOpen);
+}
+
+/// Files that must be refused and left as they are.
+struct Unfit : StorageFileTest {
+    void expectRefused(StorageFault fault, const std::string& text) const {
+        const std::string before = contentOf(path);
+        const std::string logBefore = contentOf(path + "-wal");
+        const auto opened = SqliteStorage::open(path);
+        ASSERT_FALSE(opened);
+        EXPECT_EQ(opened.error().fault, fault) << opened.error().text;
+        EXPECT_THAT(opened.error().text, StartsWith(path + ": "));
+        EXPECT_THAT(opened.error().text, HasSubstr(text));
+        EXPECT_TRUE(contentOf(path) == before) << "the file was changed";
+        EXPECT_TRUE(contentOf(path + "-wal") == logBefore) << "the log was changed";
+    }
+    /// A storage of a few pages.
+    void fill() const {
+        const auto storage = open();
+        for (int key = 0; key < 200; ++key) {
+            storage->writeString("line1", ("key" + std::to_string(key)).c_str(),
+                                 std::string(100, 'v').c_str());
+        }
+    }
+};
+
+TEST_F(Unfit, TextFile) {
+    std::ofstream(path) << "baud=9600\n";
+    expectRefused(StorageFault::Damaged, "not a database");
+}
+
+TEST_F(Unfit, LongTextFile) {
+    std::ofstream(path) << std::string(20'000, 'x');
+    expectRefused(StorageFault::Damaged, "not a database");
+}
+
+TEST_F(Unfit, TruncatedStorage) {
+    fill();
+    std::filesystem::resize_file(path, std::filesystem::file_size(path) / 2);
+    expectRefused(StorageFault::Damaged, "");
+}
+
+TEST_F(Unfit, StorageWithAnOverwrittenPage) {
+    fill();
+    {
+        std::fstream file(path, std::ios::in | std::ios::out | std::ios::binary);
+        file.seekp(2 * 4096 + 100);
+        file << std::string(1000, '\xEE');
+    }
+    expectRefused(StorageFault::Damaged, "");
+}
+
+TEST_F(Unfit, StorageWithAnOverwrittenSchema) {
+    fill();
+    {
+        std::fstream file(path, std::ios::in | std::ios::out | std::ios::binary);
+        file.seekp(100);
+        file << std::string(3000, '\xEE');
+    }
+    expectRefused(StorageFault::Damaged, "");
+}
+
+TEST_F(Unfit, DatabaseOfAnotherProgram) {
+    ask("CREATE TABLE bookmarks(url); INSERT INTO bookmarks VALUES('x')");
+    expectRefused(StorageFault::Foreign, "a database of another program");
+    EXPECT_EQ(ask("PRAGMA journal_mode"), "delete\n");
+}
+
+TEST_F(Unfit, DatabaseOfAnotherProgramWithChangesInItsLog) {
+    const pid_t writer = ::fork();
+    if (writer == 0) {
+        sqlite3* database = nullptr;
+        sqlite3_open(path.c_str(), &database);
+        sqlite3_exec(database, "PRAGMA journal_mode=WAL; CREATE TABLE bookmarks(url);", nullptr,
+                     nullptr, nullptr);
+        ::_exit(0);  // Without closing: the log stays.
+    }
+    ASSERT_EQ(endOf(writer), 0);
+    ASSERT_GT(std::filesystem::file_size(path + "-wal"), 0u);
+    expectRefused(StorageFault::Foreign, "a database of another program");
+}
+
+TEST_F(Unfit, StorageOfALaterVersion) {
+    fill();
+    ask("PRAGMA user_version=2");
+    expectRefused(StorageFault::Newer, "layout 2 is not known");
+}
+
+TEST_F(Unfit, StorageWithoutItsTable) {
+    fill();
+    ask("ALTER TABLE settings RENAME TO other");
+    expectRefused(StorageFault::Damaged, "no such table: settings");
+}
+
+TEST_F(StorageFileTest, WriteProtectedFileIsReadAndNeverWritten) {
+    open()->writeInt("line1", "baud", 19200);
+    ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
+    {
+        const auto storage = open();
+        ASSERT_NE(storage, nullptr);
+        EXPECT_TRUE(storage->readOnly());
+        EXPECT_EQ(storage->readInt("line1", "baud"), 19200);
+        EXPECT_FALSE(storage->failed());
+
+        storage->writeInt("line1", "baud", 300);
+        EXPECT_TRUE(storage->failed());
+        EXPECT_THAT(storage->lastError(), HasSubstr("readonly database"));
+        EXPECT_EQ(storage->readInt("line1", "baud"), 19200);
+        storage->clearFailure();
+        storage->removeKey("line1", "baud");
+        EXPECT_TRUE(storage->failed());
+    }
+    EXPECT_FALSE(std::filesystem::exists(path + "-wal"));
+    EXPECT_FALSE(std::filesystem::exists(path + "-shm"));
+    ASSERT_EQ(::chmod(path.c_str(), 0600), 0);
+    EXPECT_EQ(open()->readInt("line1", "baud"), 19200);
+}
+
+TEST_F(StorageFileTest, WriteProtectedFileShowsAlsoWhatOnlyItsLogHolds) {
+    const pid_t writer = ::fork();
+    if (writer == 0) {
+        auto storage = SqliteStorage::open(path);
+        if (!storage) ::_exit(1);
+        storage.value()->writeInt("line1", "baud", 4800);
+        ::_exit(0);  // Without closing: the value is in the log alone.
+    }
+    ASSERT_EQ(endOf(writer), 0);
+    ASSERT_GT(std::filesystem::file_size(path + "-wal"), 0u);
+    ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
+    const auto storage = open();
+    ASSERT_NE(storage, nullptr);
+    EXPECT_TRUE(storage->readOnly());
+    EXPECT_EQ(storage->readInt("line1", "baud"), 4800);
+}
+
+TEST_F(StorageFileTest, WriteProtectedEmptyFileIsRefused) {
+    std::ofstream(path).close();
+    ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
+    const auto opened = SqliteStorage::open(path);
+    ASSERT_FALSE(opened);
+    EXPECT_THAT(opened.error().text, HasSubstr("empty and write-protected"));
+}
+
+/// Another user's process: no rights of root, neither on the file nor on its directory.
+TEST_F(StorageFileTest, UserWithoutRightsReadsAndSaysSo) {
+    if (::geteuid() != 0) GTEST_SKIP() << "needs to be able to become another user";
+    open()->writeInt("line1", "baud", 19200);
+    ASSERT_EQ(::chmod(folder.c_str(), 0755), 0);
+    ASSERT_EQ(::chmod(path.c_str(), 0644), 0);
+    const auto asOther = [this] {
+        constexpr uid_t kNobody = 65534;
+        if (::setgid(kNobody) != 0 || ::setuid(kNobody) != 0) return 1;
+        auto storage = SqliteStorage::open(path);
+        if (!storage) return 2;
+        if (!storage.value()->readOnly()) return 3;
+        if (storage.value()->readInt("line1", "baud") != 19200) return 4;
+        storage.value()->writeInt("line1", "baud", 1);
+        if (!storage.value()->failed()) return 5;
+        const auto secret = SqliteStorage::open("/root/mrtu-test/overrides.db");
+        return secret ? 6 : 0;
+    };
+    const pid_t child = ::fork();
+    if (child == 0) ::_exit(asOther());
+    EXPECT_EQ(endOf(child), 0);
+    ASSERT_EQ(::chmod(path.c_str(), 0600), 0);
+    const pid_t locked = ::fork();
+    if (locked == 0) {
+        const bool other = ::setgid(65534) == 0 && ::setuid(65534) == 0;
+        const auto opened = SqliteStorage::open(path);
+        const bool said = !opened && opened.error().text == path + ": Permission denied";
+        ::_exit(other && said ? 0 : 1);
+    }
+    EXPECT_EQ(endOf(locked), 0);
+    EXPECT_EQ(open()->readInt("line1", "baud"), 19200);
+}
+
+/// The child's files may not grow beyond a limit, which is what a full disk looks like to it.
+/// @return the number of writes that were acknowledged before the first that was not, or minus
+/// what else went wrong.
+int writeUntilFull(const std::string& path) {
+    ::signal(SIGXFSZ, SIG_IGN);
+    const rlimit limit{200'000, 200'000};
+    if (::setrlimit(RLIMIT_FSIZE, &limit) != 0) return -1;
+    auto opened = SqliteStorage::open(path);
+    if (!opened) return -2;
+    SqliteStorage& storage = *opened.value();
+    const std::string text(500, 't');
+    for (int key = 0; key < 10'000; ++key) {
+        const std::string name = "key" + std::to_string(key);
+        storage.writeString("line1", name.c_str(), text.c_str());
+        if (!storage.failed()) continue;
+        if (storage.lastError().find("writing 'line1', '" + name) == std::string::npos) return -3;
+        if (storage.hasKey("line1", name.c_str()) != 0) return -4;
+        if (storage.readString("line1", "key0") != text) return -5;
+        return storage.keyCount("line1") == key ? key : -6;
+    }
+    return -7;
+}
+
+TEST_F(StorageFileTest, FullDiskFailsVisiblyAndLosesNothing) {
+    int answers[2];
+    ASSERT_EQ(::pipe(answers), 0);
+    const pid_t child = ::fork();
+    if (child == 0) {
+        const int written = writeUntilFull(path);
+        ::_exit(::write(answers[1], &written, sizeof written) == sizeof written ? 0 : 1);
+    }
+    int written = -100;
+    ASSERT_EQ(::read(answers[0], &written, sizeof written), ssize_t{sizeof written});
+    EXPECT_EQ(endOf(child), 0);
+    ::close(answers[0]);
+    ::close(answers[1]);
+    ASSERT_GT(written, 10);
+
+    EXPECT_EQ(ask("PRAGMA integrity_check"), "ok\n");
+    const auto storage = open();
+    ASSERT_NE(storage, nullptr);
+    EXPECT_EQ(storage->keyCount("line1"), written);
+    EXPECT_EQ(storage->readString("line1", "key3"), std::string(500, 't'));
+    storage->writeInt("line1", "after", 1);
+    EXPECT_FALSE(storage->failed()) << storage->lastError();
+}
+
+}  // namespace

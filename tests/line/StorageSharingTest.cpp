@@ -1,0 +1,76 @@
+// Several processes on one storage file.
+#include <gmock/gmock.h>
+
+#include "tests/line/StorageFile.h"
+
+namespace {
+
+using runtime::SqliteStorage;
+using ::testing::HasSubstr;
+
+constexpr int kWrites = 100;
+
+/// @return 0 when every write was done.
+int writeOwnAndSharedKeys(const std::string& path, int process) {
+    auto opened = SqliteStorage::open(path);
+    if (!opened) return 1;
+    SqliteStorage& storage = *opened.value();
+    for (int write = 0; write < kWrites; ++write) {
+        const std::string own = "own" + std::to_string(process) + "_" + std::to_string(write);
+        storage.writeInt("line1", own.c_str(), write);
+        storage.writeInt("line1", "shared", process);
+    }
+    return storage.failed() ? 2 : 0;
+}
+
+TEST_F(StorageFileTest, TwoProcessesCreateAndFillOneFile) {
+    pid_t children[2];
+    for (int process = 0; process < 2; ++process) {
+        children[process] = ::fork();
+        if (children[process] == 0) ::_exit(writeOwnAndSharedKeys(path, process));
+    }
+    for (const pid_t child : children)
+        EXPECT_EQ(endOf(child), 0);
+    const auto storage = open();
+    ASSERT_NE(storage, nullptr);
+    EXPECT_EQ(storage->keyCount("line1"), 2 * kWrites + 1);
+    for (int process = 0; process < 2; ++process) {
+        for (int write = 0; write < kWrites; ++write) {
+            const std::string own = "own" + std::to_string(process) + "_" + std::to_string(write);
+            EXPECT_EQ(storage->readInt("line1", own.c_str()), write) << own;
+        }
+    }
+    EXPECT_EQ(ask("PRAGMA integrity_check"), "ok\n");
+}
+
+TEST_F(StorageFileTest, OtherStoragesWritesAreSeen) {
+    const auto one = open();
+    const auto other = open();
+    one->writeInt("line1", "baud", 9600);
+    EXPECT_EQ(other->readInt("line1", "baud"), 9600);
+    other->removeKey("line1", "baud");
+    EXPECT_EQ(one->hasKey("line1", "baud"), 0);
+}
+
+TEST_F(StorageFileTest, WriteThatWaitedTooLongFailsVisibly) {
+    const auto patient = open();
+    patient->writeInt("line1", "baud", 9600);
+    auto impatient = SqliteStorage::open(path, 10);
+    ASSERT_TRUE(impatient);
+
+    sqlite3* holder = nullptr;
+    ASSERT_EQ(sqlite3_open(path.c_str(), &holder), SQLITE_OK);
+    ASSERT_EQ(sqlite3_exec(holder, "BEGIN IMMEDIATE", nullptr, nullptr, nullptr), SQLITE_OK);
+    impatient.value()->writeInt("line1", "baud", 300);
+    EXPECT_TRUE(impatient.value()->failed());
+    EXPECT_THAT(impatient.value()->lastError(), HasSubstr("database is locked"));
+    EXPECT_EQ(impatient.value()->readInt("line1", "baud"), 9600) << "reading needs no lock";
+    sqlite3_close(holder);
+
+    impatient.value()->clearFailure();
+    impatient.value()->writeInt("line1", "baud", 300);
+    EXPECT_FALSE(impatient.value()->failed()) << impatient.value()->lastError();
+    EXPECT_EQ(patient->readInt("line1", "baud"), 300);
+}
+
+}  // namespace
