@@ -1,0 +1,123 @@
+// What one request costs of the heap: nothing.
+#include <gtest/gtest.h>
+
+#include "tests/support/AllocationCounter.h"
+#include "tests/support/FixedReplyPort.h"
+#include "tests/unit/mrtu/DriverTest.h"
+
+namespace {
+
+using driver_test::asciiFrame;
+using driver_test::Bytes;
+using driver_test::hex;
+using driver_test::rtuFrame;
+using testing_support::AllocationCounter;
+using testing_support::FixedReplyPort;
+using testing_support::operator+;
+
+class AllocationTest : public ::testing::Test {
+  protected:
+    void start(const std::string& items) {
+        host.serialFactory.offer("com1", port);
+        ASSERT_NE(0, driver.Config(driver_test::configText(items).c_str()));
+        ASSERT_NE(0, driver.Start());
+    }
+    const Tag_MRTU* tag(const char* uri) {
+        return static_cast<const Tag_MRTU*>(driver.CreateTag(uri));
+    }
+
+    /// Heap blocks that one call takes after the first one.
+    template <class Call>
+    std::size_t costOf(Call call) {
+        EXPECT_TRUE(call()) << driver.GetLastErrorString();
+        const AllocationCounter counter;
+        const bool done = call();
+        const std::size_t cost = counter.allocations() + counter.releases();
+        EXPECT_TRUE(done) << driver.GetLastErrorString();
+        return cost;
+    }
+    std::size_t costOfRead(const Tag_MRTU* tag, int count) {
+        return costOf([this, tag, count] {
+            return driver.doReadBlock(tag, tag->offset(), data.data(), count);
+        });
+    }
+    std::size_t costOfWrite(const Tag_MRTU* tag, int count) {
+        return costOf([this, tag, count] {
+            return driver.doWrite(tag, tag->offset(), data.data(), count) != 0;
+        });
+    }
+
+    testing_support::FakeHost host;
+    FixedReplyPort port{{}};
+    driver_test::BoundModule module{host};
+    Protocol_MRTU driver;
+    Bytes data = Bytes(512, 0);
+};
+
+TEST_F(AllocationTest, TheCounterCounts) {
+    const AllocationCounter counter;
+    const std::string text(100, 'x');
+    EXPECT_EQ(1U, counter.allocations());
+    EXPECT_EQ(100U, text.size());
+}
+
+TEST_F(AllocationTest, ReadOfAFullBlock) {
+    start("");
+    port.setReply(rtuFrame(hex("01 03 FA") + Bytes(250, 1)));
+    EXPECT_EQ(0U, costOfRead(tag("1?HREG?400001?short"), 125));
+}
+
+TEST_F(AllocationTest, ReadOfAFullBlockInAscii) {
+    start("txMode=ASCII");
+    port.setReply(asciiFrame(hex("01 03 FA") + Bytes(250, 1)));
+    EXPECT_EQ(0U, costOfRead(tag("1?HREG?400001?short"), 125));
+}
+
+TEST_F(AllocationTest, ReadOfCoils) {
+    start("");
+    port.setReply(rtuFrame(hex("01 01 FA") + Bytes(250, 1)));
+    EXPECT_EQ(0U, costOfRead(tag("1?OUTP?4?boolean"), 2000));
+}
+
+TEST_F(AllocationTest, ReadOfAnOverriddenNode) {
+    start("");
+    char answer[64];
+    driver.DoCommand("setid 1 9", answer, sizeof answer);
+    port.setReply(rtuFrame(hex("09 03 02 12 34")));
+    EXPECT_EQ(0U, costOfRead(tag("1?HREG?400001?short"), 1));
+}
+
+TEST_F(AllocationTest, WriteOfRegisters) {
+    start("");
+    port.setReply(rtuFrame(hex("01 10 00 00 00 7B")));
+    EXPECT_EQ(0U, costOfWrite(tag("1?HREG?400001?short"), 123));
+}
+
+TEST_F(AllocationTest, WriteOfRegistersInAscii) {
+    start("txMode=ASCII");
+    port.setReply(asciiFrame(hex("01 10 00 00 00 7B")));
+    EXPECT_EQ(0U, costOfWrite(tag("1?HREG?400001?short"), 123));
+}
+
+TEST_F(AllocationTest, WriteOfCoils) {
+    start("");
+    port.setReply(rtuFrame(hex("01 0F 00 00 07 B0")));
+    EXPECT_EQ(0U, costOfWrite(tag("1?OUTP?1?boolean"), 1968));
+}
+
+TEST_F(AllocationTest, WriteOfSingleItems) {
+    start("presetFunction=06 forceFunction=05");
+    port.setReply(rtuFrame(hex("01 06 00 00 00 00")));
+    EXPECT_EQ(0U, costOfWrite(tag("1?HREG?400001?short"), 1));
+    port.setReply(rtuFrame(hex("01 05 00 00 00 00")));
+    EXPECT_EQ(0U, costOfWrite(tag("1?OUTP?1?boolean"), 1));
+}
+
+/// The key of a node's Modicon mode is longer than what a string holds without the heap.
+TEST_F(AllocationTest, SecondRequestOfANodeWithALongNumber) {
+    start("");
+    port.setReply(rtuFrame(hex("01 03 02 12 34")));
+    EXPECT_EQ(0U, costOfRead(tag("1000000001?HREG?400001?short"), 1)) << "low byte 1";
+}
+
+}  // namespace

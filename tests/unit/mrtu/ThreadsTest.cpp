@@ -1,0 +1,90 @@
+// Several threads on one line.
+#include <atomic>
+#include <future>
+#include <thread>
+
+#include "tests/unit/mrtu/DriverTest.h"
+
+namespace {
+
+using driver_test::Bytes;
+using driver_test::DriverTest;
+using driver_test::rtuFrame;
+using testing_support::registersReply;
+using testing_support::rtuMessage;
+
+class ThreadsTest : public DriverTest {
+  protected:
+    /// A slave whose register n holds n.
+    static Bytes answer(const Bytes& frame) {
+        const Bytes message = rtuMessage(frame);
+        const auto address = static_cast<std::uint16_t>(message[2] * 256 + message[3]);
+        return rtuFrame(registersReply(message[0], message[1], {address}));
+    }
+};
+
+TEST_F(ThreadsTest, EveryThreadGetsItsOwnAnswer) {
+    start();
+    port.answerWith(answer);
+    const Tag_MRTU* word = tag("1?HREG?400001?short");
+    std::atomic<int> wrong = 0;
+    std::vector<std::thread> threads;
+    for (int thread = 0; thread < 4; ++thread)
+        threads.emplace_back([this, word, thread, &wrong] {
+            for (int i = 0; i < 500; ++i) {
+                const int index = thread * 1000 + i;
+                unsigned char data[2] = {};
+                const bool done = driver->doReadBlock(word, index, data, 1);
+                if (!done || data[0] + data[1] * 256 != index) ++wrong;
+            }
+        });
+    for (std::thread& thread : threads)
+        thread.join();
+    EXPECT_EQ(0, wrong);
+    EXPECT_EQ(2000U, port.sent().size());
+}
+
+/// While one thread waits for its answer, another one's Stop() waits for the lock; the port goes
+/// only after the exchange.
+TEST_F(ThreadsTest, StopWaitsForTheRunningTransaction) {
+    start("repeat=0");
+    port.answerWith(answer);
+    const Tag_MRTU* word = tag("1?HREG?400001?short");
+    std::promise<void> stopping;
+    std::thread stopper;
+    port.onSend([this, &stopping, &stopper](const Bytes&) {
+        stopper = std::thread([this, &stopping] {
+            stopping.set_value();
+            driver->Stop();
+        });
+        stopping.get_future().wait();
+        EXPECT_EQ(0, host.serialFactory.released());
+    });
+    unsigned char data[2] = {};
+    EXPECT_TRUE(driver->doReadBlock(word, 5, data, 1));
+    EXPECT_EQ(5, data[0]);
+    stopper.join();
+    EXPECT_EQ(1, host.serialFactory.released());
+}
+
+/// A transaction that was waiting for the lock while Stop() held it finds no port any more.
+TEST_F(ThreadsTest, TransactionBehindAStopFindsTheLineClosed) {
+    start("repeat=0 delay=1");
+    const Tag_MRTU* word = tag("1?HREG?400001?short");
+    std::atomic<bool> go = false;
+    std::thread reader([this, word, &go] {
+        while (!go)
+            std::this_thread::yield();
+        unsigned char data[2];
+        for (int i = 0; i < 100; ++i)
+            driver->doReadBlock(word, 5, data, 1);
+    });
+    port.answerWith(answer);
+    go = true;
+    driver->Stop();
+    reader.join();
+    EXPECT_EQ(1, host.serialFactory.released());
+    EXPECT_FALSE(host.multiTask.anyLockHeld());
+}
+
+}  // namespace
