@@ -13,6 +13,7 @@ constexpr int kNoNode = -1;
 std::vector<int> NodesOf(const std::string& text) {
     const CfgParser parser(text.c_str());
     std::vector<int> nodes;
+    nodes.reserve(static_cast<std::size_t>(parser.GetNodeCount()));
     for (int i = 0; i < parser.GetNodeCount(); ++i)
         nodes.push_back(parser.GetNodeID(i));
     return nodes;
@@ -199,129 +200,6 @@ TEST(getParam, AnswersByPlaceAndFlags) {
             << row.body << " node " << row.node << " flags " << row.flags;
         EXPECT_EQ(value, row.value) << row.body << " node " << row.node << " flags " << row.flags;
     }
-}
-
-TEST(parseValue, TurnsEveryNbspIntoABlank) {
-    const std::pair<const char*, const char*> rows[] = {
-        {"", ""},
-        {"abc", "abc"},
-        {"a&nbsp;b", "a b"},
-        {"&nbsp;&nbsp;", "  "},
-        {"&nbsp;a&nbsp;&nbsp;b&nbsp;", " a  b "},
-        {"&NBSP;", "&NBSP;"},
-        {"&nbsp", "&nbsp"},
-        {"&&nbsp;nbsp;", "& nbsp;"},
-    };
-    for (const auto& [raw, text] : rows) {
-        std::string value = "before";
-        EXPECT_TRUE(CfgParserN::parseValue(raw, value)) << raw;
-        EXPECT_EQ(value, text) << raw;
-    }
-}
-
-TEST(parseValue, MayDecodeInPlace) {
-    std::string value = "a&nbsp;b";
-    EXPECT_TRUE(CfgParserN::parseValue(value, value));
-    EXPECT_EQ(value, "a b");
-}
-
-TEST(getErrorString, SaysWhatIsWrong) {
-    const std::pair<int, const char*> rows[] = {
-        {0, "Parser: parameter 'uart' has unknown error"},
-        {1, "Parser: parameter 'uart' has unknown error"},
-        {2, "Parser: parameter 'uart' is not found"},
-        {3, "Parser: parameter 'uart' has illegal value"},
-        {4, "Parser: parameter 'uart' can't be prefixed"},
-        {5, "Parser: parameter 'uart' can't be node independent"},
-        {6, "Parser: parameter 'uart' has invalid internal specification"},
-    };
-    for (const auto& [result, text] : rows) {
-        EXPECT_EQ(CfgParserN::getErrorString(static_cast<CfgParser::parseResult>(result), "uart"),
-                  text);
-    }
-}
-
-struct Reading {
-    bool goOn = false;
-    int value = -77;
-    std::string error;
-};
-
-Reading ReadInt(const std::string& body, int node, int flags, bool optional) {
-    CfgParser parser(("CfgVer=1 " + body).c_str());
-    Reading reading;
-    reading.goOn =
-        readParam<int>(parser, "timeout", node, reading.value, flags, optional, reading.error);
-    return reading;
-}
-
-TEST(readParam, ReadsIntegersWithAutomaticBase) {
-    const std::pair<const char*, int> rows[] = {
-        {"timeout=0x10", 16}, {"timeout=010", 8},   {"timeout=12abc", 12},
-        {"timeout=abc", 0},   {"timeout=", 0},      {"timeout=-5", -5},
-        {"timeout=+5", 5},    {"timeout=0X1F", 31}, {"timeout=99999999999", 2147483647},
-    };
-    for (const auto& [body, value] : rows) {
-        const Reading reading = ReadInt(body, kNoNode, 0, false);
-        EXPECT_TRUE(reading.goOn) << body;
-        EXPECT_EQ(reading.value, value) << body;
-        EXPECT_EQ(reading.error, "") << body;
-    }
-}
-
-TEST(readParam, LeavesTheDefaultOfAnOptionalParameter) {
-    const Reading reading = ReadInt("repeat=2", kNoNode, 0, true);
-    EXPECT_TRUE(reading.goOn);
-    EXPECT_EQ(reading.value, -77);
-    EXPECT_EQ(reading.error, "");
-}
-
-TEST(readParam, ReportsARequiredParameterThatIsMissing) {
-    const Reading reading = ReadInt("repeat=2", kNoNode, 0, false);
-    EXPECT_FALSE(reading.goOn);
-    EXPECT_EQ(reading.value, -77);
-    EXPECT_EQ(reading.error, "Parser: parameter 'timeout' is not found");
-}
-
-TEST(readParam, GoesOnWithoutANodeParameterWhenNoNodeAsks) {
-    const Reading reading = ReadInt("Node1::timeout=5", kNoNode, CfgParser::nodeOnly, false);
-    EXPECT_TRUE(reading.goOn);
-    EXPECT_EQ(reading.value, -77);
-    EXPECT_EQ(reading.error, "");
-}
-
-TEST(readParam, ReportsMisplacedParametersEvenWhenOptional) {
-    struct Row {
-        const char* body;
-        int node;
-        int flags;
-        const char* error;
-    };
-    const Row rows[] = {
-        {"Node1::timeout=5", 1, 1, "Parser: parameter 'timeout' can't be prefixed"},
-        {"timeout=5 Node1::x=1", kNoNode, 2,
-         "Parser: parameter 'timeout' can't be node independent"},
-        {"timeout=5", kNoNode, 3, "Parser: parameter 'timeout' has invalid internal specification"},
-    };
-    for (const Row& row : rows) {
-        const Reading reading = ReadInt(row.body, row.node, row.flags, true);
-        EXPECT_FALSE(reading.goOn) << row.body;
-        EXPECT_EQ(reading.value, -77) << row.body;
-        EXPECT_EQ(reading.error, row.error);
-    }
-}
-
-TEST(readParam, DecodesTexts) {
-    CfgParser parser("CfgVer=1 name=a&nbsp;b Node2::name=c");
-    std::string value = "before";
-    std::string error;
-    EXPECT_TRUE(readParam<std::string>(parser, "name", kNoNode, value, 0, false, error));
-    EXPECT_EQ(value, "a b");
-    EXPECT_TRUE(readParam<std::string>(parser, "name", 2, value, 0, false, error));
-    EXPECT_EQ(value, "c");
-    EXPECT_FALSE(readParam<std::string>(parser, "other", 2, value, 0, false, error));
-    EXPECT_EQ(value, "c");
-    EXPECT_EQ(error, "Parser: parameter 'other' is not found");
 }
 
 }  // namespace

@@ -1,0 +1,108 @@
+#include <gtest/gtest.h>
+
+#include <cstdint>
+#include <utility>
+
+#include "tests/unit/framework/ConversionsFixture.h"
+
+namespace {
+
+using namespace conversions_test;
+
+struct BcdRow {
+    int size;
+    std::uint64_t digits;  // as the device holds them
+    std::uint64_t value;
+};
+constexpr BcdRow kBcd[] = {
+    {1, 0x00, 0},
+    {1, 0x09, 9},
+    {1, 0x42, 42},
+    {1, 0x99, 99},
+    {2, 0x1234, 1234},
+    {2, 0x0007, 7},
+    {2, 0x9999, 9999},
+    {3, 0x123456, 123456},
+    {3, 0x999999, 999999},
+    {4, 0x12345678, 12345678},
+    {4, 0x99999999, 99999999},
+    {4, 0, 0},
+};
+
+// The shape alone counts for BCD, not the type.
+ConversionShape Items(int size, int items = 1) {
+    return {size * items, size, items, ICU_Type::float_};
+}
+
+TEST(Bcd, TurnsDigitsIntoNumbersAndBack) {
+    for (const BcdRow& row : kBcd) {
+        const Bytes digits = LittleEndian(row.digits, row.size);
+        const Bytes value = LittleEndian(row.value, row.size);
+        EXPECT_EQ(Converted(digits, "bcd", Items(row.size), kRead), value) << row.digits;
+        EXPECT_EQ(Converted(value, "bcd", Items(row.size), kWrite), digits) << row.value;
+    }
+}
+
+TEST(Bcd, ReadsLowByteFirst) {
+    EXPECT_EQ(Converted({0x34, 0x12}, "bcd", Shape(ICU_Type::short_), kRead), (Bytes{0xD2, 0x04}));
+}
+
+TEST(Bcd, ReadsEightBytesAndTheTenOfATime) {
+    EXPECT_EQ(Converted(LittleEndian(0x9876543210123456U, 8), "bcd", Items(8), kRead),
+              LittleEndian(9876543210123456U, 8));
+    // 99999999999999999999 = 0x56BC75E2D630FFFFF has 67 bits
+    EXPECT_EQ(Converted(Bytes(10, 0x99), "bcd", Shape(ICU_Type::time), kRead),
+              (Bytes{0xFF, 0xFF, 0x0F, 0x63, 0x2D, 0x5E, 0xC7, 0x6B, 0x05, 0x00}));
+}
+
+TEST(Bcd, RefusesEveryNibbleAboveNine) {
+    for (int byte = 0; byte < 256; ++byte) {
+        const bool digits = byte % 16 <= 9 && byte / 16 <= 9;
+        for (std::size_t place = 0; place < 4; ++place) {
+            Bytes bytes(4, 0x11);
+            bytes[place] = static_cast<unsigned char>(byte);
+            EXPECT_EQ(!Converted(bytes, "bcd", Items(4), kRead).empty(), digits) << byte;
+        }
+    }
+}
+
+TEST(Bcd, RefusesValuesOfMoreDigits) {
+    const std::pair<int, std::uint64_t> rows[] = {
+        {1, 100},     {1, 255},      {2, 10000},     {2, 0xFFFF},
+        {3, 1000000}, {3, 0xFFFFFF}, {4, 100000000}, {4, 0xFFFFFFFF},
+    };
+    for (const auto& [size, value] : rows) {
+        EXPECT_EQ(Converted(LittleEndian(value, size), "bcd", Items(size), kWrite), Bytes{})
+            << value;
+    }
+}
+
+TEST(Bcd, WritesItemsOfFourBytesAtMost) {
+    for (int size = 1; size <= 10; ++size) {
+        EXPECT_EQ(Refuses("bcd", Items(size), kWrite), size > 4) << size;
+        EXPECT_FALSE(Refuses("bcd", Items(size), kRead)) << size;
+    }
+}
+
+TEST(Bcd, ConvertsEveryItem) {
+    EXPECT_EQ(Converted({0x34, 0x12, 0x78, 0x56}, "bcd", Items(2, 2), kRead),
+              (Bytes{0xD2, 0x04, 0x2E, 0x16}));
+    EXPECT_EQ(Converted({0xD2, 0x04, 0x2E, 0x16}, "bcd", Items(2, 2), kWrite),
+              (Bytes{0x34, 0x12, 0x78, 0x56}));
+    EXPECT_EQ(Converted({0x34, 0x12, 0x7A, 0x56}, "bcd", Items(2, 2), kRead), Bytes{});
+}
+
+TEST(Bcd, LeavesAnItemWithoutLengthAlone) {
+    EXPECT_EQ(Converted({0xFF, 0xFF}, "bcd", {2, 0, 1, ICU_Type::object}, kRead),
+              (Bytes{0xFF, 0xFF}));
+}
+
+TEST(Bcd, RoundTripsEveryTwoByteNumber) {
+    for (unsigned value = 0; value <= 9999; ++value) {
+        const Bytes written = Converted(LittleEndian(value, 2), "bcd", Items(2), kWrite);
+        ASSERT_EQ(written.size(), 2U) << value;
+        ASSERT_EQ(Converted(written, "bcd", Items(2), kRead), LittleEndian(value, 2)) << value;
+    }
+}
+
+}  // namespace
