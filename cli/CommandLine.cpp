@@ -78,6 +78,8 @@ int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::os
                  "mrtu");
     app.set_version_flag("--version", "mrtu " MRTU_VERSION);
     app.footer(kFooter);
+    // At most one, or the word "read" behind "console" would be a command of its own.
+    app.require_subcommand(0, 1);
     addCommands(app, context);
     ExitCode code = run(app, argc, argv, context);
     out.flush();

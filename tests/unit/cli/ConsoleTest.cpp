@@ -1,0 +1,105 @@
+// mrtu console: answers as the driver gives them.
+#include <gtest/gtest.h>
+
+#include "tests/unit/cli/Child.h"
+
+namespace {
+
+using cli_test::mrtu;
+using cli_test::Outcome;
+
+constexpr const char* kHelp =
+    "help - displays this message\n"
+    "info - displays information about the protocol version\n"
+    "xml  - displays the protocol xml description\n"
+    "read uri - reads data pointed by uri string\n"
+    "write uri hexData - writes data pointed by uri string\n"
+    "lasterror - displays the last protocol error\n"
+    "getmaxtm - displays the max time for executing a single read/write access\n"
+    "setid n m - set the node id n to m\n"
+    "getid - get all changed node id's\n";
+
+TEST(Console, OneCommandIsAnsweredAsTheDriverAnswers) {
+    const struct {
+        std::vector<std::string> words;
+        const char* answer;
+    } rows[] = {
+        {{"help"}, kHelp},
+        {{"getmaxtm"}, "maxtm = 4000 ms\n"},
+        {{"xml"}, "compressedXML=2224"},
+        {{"read", "1?HREG?400001?short"}, "e803\n"},
+        {{"read"}, "error: missing parameter (URI string)\n"},
+        {{"write", "1?HREG?400001?short", "0102"}, "written ok\n"},
+        {{"write", "1?HREG?400001?short", "001"}, "error: incorrect length of data to write\n"},
+        {{"write", "1?HREG?400001?short", "0g00"}, "error: incorrect hex data\n"},
+        {{"read", "1?HREG?400001"},
+         "Tag URI error: 1?HREG?400001 - there must be 4 tag specification fields"},
+        {{"setid", "5", "7"}, "id 5 set to 7\n"},
+        {{"setid", "5"}, "invalid format\n"},
+        {{"getid"}, "no node configurated\n"},
+        {{"read 1?HREG?400001?short"}, "e803\n"},  // one word for the shell, two for the driver
+    };
+    for (const auto& row : rows) {
+        std::vector<std::string> words{"console", "--sim"};
+        words.insert(words.end(), row.words.begin(), row.words.end());
+        const Outcome outcome = mrtu(words);
+        EXPECT_EQ(outcome.out, row.answer);
+        EXPECT_EQ(outcome.err, "") << row.answer;
+        EXPECT_EQ(outcome.exitCode, 0) << row.answer;
+    }
+}
+
+TEST(Console, AnUnknownCommandIsAUsageError) {
+    const Outcome outcome = mrtu({"console", "--sim", "HELP"});
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err, "mrtu: unknown command 'HELP'\n");
+    EXPECT_EQ(outcome.exitCode, 2);
+}
+
+TEST(Console, WithoutALineTheDriverStaysStopped) {
+    EXPECT_EQ(mrtu({"console", "help"}).out, kHelp);
+    EXPECT_EQ(mrtu({"console", "read", "1?HREG?400001?short"}).out, "Protocol not started");
+}
+
+TEST(Console, PipedCommandsAreAnsweredLineByLine) {
+    const Outcome outcome = mrtu({"console", "--sim"},
+                                 {.input = "getmaxtm\n\nread x\r\nsetid 5 7\ngetid\nquit\nhelp\n"});
+    EXPECT_EQ(outcome.out,
+              "maxtm = 4000 ms\n"
+              "Tag URI error: x - there must be 4 tag specification fields\n"
+              "id 5 set to 7\n"
+              "id 5 -> 7\n");
+    EXPECT_EQ(outcome.err, "");
+    EXPECT_EQ(outcome.exitCode, 0);
+}
+
+TEST(Console, AnUnknownPipedCommandDoesNotStopTheOthers) {
+    const Outcome outcome = mrtu({"console", "--sim"}, {.input = "nonsense\ngetmaxtm"});
+    EXPECT_EQ(outcome.out, "maxtm = 4000 ms\n");
+    EXPECT_EQ(outcome.err, "mrtu: unknown command 'nonsense'\n");
+    EXPECT_EQ(outcome.exitCode, 2);
+}
+
+TEST(Console, LongAnswersAreCutAtSixteenKibibytes) {
+    const Outcome outcome = mrtu({"console", "--sim", "read", "1?HREG?400001?unsignedShort-5000"});
+    // The driver leaves room for a line end and a zero behind the last whole byte.
+    EXPECT_EQ(outcome.out.size(), 16 * 1024 - 3U);
+    EXPECT_EQ(outcome.out.substr(0, 8), "e803e903");
+    EXPECT_EQ(outcome.exitCode, 0);
+}
+
+TEST(Console, AtATerminalLinesAreRemembered) {
+    cli_test::TerminalSession session({"console", "--sim"});
+    ASSERT_TRUE(session.shows("mrtu> ")) << session.screen();
+    session.type("getmaxtm\r");
+    ASSERT_TRUE(session.shows("maxtm = 4000 ms")) << session.screen();
+    ASSERT_TRUE(session.shows("mrtu> ")) << session.screen();
+    session.type("\x10\r");  // Ctrl-P: the line before
+    ASSERT_TRUE(session.shows("maxtm = 4000 ms")) << session.screen();
+    session.type("nonsense\r");
+    ASSERT_TRUE(session.shows("unknown command 'nonsense'")) << session.screen();
+    session.type("quit\r");
+    EXPECT_EQ(session.end(), 0) << session.screen();
+}
+
+}  // namespace

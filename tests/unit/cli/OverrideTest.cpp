@@ -1,0 +1,130 @@
+// mrtu override: what replaces the configuration, and stays.
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+
+#include "tests/unit/cli/Child.h"
+
+namespace {
+
+using cli_test::mrtu;
+using cli_test::Outcome;
+
+/// A storage of the test's own, on the simulated line.
+class Override : public testing::Test {
+  protected:
+    Outcome run(std::vector<std::string> words, const std::vector<std::string>& tail) const {
+        words.insert(words.end(), {"--sim", "--storage", storage_});
+        words.insert(words.end(), tail.begin(), tail.end());
+        return mrtu(words);
+    }
+    Outcome set(const std::vector<std::string>& words) const {
+        return run({"override", "set"}, words);
+    }
+    Outcome clear(const std::vector<std::string>& words) const {
+        return run({"override", "clear"}, words);
+    }
+    std::string list() const { return run({"override", "list"}, {}).out; }
+
+    std::string storage_ = cli_test::scratchFile("overrides.db");
+};
+
+constexpr const char* kNothing =
+    "node 1 = 1\nmodicon 1 = on\nbaud = 19200\nparity = none\nstop = 1\nmode = RS-232\n";
+
+TEST_F(Override, WithoutAnyTheConfigurationIsListed) {
+    EXPECT_EQ(list(), kNothing);
+}
+
+TEST_F(Override, OutlastsItsProcess) {
+    const Outcome outcome = set({"node", "5=7", "6=off", "modicon", "5=off", "baud=38400",
+                                 "parity=even", "stop=2", "mode=RS-485"});
+    EXPECT_EQ(outcome.out,
+              "node 5 = 7 (stored)\nnode 6 = off (stored)\nmodicon 5 = off (stored)\n"
+              "baud = 38400 (stored)\nparity = even (stored)\nstop = 2 (stored)\n"
+              "mode = RS-485 (stored)\n");
+    EXPECT_EQ(outcome.err, "");
+    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(list(),
+              "node 1 = 1\nmodicon 1 = on\nnode 5 = 7 (stored)\nmodicon 5 = off (stored)\n"
+              "node 6 = off (stored)\nmodicon 6 = on\nbaud = 38400 (stored)\n"
+              "parity = even (stored)\nstop = 2 (stored)\nmode = RS-485 (stored)\n");
+}
+
+TEST_F(Override, ActsOnTheReadsOfALaterProcess) {
+    set({"node", "5=7", "6=off", "modicon", "8=off"});
+    const Outcome outcome =
+        run({"read"}, {"5?HREG?400001?unsignedShort", "6?HREG?400001?unsignedShort",
+                       "8?HREG?400001?unsignedShort"});
+    // Node 7 answers for node 5; node 8 counts from 0, so its first register is the second.
+    EXPECT_EQ(outcome.out,
+              "5?HREG?400001?unsignedShort = 7000\n8?HREG?400001?unsignedShort = 8001\n");
+    EXPECT_EQ(outcome.err, "mrtu: 6?HREG?400001?unsignedShort: error -10: Node disabled\n");
+}
+
+TEST_F(Override, IsTheConsolesToo) {
+    set({"node", "5=7"});
+    EXPECT_EQ(run({"console"}, {"getid"}).out, "id 5 -> 7\n");
+    EXPECT_EQ(run({"console"}, {"setid", "5", "9"}).out, "id 5 set to 9\n");
+    EXPECT_NE(list().find("node 5 = 9 (stored)\n"), std::string::npos);
+}
+
+TEST_F(Override, BelongsToOneIdent) {
+    set({"--ident", "left", "node", "5=7"});
+    EXPECT_EQ(list(), kNothing);
+    EXPECT_EQ(run({"console"}, {"--ident", "left", "getid"}).out, "id 5 -> 7\n");
+}
+
+TEST_F(Override, IsClearedOneByOne) {
+    set({"node", "5=7", "6=off", "modicon", "5=off", "baud=38400", "parity=even"});
+    const Outcome outcome = clear({"node", "5", "modicon", "5", "baud"});
+    EXPECT_EQ(outcome.out, "cleared\n");
+    EXPECT_EQ(outcome.exitCode, 0) << outcome.err;
+    EXPECT_EQ(list(),
+              "node 1 = 1\nmodicon 1 = on\nnode 6 = off (stored)\nmodicon 6 = on\n"
+              "baud = 19200\nparity = even (stored)\nstop = 1\nmode = RS-232\n");
+}
+
+TEST_F(Override, IsClearedAtOnceWithoutALine) {
+    set({"node", "5=7", "modicon", "9=off", "mode=RS-485"});
+    const Outcome outcome = mrtu({"override", "clear", "--storage", storage_, "all"});
+    EXPECT_EQ(outcome.out, "cleared\n");
+    EXPECT_EQ(outcome.exitCode, 0) << outcome.err;
+    EXPECT_EQ(list(), kNothing);
+}
+
+TEST_F(Override, AWrongWordChangesNothing) {
+    for (const char* const wrong : {"baud=14400", "stop=7", "6=256", "nonsense"}) {
+        const Outcome outcome = set({"node", "5=7", wrong});
+        EXPECT_EQ(outcome.exitCode, 2) << wrong;
+        EXPECT_EQ(outcome.out, "") << wrong;
+        EXPECT_NE(outcome.err.find(wrong), std::string::npos) << outcome.err;
+    }
+    EXPECT_EQ(list(), kNothing);
+}
+
+TEST_F(Override, WithoutAStorageItEndsWithItsCommand) {
+    const Outcome outcome = mrtu({"override", "set", "--sim", "node", "5=7"});
+    EXPECT_EQ(outcome.out, "node 5 = 7\n");
+    EXPECT_EQ(outcome.err, "mrtu: there is no storage: the overrides end with this command\n");
+    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(mrtu({"override", "clear", "--sim", "all"}).exitCode, 2);
+}
+
+TEST_F(Override, NeedsALine) {
+    const Outcome outcome = mrtu({"override", "list", "--storage", "none"});
+    EXPECT_EQ(outcome.err, "mrtu: no line: --port com1=/dev/ttyUSB0, or --sim\n");
+    EXPECT_EQ(outcome.exitCode, 2);
+}
+
+TEST_F(Override, AStorageThatMayNotBeWrittenIsAFailureAndKeepsItsValues) {
+    set({"node", "5=7"});
+    ASSERT_EQ(chmod(storage_.c_str(), 0444), 0);
+    const Outcome outcome = mrtu({"override", "set", "--sim", "--storage", storage_, "node", "5=9"},
+                                 {.unprivileged = true});
+    if (outcome.exitCode >= 126) GTEST_SKIP() << "the unprivileged user can't run the command";
+    EXPECT_EQ(outcome.exitCode, 1);
+    EXPECT_NE(outcome.err.find("storage"), std::string::npos) << outcome.err;
+    EXPECT_NE(list().find("node 5 = 7 (stored)\n"), std::string::npos);
+}
+
+}  // namespace

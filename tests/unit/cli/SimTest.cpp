@@ -1,0 +1,52 @@
+// mrtu sim: a line that others can open.
+#include <gtest/gtest.h>
+#include <signal.h>
+
+#include <filesystem>
+
+#include "tests/unit/cli/Child.h"
+
+namespace {
+
+using cli_test::mrtu;
+using cli_test::RunningSim;
+
+TEST(Sim, AnnouncesItsDeviceAndAnExampleThatWorks) {
+    const RunningSim sim({"--ascii", "--node", "17", "--plain"});
+    EXPECT_EQ(sim.announcement(), "simulated ASCII line: " + sim.device() +
+                                      "\ntry: mrtu read --port " + sim.device() +
+                                      " --ascii '17?HREG?400001?unsignedShort'\nCtrl-C ends it.\n");
+    const auto outcome =
+        mrtu({"read", "--port", sim.device(), "--ascii", "17?HREG?400001?unsignedShort"});
+    EXPECT_EQ(outcome.out, "17?HREG?400001?unsignedShort = 17000\n") << outcome.err;
+}
+
+TEST(Sim, EndsWithEitherSignalAndTakesItsLinkAway) {
+    for (const int signal : {SIGINT, SIGTERM}) {
+        const std::string link = cli_test::scratchFile("line");
+        RunningSim sim({"--link", link});
+        EXPECT_EQ(sim.device(), link);
+        EXPECT_TRUE(std::filesystem::is_symlink(link));
+        EXPECT_EQ(sim.end(signal), 0);
+        EXPECT_FALSE(std::filesystem::is_symlink(link));
+    }
+}
+
+TEST(Sim, OnlyNamedNodesAnswer) {
+    const RunningSim sim({"--node", "3", "--node", "4"});
+    const auto outcome = mrtu({"read", "--port", sim.device(), "--timeout", "100", "--set",
+                               "repeat=0", "3?OUTP?1?boolean", "5?OUTP?1?boolean"});
+    EXPECT_EQ(outcome.out, "3?OUTP?1?boolean = 1\n");
+    EXPECT_EQ(outcome.exitCode, 4);
+}
+
+TEST(Sim, DoesNotReplaceAFileByItsLink) {
+    const std::string file = cli_test::scratchFile("precious");
+    cli_test::writeFile(file, "kept");
+    const auto outcome = mrtu({"sim", "--link", file});
+    EXPECT_EQ(outcome.exitCode, 3);
+    EXPECT_NE(outcome.err.find(file), std::string::npos) << outcome.err;
+    EXPECT_EQ(cli_test::contentsOf(file), "kept");
+}
+
+}  // namespace

@@ -1,0 +1,173 @@
+// The sub-command against the real plug-in.
+#include <gtest/gtest.h>
+#include <stdlib.h>
+
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <vector>
+
+#include "cli/Command.h"
+#include "cli/JsonValues.h"
+
+namespace cli {
+namespace {
+
+namespace fs = std::filesystem;
+
+const std::string kGood =
+    "CfgVer=1 defNodeId=1 txMode=RTU uart=com1 baudrate=9600\n"
+    "parity=even stopbits=1 mode=RS-485\n";
+
+struct Outcome {
+    int code;
+    std::string out;
+    std::string err;
+};
+
+class CheckCommand : public testing::Test {
+  protected:
+    void SetUp() override {
+        std::string name = (fs::temp_directory_path() / "mrtu_check_XXXXXX").string();
+        ASSERT_NE(mkdtemp(name.data()), nullptr);
+        directory_ = name;
+    }
+    void TearDown() override { fs::remove_all(directory_); }
+
+    std::string store(const std::string& name, const std::string& text) const {
+        const fs::path path = directory_ / name;
+        std::ofstream(path, std::ios::binary) << text;
+        return path.string();
+    }
+
+    Outcome check(const std::string& config, std::vector<std::string> words) const {
+        const std::string file = store("line.cfg", config);
+        words.insert(words.begin(), {"mrtu", "check", "--config", file, "--plugin", PLUGIN});
+        std::vector<const char*> argv;
+        for (const std::string& word : words)
+            argv.push_back(word.c_str());
+        std::ostringstream out;
+        std::ostringstream err;
+        const int code = runCommandLine(static_cast<int>(argv.size()), argv.data(), out, err);
+        return {code, out.str(), err.str()};
+    }
+
+    /// The rules of the findings, in order, from --json.
+    std::string rules(const std::string& config, std::vector<std::string> words) const {
+        words.emplace_back("--json");
+        const Outcome outcome = check(config, std::move(words));
+        const Json report = Json::parse(outcome.out);
+        std::string text;
+        for (const Json& finding : report["findings"]) {
+            text += finding["rule"].get<std::string>() + ' ';
+        }
+        return text;
+    }
+
+  private:
+    fs::path directory_;
+};
+
+TEST_F(CheckCommand, CleanConfigurationAndTagsAreClean) {
+    const Outcome outcome =
+        check(kGood, {"--strict", "1?HREG?400001?unsignedShort", "1?OUTP?1?boolean-8"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.out, "0 errors, 0 warnings (2 tags checked)\n");
+}
+
+TEST_F(CheckCommand, WarningsCountOnlyWhenStrict) {
+    const std::string config = kGood + "timout=1";
+    EXPECT_EQ(check(config, {}).code, 0);
+    const Outcome strict = check(config, {"--strict"});
+    EXPECT_EQ(strict.code, 1);
+    EXPECT_NE(strict.out.find("line.cfg:3:1: warning: unknown key 'timout' [unknown-key]\n"
+                              "    did you mean 'timeout'?\n"),
+              std::string::npos)
+        << strict.out;
+}
+
+TEST_F(CheckCommand, RefusedConfigurationIsAnErrorAndLeavesTagsUnchecked) {
+    const Outcome outcome = check("CfgVer=1 defNodeId=1", {"1?HREG?x?y"});
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_NE(outcome.out.find("line.cfg:1:21: error: Parser: parameter 'uart' is not found"),
+              std::string::npos)
+        << outcome.out;
+    EXPECT_NE(outcome.out.find("1 tag not checked"), std::string::npos) << outcome.out;
+}
+
+TEST_F(CheckCommand, RefusedTagIsAnErrorWithTheDriversWords) {
+    const Outcome outcome = check(kGood, {"1?INP?100001?unsignedShort"});
+    EXPECT_EQ(outcome.code, 2);
+    EXPECT_NE(outcome.out.find("argument:1:14: error: "), std::string::npos) << outcome.out;
+    EXPECT_NE(outcome.out.find("not allowed icom type"), std::string::npos) << outcome.out;
+}
+
+TEST_F(CheckCommand, EveryListedSilenceIsFound) {
+    EXPECT_EQ(rules(kGood + "bits=8 repeat=1 repeat=2 model=x timout=5", {}),
+              "ignored-key duplicate-key unknown-model unknown-key ");
+    struct Case {
+        std::vector<std::string> uris;
+        const char* rules;
+    };
+    const Case cases[] = {
+        {{"9?HREG?400001?short"}, "unnamed-node "},
+        {{"1?OUTP?0100?boolean"}, "octal-number "},
+        {{"1?HREG?40001?short"}, "short-address "},
+        {{"1?HREG?400001?float", "1?HREG?400002?short"}, "overlap "},
+        {{"1?HREG?400001?short", "1?HREG?400001.3?boolean"}, "shared-register "},
+        // The five-digit form is the same register: both tags are short of being clear.
+        {{"1?HREG?40001?float", "1?HREG?400002?short"}, "short-address overlap "},
+        {{"1?OUTP?1?boolean-16", "1?OUTP?3?boolean"}, ""},
+    };
+    for (const Case& each : cases) {
+        EXPECT_EQ(rules(kGood, each.uris), each.rules) << each.uris.front();
+    }
+}
+
+TEST_F(CheckCommand, ZeroBasedModelsShareTheirFiveDigitForms) {
+    EXPECT_EQ(rules(kGood + "model=2", {"1?HREG?40010?short", "1?HREG?400010?float"}),
+              "short-address overlap ");
+}
+
+TEST_F(CheckCommand, WideRegistersOfTheEnronModelsAreTakenByTheirWidth) {
+    EXPECT_EQ(rules(kGood + "model=3", {"1?LONG?0?int", "1?LONG?1?float"}), "");
+    EXPECT_EQ(rules(kGood + "model=3", {"1?LONG?0?int-2", "1?LONG?1?float"}), "overlap ");
+}
+
+TEST_F(CheckCommand, TagsMayComeFromAFile) {
+    const std::string tags =
+        store("tags", "# two\n1?HREG?400001?short\n\n1?HREG?400001?float # b\n");
+    const Outcome outcome = check(kGood, {"--tags", tags});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_NE(outcome.out.find("tags:4:8: warning: overlaps '1?HREG?400001?short'"),
+              std::string::npos)
+        << outcome.out;
+}
+
+TEST_F(CheckCommand, JsonCountsWhatItLists) {
+    const Outcome outcome = check(kGood + "timout=1", {"--json", "1?HREG?1?short"});
+    EXPECT_EQ(outcome.code, 2);
+    const Json json = Json::parse(outcome.out);
+    EXPECT_EQ(json["errors"], 1);
+    EXPECT_EQ(json["warnings"], 1);
+    EXPECT_EQ(json["tagsChecked"], 1);
+    EXPECT_EQ(json["findings"].size(), 2U);
+}
+
+TEST_F(CheckCommand, JsonSurvivesBytesThatAreNoText) {
+    const Outcome outcome = check(kGood + "\xff\xfe=1", {"--json"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(Json::parse(outcome.out)["warnings"], 1);
+}
+
+TEST_F(CheckCommand, UnreadableFilesAreWrongUsage) {
+    EXPECT_EQ(check(kGood, {"--tags", "/nowhere/tags"}).code, 2);
+    EXPECT_EQ(check(kGood, {"--tags", "/"}).code, 2);
+}
+
+TEST_F(CheckCommand, FileAndArgumentsExcludeEachOther) {
+    EXPECT_EQ(check(kGood, {"--tags", "x", "1?HREG?400001?short"}).code, 2);
+}
+
+}  // namespace
+}  // namespace cli

@@ -1,0 +1,42 @@
+#include "cli/check/NearestName.h"
+
+#include <gtest/gtest.h>
+
+namespace cli {
+namespace {
+
+TEST(NearestName, DistanceCountsEdits) {
+    struct Case {
+        const char* a;
+        const char* b;
+        std::size_t distance;
+    };
+    const Case cases[] = {
+        {"", "", 0},
+        {"", "ab", 2},
+        {"ab", "", 2},
+        {"same", "same", 0},
+        {"timout", "timeout", 1},
+        {"timeuot", "timeout", 1},
+        {"HREG", "hreg", 0},
+        {"kitten", "sitting", 3},
+    };
+    for (const Case& each : cases) {
+        EXPECT_EQ(editDistance(each.a, each.b), each.distance) << each.a << ' ' << each.b;
+        EXPECT_EQ(editDistance(each.b, each.a), each.distance) << each.b << ' ' << each.a;
+    }
+}
+
+TEST(NearestName, IsTheFirstOfTheNearest) {
+    EXPECT_EQ(nearestName("timout", {"delay", "timeout", "timeouts"}), "timeout");
+    EXPECT_EQ(nearestName("ab", {"xb", "ax"}), "xb");
+}
+
+TEST(NearestName, IsEmptyWhereNothingIsNear) {
+    EXPECT_EQ(nearestName("weather", {"timeout", "delay"}), "");
+    EXPECT_EQ(nearestName("xy", {"ab", "1"}), "") << "every character would change";
+    EXPECT_EQ(nearestName("x", {}), "");
+}
+
+}  // namespace
+}  // namespace cli

@@ -1,0 +1,77 @@
+// The sub-command against the real plug-in.
+#include <gtest/gtest.h>
+
+#include <fstream>
+#include <iterator>
+#include <sstream>
+#include <vector>
+
+#include "cli/Command.h"
+#include "cli/JsonValues.h"
+
+namespace cli {
+namespace {
+
+struct Outcome {
+    int code;
+    std::string out;
+    std::string err;
+};
+
+Outcome describe(std::vector<std::string> words) {
+    words.insert(words.begin(), {"mrtu", "describe"});
+    words.insert(words.end(), {"--plugin", PLUGIN});
+    std::vector<const char*> argv;
+    for (const std::string& word : words)
+        argv.push_back(word.c_str());
+    std::ostringstream out;
+    std::ostringstream err;
+    const int code = runCommandLine(static_cast<int>(argv.size()), argv.data(), out, err);
+    return {code, out.str(), err.str()};
+}
+
+TEST(DescribeCommand, XmlIsTheDocumentByteForByte) {
+    std::ifstream file(DOCUMENT, std::ios::binary);
+    const std::string document{std::istreambuf_iterator<char>(file), {}};
+    ASSERT_FALSE(document.empty());
+    const Outcome outcome = describe({"--xml"});
+    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(outcome.out, document);
+}
+
+TEST(DescribeCommand, SectionsAreFoundInTheWhole) {
+    const Outcome whole = describe({});
+    ASSERT_EQ(whole.code, 0) << whole.err;
+    for (const char* section : {"models", "memory", "parameters", "conversions"}) {
+        const Outcome part = describe({section});
+        EXPECT_EQ(part.code, 0) << section;
+        EXPECT_FALSE(part.out.empty()) << section;
+        EXPECT_NE(whole.out.find(part.out), std::string::npos) << section;
+    }
+}
+
+TEST(DescribeCommand, JsonHoldsEverySection) {
+    const Json json = Json::parse(describe({"--json"}).out);
+    EXPECT_EQ(json["facts"]["name"], "MRTU");
+    EXPECT_EQ(json["parameters"].size(), 18U);
+    EXPECT_EQ(json["memory"].size(), 12U);
+    EXPECT_EQ(json["tagFields"].size(), 4U);
+    EXPECT_EQ(json["models"].size(), 4U);
+    EXPECT_EQ(json["conversions"].size(), 7U);
+    EXPECT_EQ(Json::parse(describe({"models", "--json"}).out), json["models"]);
+}
+
+TEST(DescribeCommand, WrongUsageIsRefused) {
+    EXPECT_EQ(describe({"--xml", "--json"}).code, 2);
+    EXPECT_EQ(describe({"--xml", "models"}).code, 2);
+    EXPECT_EQ(describe({"weather"}).code, 2);
+}
+
+TEST(DescribeCommand, UnknownProtocolIsSaidToBeUnknown) {
+    const Outcome outcome = describe({"--protocol", "XYZ"});
+    EXPECT_EQ(outcome.code, 1);
+    EXPECT_NE(outcome.err.find("XYZ"), std::string::npos) << outcome.err;
+}
+
+}  // namespace
+}  // namespace cli
