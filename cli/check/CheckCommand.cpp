@@ -3,9 +3,9 @@
 
 #include <CLI/CLI.hpp>
 #include <fstream>
-#include <iterator>
 #include <memory>
 #include <ostream>
+#include <sstream>
 
 #include "cli/Commands.h"
 #include "cli/check/LintConfig.h"
@@ -33,11 +33,14 @@ struct Report {
 
 std::string readFile(const std::string& name) {
     std::ifstream file(name, std::ios::binary);
-    std::string text{std::istreambuf_iterator<char>(file), {}};
-    if (!file.is_open() || file.bad()) {
+    std::ostringstream text;
+    // An empty file, too, sets the fail bit of what it is written to; a folder can be opened.
+    const bool empty = file.is_open() && file.peek() == std::ifstream::traits_type::eof();
+    if (!empty) text << file.rdbuf();
+    if (!file.is_open() || file.bad() || !text) {
         throw CommandError(ExitCode::Usage, fmt::format("can't read {}", name));
     }
-    return text;
+    return text.str();
 }
 
 std::vector<TagLine> tagsOf(const Options& options) {

@@ -19,7 +19,8 @@ void splitNodePrefix(ScannedItem& item) {
 
 ScannedItem itemOf(std::string_view word, Place place) {
     ScannedItem item{};
-    const std::size_t equals = word.find('=');
+    // An "=" that stands alone, or in front, names nothing.
+    const std::size_t equals = word.find('=') == 0 ? std::string_view::npos : word.find('=');
     item.word = word;
     item.name = word.substr(0, equals);
     item.key = item.name;
