@@ -1,0 +1,213 @@
+// Overridden parameters and their cache.
+#include <limits>
+#include <string>
+
+#include "framework/ParameterReplacer.h"
+#include "tests/unit/framework/ReplacerFixture.h"
+
+namespace {
+
+class ReplacerParameter : public ReplacerTest {
+  protected:
+    ReplacerParameter() { replacer_.setSection("MRTU"); }
+
+    int number(const std::string& name, int fallback, int node = -1) {
+        int value = -12345;
+        replacer_.get(name, node, fallback, value);
+        return value;
+    }
+    bool flag(const std::string& name, int node, bool fallback) {
+        bool value = !fallback;
+        replacer_.get(name, node, fallback, value);
+        return value;
+    }
+
+    static ParameterReplacer::Variant ofType(int type) {
+        ParameterReplacer::Variant value;
+        value.type = type;
+        value.boolValue = true;
+        value.intValue = 42;
+        value.stringValue = "text";
+        return value;
+    }
+
+    ParameterReplacer replacer_;
+};
+
+TEST_F(ReplacerParameter, FullNameCarriesTheNodeUnlessItIsMinusOne) {
+    struct Row {
+        const char* name;
+        int node;
+        const char* full;
+    };
+    const Row rows[] = {
+        {"ModiconMode", -1, "ModiconMode"},
+        {"ModiconMode", 0, "node0_ModiconMode"},
+        {"ModiconMode", 5, "node5_ModiconMode"},
+        {"ModiconMode", 247, "node247_ModiconMode"},
+        {"ModiconMode", -2, "node-2_ModiconMode"},
+        {"x", std::numeric_limits<int>::max(), "node2147483647_x"},
+        {"x", std::numeric_limits<int>::min(), "node-2147483648_x"},
+        {"", 3, "node3_"},
+        {"", -1, ""},
+    };
+    for (const Row& row : rows)
+        EXPECT_EQ(ParameterReplacer::makeFullName(row.name, row.node), row.full);
+}
+
+TEST_F(ReplacerParameter, NewVariantIsAFalseBoolean) {
+    const ParameterReplacer::Variant value;
+    EXPECT_EQ(value.type, 0);
+    EXPECT_FALSE(value.boolValue);
+    EXPECT_EQ(value.intValue, 0);
+    EXPECT_EQ(value.stringValue, "");
+}
+
+TEST_F(ReplacerParameter, SectionIsKept) {
+    EXPECT_EQ(replacer_.section(), "MRTU");
+}
+
+TEST_F(ReplacerParameter, FirstDefaultDecidesWhereNothingIsStored) {
+    EXPECT_EQ(number("baud", 9600), 9600);
+    EXPECT_EQ(number("baud", 19200), 9600);
+    EXPECT_TRUE(flag("ModiconMode", 3, true));
+    EXPECT_TRUE(flag("ModiconMode", 3, false));
+}
+
+TEST_F(ReplacerParameter, StoredValueWinsOverTheDefault) {
+    contents_.put("MRTU", "baud", 38400);
+    contents_.put("MRTU", "node3_ModiconMode", false);
+    EXPECT_EQ(number("baud", 9600), 38400);
+    EXPECT_FALSE(flag("ModiconMode", 3, true));
+}
+
+TEST_F(ReplacerParameter, StorageIsConsultedOnce) {
+    contents_.put("MRTU", "baud", 38400);
+    EXPECT_EQ(number("baud", 9600), 38400);
+    contents_.put("MRTU", "baud", 1200);
+    storage_.forget();
+    EXPECT_EQ(number("baud", 9600), 38400);
+    EXPECT_TRUE(storage_.calls().empty());
+}
+
+TEST_F(ReplacerParameter, MissingKeyIsAskedForOnceAndNotRead) {
+    EXPECT_EQ(number("stop", 2), 2);
+    const std::vector<std::string> calls{"hasKey(MRTU, stop)"};
+    EXPECT_EQ(storage_.calls(), calls);
+    contents_.put("MRTU", "stop", 1);
+    EXPECT_EQ(number("stop", 2), 2);
+    EXPECT_EQ(storage_.calls(), calls);
+}
+
+TEST_F(ReplacerParameter, EachFormReadsItsOwnType) {
+    contents_.put("MRTU", "baud", 38400);
+    contents_.put("MRTU", "node5_ModiconMode", true);
+    number("baud", 9600);
+    flag("ModiconMode", 5, false);
+    EXPECT_EQ(storage_.calls(),
+              (std::vector<std::string>{"hasKey(MRTU, baud)", "readInt(MRTU, baud)",
+                                        "hasKey(MRTU, node5_ModiconMode)",
+                                        "readBool(MRTU, node5_ModiconMode)"}));
+}
+
+TEST_F(ReplacerParameter, NodesHaveValuesOfTheirOwn) {
+    EXPECT_TRUE(flag("ModiconMode", 1, true));
+    EXPECT_FALSE(flag("ModiconMode", 2, false));
+    EXPECT_FALSE(flag("ModiconMode", -1, false));
+    EXPECT_TRUE(flag("ModiconMode", 1, false));
+}
+
+TEST_F(ReplacerParameter, SectionsAreTakenFromTheReplacer) {
+    contents_.put("other", "baud", 1200);
+    EXPECT_EQ(number("baud", 9600), 9600);
+    ParameterReplacer other;
+    other.setSection("other");
+    int value = 0;
+    other.get("baud", -1, 9600, value);
+    EXPECT_EQ(value, 1200);
+}
+
+TEST_F(ReplacerParameter, NewSectionKeepsCachedValues) {
+    EXPECT_EQ(number("baud", 9600), 9600);
+    contents_.put("other", "baud", 1200);
+    replacer_.setSection("other");
+    EXPECT_EQ(number("baud", 300), 9600);
+}
+
+TEST_F(ReplacerParameter, WithoutStorageDefaultsAreCached) {
+    useNoStorage();
+    EXPECT_EQ(number("baud", 9600), 9600);
+    piPermanentStorage = &storage_;
+    contents_.put("MRTU", "baud", 1200);
+    EXPECT_EQ(number("baud", 300), 9600);
+}
+
+TEST_F(ReplacerParameter, ExplicitValueReplacesTheCachedOneInMemoryOnly) {
+    EXPECT_EQ(number("baud", 9600), 9600);
+    storage_.forget();
+    replacer_.set("baud", ofType(ParameterReplacer::integer));
+    EXPECT_EQ(number("baud", 9600), 42);
+    EXPECT_TRUE(storage_.calls().empty());
+}
+
+TEST_F(ReplacerParameter, ExplicitValueComesBeforeTheFirstLookUp) {
+    contents_.put("MRTU", "node3_ModiconMode", false);
+    replacer_.set("node3_ModiconMode", ofType(ParameterReplacer::boolean));
+    EXPECT_TRUE(flag("ModiconMode", 3, false));
+}
+
+TEST_F(ReplacerParameter, EachFormTakesItsOwnFieldOfAnEntry) {
+    ParameterReplacer::Variant value;
+    value.type = ParameterReplacer::boolean;
+    value.boolValue = true;
+    replacer_.set("mixed", value);
+    EXPECT_EQ(number("mixed", 9600), 0);
+    EXPECT_TRUE(flag("mixed", -1, false));
+}
+
+TEST_F(ReplacerParameter, ValuesArePersistedByType) {
+    replacer_.persist("flag", ofType(ParameterReplacer::boolean));
+    replacer_.persist("number", ofType(ParameterReplacer::integer));
+    replacer_.persist("name", ofType(ParameterReplacer::text));
+    EXPECT_EQ(stored("flag"), "bool:true");
+    EXPECT_EQ(stored("number"), "int:42");
+    EXPECT_EQ(stored("name"), "text:text");
+    EXPECT_EQ(storage_.calls().size(), 3u);
+}
+
+TEST_F(ReplacerParameter, OtherTypesAreNotPersisted) {
+    for (int type : {-1, 3, 99})
+        replacer_.persist("odd", ofType(type));
+    EXPECT_TRUE(storage_.calls().empty());
+}
+
+TEST_F(ReplacerParameter, PersistedValueIsNotCached) {
+    replacer_.persist("baud", ofType(ParameterReplacer::integer));
+    EXPECT_EQ(number("baud", 9600), 42);  // found in the storage at the first look-up
+    replacer_.persist("baud", ofType(ParameterReplacer::text));
+    EXPECT_EQ(number("baud", 9600), 42);
+}
+
+TEST_F(ReplacerParameter, PersistingWithoutStorageIsHarmless) {
+    useNoStorage();
+    replacer_.persist("baud", ofType(ParameterReplacer::integer));
+    EXPECT_EQ(stored("baud"), "none");
+}
+
+TEST_F(ReplacerParameter, NamesOfAnyLengthAreKeptApart) {
+    for (std::size_t length : {1u, 111u, 112u, 113u, 128u, 500u}) {
+        const std::string name(length, 'n');
+        contents_.put("MRTU", "node-2147483648_" + name, static_cast<int>(length));
+        EXPECT_EQ(number(name, -1, std::numeric_limits<int>::min()), static_cast<int>(length));
+        EXPECT_EQ(number(name, -7), -7) << length;
+        EXPECT_EQ(number(name, -8, std::numeric_limits<int>::min()), static_cast<int>(length));
+    }
+}
+
+TEST_F(ReplacerParameter, PlainStorageServesAsWell) {
+    usePlainStorage();
+    contents_.put("MRTU", "baud", 38400);
+    EXPECT_EQ(number("baud", 9600), 38400);
+}
+
+}  // namespace
