@@ -1,0 +1,82 @@
+// Values written through the text console.
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "tests/unit/framework/ConsoleFixture.h"
+
+namespace {
+
+using Bytes = std::vector<unsigned char>;
+using ConsoleWrite = ConsoleTest;
+
+constexpr const char* kNoUriOrData = "error: missing parameters (URI string + data)\n";
+constexpr const char* kWrongLength = "error: incorrect length of data to write\n";
+constexpr const char* kWrongDigits = "error: incorrect hex data\n";
+
+TEST_F(ConsoleWrite, WriteNeedsExactlyUriAndData) {
+    for (const char* command :
+         {"write", "write byte", "write byte 00 00", "write byte  00", "write byte 00 "}) {
+        EXPECT_EQ(answerTo(command), kNoUriOrData) << '"' << command << '"';
+    }
+    EXPECT_TRUE(protocol_.written.empty());
+}
+
+TEST_F(ConsoleWrite, WrittenDigitsAreHighNibbleFirstInEitherCase) {
+    EXPECT_EQ(answerTo("write dword 1aB2c3D4"), "written ok\n");
+    EXPECT_EQ(answerTo("write bits 010001"), "written ok\n");
+    const std::vector<Bytes> expected{{0x1A, 0xB2, 0xC3, 0xD4}, {1, 0, 1}};
+    EXPECT_EQ(protocol_.written, expected);
+}
+
+TEST_F(ConsoleWrite, LongValuesAreWrittenWhole) {
+    for (std::size_t length : {64u, 65u}) {
+        std::string digits;
+        for (std::size_t i = 0; i < length; ++i)
+            digits += i + 1 == length ? "7f" : "a5";
+        EXPECT_EQ(answerTo("write b" + std::to_string(length) + " " + digits), "written ok\n");
+        Bytes expected(length, 0xA5);
+        expected.back() = 0x7F;
+        ASSERT_FALSE(protocol_.written.empty());
+        EXPECT_EQ(protocol_.written.back(), expected);
+    }
+}
+
+TEST_F(ConsoleWrite, WrongNumberOfDigitsIsRefused) {
+    for (const char* data : {"001", "0", "00", "00000", "000000", "0x00f"}) {
+        EXPECT_EQ(answerTo(std::string("write word ") + data), kWrongLength) << data;
+    }
+    EXPECT_EQ(answerTo("write nothing 00"), kWrongLength);
+    EXPECT_TRUE(protocol_.written.empty());
+}
+
+TEST_F(ConsoleWrite, WrongLengthIsReportedBeforeWrongDigits) {
+    EXPECT_EQ(answerTo("write word 0g0"), kWrongLength);
+}
+
+TEST_F(ConsoleWrite, EmptyValueTakesEmptyData) {
+    EXPECT_EQ(answerTo("write nothing "), "written ok\n");
+    EXPECT_EQ(protocol_.written, std::vector<Bytes>{Bytes{}});
+}
+
+TEST_F(ConsoleWrite, OnlyHexadecimalDigitsAreTaken) {
+    EXPECT_EQ(answerTo("write byte 0g"), kWrongDigits);
+    const std::string digits = "0123456789ABCDEFabcdef";
+    for (int code = 1; code < 256; ++code) {
+        const char c = static_cast<char>(code);
+        if (c == ' ' || c == '\t') continue;  // these end a word or are trimmed off it
+        const bool isDigit = digits.find(c) != std::string::npos;
+        const char* expected = isDigit ? "written ok\n" : kWrongDigits;
+        EXPECT_EQ(answerTo(std::string("write byte 0") + c), expected) << code;
+        EXPECT_EQ(answerTo(std::string("write byte ") + c + "0"), expected) << code;
+    }
+    EXPECT_EQ(protocol_.written.size(), 2 * digits.size());
+}
+
+TEST_F(ConsoleWrite, FailedWriteIsAnsweredWithTheLastError) {
+    protocol_.writeResult = 0;
+    EXPECT_EQ(answerTo("write byte 00"), "nobody answered the write");
+}
+
+}  // namespace
