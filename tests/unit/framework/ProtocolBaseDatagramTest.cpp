@@ -1,0 +1,172 @@
+// The datagram rules of the base, on top of what a driver overrides.
+#include <gtest/gtest.h>
+
+#include <limits>
+#include <set>
+#include <utility>
+#include <vector>
+
+#include "tests/unit/framework/TestProtocol.h"
+
+namespace {
+
+class CoexistingTags : public TestProtocol {
+  public:
+    bool CanCoexistInDatagram(const ITag* a, const ITag* b) const override {
+        compared.emplace_back(a, b);
+        return refused.count(a) == 0;
+    }
+    std::set<const ITag*> refused;  ///< These coexist with nothing.
+    mutable std::vector<std::pair<const ITag*, const ITag*>> compared;
+};
+
+class CountedTags : public CoexistingTags {
+  public:
+    int MaxDatagramItems(const ITag*) const override { return maxItems; }
+    int maxItems = 10;
+};
+
+class Datagrams : public CountedTags {
+  public:
+    int MaxDatagramLength(const ITag*) const override { return maxLength; }
+    int ReadDatagram(const ITag* const*, int count, unsigned char*) override {
+        counts.push_back(count);
+        return readResult;
+    }
+    int maxLength = 10;
+    std::vector<int> counts;
+};
+
+class ProtocolBaseDatagram : public testing::Test {
+  protected:
+    TestTag two_{"two", bytesShape(2)};
+    TestTag three_{"three", bytesShape(3)};
+    TestTag five_{"five", bytesShape(5)};
+    const ITag* list_[2] = {&two_, &three_};
+    unsigned char data_[16] = {};
+    Datagrams protocol_;
+};
+
+TEST_F(ProtocolBaseDatagram, CandidateFitsUpToTheLastByte) {
+    EXPECT_TRUE(protocol_.CanAddToDatagram(list_, 2, &five_));
+    protocol_.maxLength = 9;
+    EXPECT_FALSE(protocol_.CanAddToDatagram(list_, 2, &five_));
+}
+
+TEST_F(ProtocolBaseDatagram, CandidateNeedsAFreeItem) {
+    protocol_.maxItems = 3;
+    EXPECT_TRUE(protocol_.CanAddToDatagram(list_, 2, &five_));
+    protocol_.maxItems = 2;
+    EXPECT_FALSE(protocol_.CanAddToDatagram(list_, 2, &five_));
+}
+
+TEST_F(ProtocolBaseDatagram, OnlyTheFirstTagIsComparedWithTheCandidate) {
+    protocol_.refused = {&three_};
+    EXPECT_TRUE(protocol_.CanAddToDatagram(list_, 2, &five_));
+    const std::vector<std::pair<const ITag*, const ITag*>> compared{{&two_, &five_}};
+    EXPECT_EQ(protocol_.compared, compared);
+    protocol_.refused = {&two_};
+    EXPECT_FALSE(protocol_.CanAddToDatagram(list_, 2, &five_));
+}
+
+TEST_F(ProtocolBaseDatagram, EmptyDatagramTakesATagThatFits) {
+    EXPECT_TRUE(protocol_.CanAddToDatagram(nullptr, 0, &five_));
+    protocol_.maxLength = 4;
+    EXPECT_FALSE(protocol_.CanAddToDatagram(nullptr, 0, &five_));
+}
+
+TEST_F(ProtocolBaseDatagram, WithoutAnItemLimitNothingIsAdded) {
+    CoexistingTags protocol;
+    EXPECT_FALSE(protocol.CanAddToDatagram(list_, 1, &five_));
+}
+
+TEST_F(ProtocolBaseDatagram, WithoutALengthLimitOnlyEmptyTagsAreAdded) {
+    CountedTags protocol;
+    const TestTag empty("empty", bytesShape(0));
+    const ITag* empties[] = {&empty, &empty};
+    EXPECT_TRUE(protocol.CanAddToDatagram(empties, 2, &empty));
+    EXPECT_FALSE(protocol.CanAddToDatagram(empties, 2, &two_));
+    EXPECT_FALSE(protocol.CanAddToDatagram(list_, 2, &empty));
+}
+
+TEST_F(ProtocolBaseDatagram, HugeTagsDoNotWrapTheSum) {
+    const TestTag huge("huge", bytesShape(std::numeric_limits<int>::max()));
+    const ITag* huges[] = {&huge, &huge};
+    EXPECT_FALSE(protocol_.CanAddToDatagram(huges, 2, &huge));
+}
+
+TEST_F(ProtocolBaseDatagram, EveryItemOfASuccessfulReadIsDone) {
+    idal_error_t status[3] = {-8, -8, -8};
+    EXPECT_NE(protocol_.ReadDatagramWithStatus(list_, 2, data_, status), 0);
+    EXPECT_EQ(status[0], 1);
+    EXPECT_EQ(status[1], 1);
+    EXPECT_EQ(status[2], -8);
+    EXPECT_EQ(protocol_.counts, std::vector<int>{2});
+}
+
+TEST_F(ProtocolBaseDatagram, FailedReadLeavesStatusAndStamps) {
+    protocol_.readResult = 0;
+    idal_error_t status[2] = {-8, -8};
+    unsigned long long stamps[2] = {4711, 4711};
+    EXPECT_EQ(protocol_.ReadDatagramWithStatus(list_, 2, data_, status), 0);
+    EXPECT_EQ(protocol_.readDatagramWithTimestamp(list_, 2, data_, status, stamps), 0);
+    for (int i : {0, 1}) {
+        EXPECT_EQ(status[i], -8);
+        EXPECT_EQ(stamps[i], 4711u);
+    }
+}
+
+TEST_F(ProtocolBaseDatagram, ProtocolWithoutDatagramsLeavesStatusAndStamps) {
+    TestProtocol protocol;
+    idal_error_t status[2] = {-8, -8};
+    unsigned long long stamps[2] = {4711, 4711};
+    EXPECT_EQ(protocol.ReadDatagramWithStatus(list_, 2, data_, status), 0);
+    EXPECT_EQ(protocol.readDatagramWithTimestamp(list_, 2, data_, status, stamps), 0);
+    EXPECT_EQ(status[0], -8);
+    EXPECT_EQ(stamps[0], 4711u);
+}
+
+TEST_F(ProtocolBaseDatagram, AllItemsCarryOneStamp) {
+    idal_error_t status[2] = {-8, -8};
+    unsigned long long stamps[3] = {4711, 4712, 4713};
+    const unsigned long long before = currentTimeStamp();
+    EXPECT_EQ(protocol_.readDatagramWithTimestamp(list_, 2, data_, status, stamps), 1);
+    EXPECT_LE(before, stamps[0]);
+    EXPECT_LE(stamps[0], currentTimeStamp());
+    EXPECT_EQ(stamps[1], stamps[0]);
+    EXPECT_EQ(stamps[2], 4713u);
+    EXPECT_EQ(status[0], 1);
+    EXPECT_EQ(status[1], 1);
+}
+
+TEST_F(ProtocolBaseDatagram, NoItemsStoreNothing) {
+    for (int count : {0, -1}) {
+        idal_error_t status[1] = {-8};
+        unsigned long long stamps[1] = {4711};
+        EXPECT_EQ(protocol_.readDatagramWithTimestamp(list_, count, data_, status, stamps), 1);
+        EXPECT_EQ(status[0], -8) << count;
+        EXPECT_EQ(stamps[0], 4711u) << count;
+    }
+}
+
+TEST_F(ProtocolBaseDatagram, DriversOwnStatusesAreStampedAsTheyAre) {
+    class OwnStatus : public TestProtocol {
+      public:
+        int ReadDatagramWithStatus(const ITag* const*, int, unsigned char*,
+                                   idal_error_t* status) override {
+            status[0] = 1;
+            status[1] = -6;
+            return 1;
+        }
+    };
+    OwnStatus protocol;
+    idal_error_t status[2] = {-8, -8};
+    unsigned long long stamps[2] = {4711, 4711};
+    EXPECT_EQ(protocol.readDatagramWithTimestamp(list_, 2, data_, status, stamps), 1);
+    EXPECT_EQ(status[0], 1);
+    EXPECT_EQ(status[1], -6);
+    EXPECT_NE(stamps[0], 4711u);
+    EXPECT_EQ(stamps[1], stamps[0]);
+}
+
+}  // namespace

@@ -1,0 +1,141 @@
+// The description of a protocol object.
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "framework/HostServicePointers.h"
+#include "tests/unit/framework/GuardedText.h"
+#include "tests/unit/framework/TestProtocol.h"
+
+namespace {
+
+class NamedService final : public IInterface {
+  public:
+    NamedService(const char* name, int version) : name_(name), version_(version) {}
+    void* ConvertTo(const char*) override { return nullptr; }
+    const char* GetImpName() const override { return name_; }
+    int GetImpVersion() const override { return version_; }
+
+  private:
+    const char* name_;
+    int version_;
+};
+
+constexpr const char* kIdentityLines =
+    "Protocol: TEST (7) v.12\n"
+    "Implementation: TestProtocol v.34\n"
+    "ProtocolBase v.100\n"
+    "ProtLib v.200\n";
+
+class ProtocolBaseInfo : public testing::Test {
+  protected:
+    ~ProtocolBaseInfo() override {
+        piMultiTask = nullptr;
+        piSerialFactory = nullptr;
+        piSocketFactory = nullptr;
+        piDiag = nullptr;
+    }
+
+    /// The whole text; checks that nothing in front of the buffer or behind it was written.
+    static std::string infoOf(const ProtocolBase& protocol, int size = 1000) {
+        GuardedText text(size);
+        const int written = protocol.GetInfo(text.out(), size);
+        EXPECT_TRUE(text.guardsIntact()) << "size " << size;
+        EXPECT_GE(written, 0);
+        EXPECT_LE(written, std::max(size, 0));
+        return text.content().substr(0, static_cast<std::size_t>(written));
+    }
+
+    NamedService tasks_{"PanelTasks", 2};
+    NamedService serial_{"PanelSerial", 31};
+    NamedService sockets_{"PanelSockets", -4};
+    TestProtocol protocol_;
+};
+
+TEST_F(ProtocolBaseInfo, WithoutServicesItDescribesTheProtocolAlone) {
+    EXPECT_EQ(infoOf(protocol_), kIdentityLines);
+}
+
+TEST_F(ProtocolBaseInfo, PresentServicesFollowInFixedOrder) {
+    piSocketFactory = &sockets_;
+    piMultiTask = &tasks_;
+    piSerialFactory = &serial_;
+    EXPECT_EQ(infoOf(protocol_), std::string(kIdentityLines) +
+                                     "PanelTasks v.2\nPanelSerial v.31\nPanelSockets v.-4\n");
+}
+
+TEST_F(ProtocolBaseInfo, MissingServiceIsPassedOver) {
+    piMultiTask = &tasks_;
+    piSocketFactory = &sockets_;
+    EXPECT_EQ(infoOf(protocol_),
+              std::string(kIdentityLines) + "PanelTasks v.2\nPanelSockets v.-4\n");
+}
+
+TEST_F(ProtocolBaseInfo, OtherServicesAreNotNamed) {
+    piDiag = &tasks_;
+    EXPECT_EQ(infoOf(protocol_), kIdentityLines);
+}
+
+TEST_F(ProtocolBaseInfo, ConvertedProtocolKeepsQuietAboutServices) {
+    class Converted : public TestProtocol {
+        bool IsConverted() const override { return true; }
+    };
+    piMultiTask = &tasks_;
+    EXPECT_EQ(infoOf(Converted()), kIdentityLines);
+}
+
+TEST_F(ProtocolBaseInfo, EverySizeCutsTheTextWithoutATerminator) {
+    piMultiTask = &tasks_;
+    const std::string whole = infoOf(protocol_);
+    for (int size = -2; size <= static_cast<int>(whole.size()) + 2; ++size) {
+        GuardedText text(size);
+        const int written = protocol_.GetInfo(text.out(), size);
+        const auto room = static_cast<std::size_t>(std::max(size, 0));
+        const std::string expected = whole.substr(0, room);
+        EXPECT_EQ(written, static_cast<int>(expected.size())) << "size " << size;
+        EXPECT_EQ(text.content(),
+                  expected + std::string(room - expected.size(), GuardedText::kFill))
+            << "size " << size;
+        EXPECT_TRUE(text.guardsIntact()) << "size " << size;
+    }
+}
+
+TEST_F(ProtocolBaseInfo, TenByteBufferGivesTenBytesAndNoZero) {
+    EXPECT_EQ(infoOf(protocol_, 10), "Protocol: ");
+}
+
+TEST_F(ProtocolBaseInfo, NoBufferIsNeededForNoBytes) {
+    EXPECT_EQ(protocol_.GetInfo(nullptr, 0), 0);
+    EXPECT_EQ(protocol_.GetInfo(nullptr, -5), 0);
+}
+
+TEST_F(ProtocolBaseInfo, NullProtocolNameSuppressesEverythingBehindIt) {
+    piMultiTask = &tasks_;
+    protocol_.name = nullptr;
+    EXPECT_EQ(infoOf(protocol_), "Protocol: ");
+}
+
+TEST_F(ProtocolBaseInfo, NullImplementationNameSuppressesEverythingBehindIt) {
+    piMultiTask = &tasks_;
+    protocol_.implementation = nullptr;
+    EXPECT_EQ(infoOf(protocol_), "Protocol: TEST (7) v.12\nImplementation: ");
+}
+
+TEST_F(ProtocolBaseInfo, NullServiceNameSuppressesTheServicesBehindIt) {
+    NamedService nameless(nullptr, 5);
+    piMultiTask = &tasks_;
+    piSerialFactory = &nameless;
+    piSocketFactory = &sockets_;
+    EXPECT_EQ(infoOf(protocol_), std::string(kIdentityLines) + "PanelTasks v.2\n");
+}
+
+TEST_F(ProtocolBaseInfo, WidestNumbersAreWrittenWhole) {
+    NamedService low("Low", -2147483647 - 1);
+    NamedService high("High", 2147483647);
+    piMultiTask = &low;
+    piSerialFactory = &high;
+    EXPECT_EQ(infoOf(protocol_),
+              std::string(kIdentityLines) + "Low v.-2147483648\nHigh v.2147483647\n");
+}
+
+}  // namespace

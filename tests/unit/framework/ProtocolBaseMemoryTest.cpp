@@ -1,0 +1,251 @@
+// What happens when there is no memory: an error, nothing lost, nothing thrown.
+//
+// This program replaces the global operator new by one that refuses when told.
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <limits>
+#include <memory>
+#include <new>
+#include <string>
+#include <vector>
+
+#include "tests/unit/framework/GuardedText.h"
+#include "tests/unit/framework/TestProtocol.h"
+
+namespace {
+
+constexpr int kNever = std::numeric_limits<int>::max();
+
+// Requests that are still granted.
+thread_local int granted = kNever;
+
+void* take(std::size_t size) {
+    if (granted <= 0) return nullptr;
+    if (granted != kNever) --granted;
+    return std::malloc(size == 0 ? 1 : size);
+}
+
+// Not inlined: the compiler would see a free() of what came from operator new, and object.
+[[gnu::noinline]] void give(void* memory) {
+    std::free(memory);
+}
+
+/// While it lives only `requests` more requests for memory are granted.
+class Shortage {
+  public:
+    explicit Shortage(int requests = 0) { granted = requests; }
+    ~Shortage() { granted = kNever; }
+    Shortage(const Shortage&) = delete;
+    Shortage& operator=(const Shortage&) = delete;
+};
+
+}  // namespace
+
+void* operator new(std::size_t size) {
+    if (void* memory = take(size)) return memory;
+    throw std::bad_alloc();
+}
+void* operator new[](std::size_t size) {
+    return operator new(size);
+}
+void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+    return take(size);
+}
+void* operator new[](std::size_t size, const std::nothrow_t&) noexcept {
+    return take(size);
+}
+void operator delete(void* memory) noexcept {
+    give(memory);
+}
+void operator delete[](void* memory) noexcept {
+    give(memory);
+}
+void operator delete(void* memory, std::size_t) noexcept {
+    give(memory);
+}
+void operator delete[](void* memory, std::size_t) noexcept {
+    give(memory);
+}
+
+namespace {
+
+/// Notes nothing, so that it needs no memory itself.
+class FrugalProtocol : public TestProtocol {
+  public:
+    int ReadBlock(const ITag*, unsigned char* data, int length) override {
+        ++transfers;
+        answer(data, length);
+        return 1;
+    }
+    int Write(const ITag*, const unsigned char*) override {
+        ++transfers;
+        return 1;
+    }
+    ITag* CreateTagBase(const char*) override {
+        ITag* tag = ready;
+        ready = nullptr;
+        return tag;
+    }
+    ITag* ready = nullptr;
+    int transfers = 0;
+};
+
+class ProtocolBaseMemory : public testing::Test {
+  protected:
+    void expectOutOfMemory() const {
+        EXPECT_EQ(protocol_.GetLastError(), -1);
+        EXPECT_STREQ(protocol_.GetLastErrorString(), "Out of memory");
+    }
+
+    FrugalProtocol protocol_;
+    std::vector<unsigned char> value_ = std::vector<unsigned char>(300, 0xEE);
+};
+
+TEST_F(ProtocolBaseMemory, LongTagIsNotReadWithoutMemory) {
+    const TestTag tag("1", bytesShape(65));
+    int ok = 1;
+    {
+        const Shortage shortage;
+        ok = protocol_.Read(&tag, value_.data());
+    }
+    EXPECT_EQ(ok, 0);
+    expectOutOfMemory();
+    EXPECT_EQ(protocol_.transfers, 0);
+    EXPECT_EQ(value_[0], 0xEE);
+}
+
+TEST_F(ProtocolBaseMemory, ShortTagNeedsNoMemory) {
+    const TestTag tag("1", bytesShape(64));
+    protocol_.device = {1};
+    int ok = 0;
+    {
+        const Shortage shortage;
+        ok = protocol_.Read(&tag, value_.data());
+    }
+    EXPECT_EQ(ok, 1);
+    EXPECT_EQ(value_[0], 1);
+    EXPECT_EQ(value_[63], 0);
+}
+
+TEST_F(ProtocolBaseMemory, LongArrayIsNeitherReadNorWrittenWithoutMemory) {
+    const TestTag tag("1", bytesShape(257));
+    int read = 1;
+    int written = 1;
+    {
+        const Shortage shortage;
+        read = protocol_.readArrayItem(&tag, 0, value_.data());
+        written = protocol_.writeArrayItem(&tag, 0, value_.data());
+    }
+    EXPECT_EQ(read, 0);
+    EXPECT_EQ(written, 0);
+    expectOutOfMemory();
+    EXPECT_EQ(protocol_.transfers, 0);
+}
+
+TEST_F(ProtocolBaseMemory, TagThatCannotBeListedIsDestroyed) {
+    int destroyed = 0;
+    protocol_.ready = new TestTag("1", bytesShape(1), &destroyed);
+    const ITag* tag = protocol_.ready;
+    {
+        const Shortage shortage;
+        tag = protocol_.CreateTag("1");
+    }
+    EXPECT_EQ(tag, nullptr);
+    EXPECT_EQ(destroyed, 1);
+    expectOutOfMemory();
+}
+
+TEST_F(ProtocolBaseMemory, CommonErrorTextsNeedNoMemory) {
+    const std::string text(256, 'x');
+    {
+        const Shortage shortage;
+        protocol_.SetError(-6, text.c_str());
+    }
+    EXPECT_EQ(protocol_.GetLastErrorString(), text);
+}
+
+TEST_F(ProtocolBaseMemory, LongErrorTextIsCutWithoutMemory) {
+    const std::string text(5000, 'x');
+    {
+        const Shortage shortage;
+        protocol_.SetError(-6, text.c_str());
+    }
+    EXPECT_EQ(protocol_.GetLastError(), -6);
+    const std::string kept = protocol_.GetLastErrorString();
+    EXPECT_GE(kept.size(), 256u);
+    EXPECT_EQ(kept, text.substr(0, kept.size()));
+}
+
+TEST_F(ProtocolBaseMemory, IdentStaysWithoutMemory) {
+    protocol_.SetIdent("line");
+    const std::string ident(100, 'i');
+    {
+        const Shortage shortage;
+        protocol_.SetIdent(ident.c_str());
+    }
+    EXPECT_STREQ(protocol_.GetIdent(), "line");
+    expectOutOfMemory();
+}
+
+TEST_F(ProtocolBaseMemory, TagErrorIsReplacedByTheShortage) {
+    const TestTag tag("a URI that is longer than a short string", bytesShape(1));
+    {
+        const Shortage shortage;
+        protocol_.SetTagError(&tag);
+    }
+    expectOutOfMemory();
+}
+
+/// What became of one command.
+struct Outcome {
+    int result = 0;
+    bool ranShort = false;
+};
+
+/// Runs a command while only `requests` requests for memory are granted. Whatever happens, the
+/// buffer's surroundings stay, a shortage is told in words and the command's tag is gone.
+Outcome runShort(const std::string& command, int requests) {
+    int destroyed = 0;
+    FrugalProtocol protocol;
+    auto tag = std::make_unique<TestTag>("1", bytesShape(65), &destroyed);
+    protocol.ready = tag.get();
+    GuardedText answer(200);
+    Outcome outcome;
+    {
+        const Shortage shortage(requests);
+        outcome.result = protocol.DoCommand(command.c_str(), answer.out(), 200);
+    }
+    const bool tagWasTaken = protocol.ready == nullptr;
+    if (tagWasTaken) static_cast<void>(tag.release());
+    EXPECT_EQ(destroyed, tagWasTaken ? 1 : 0);
+
+    outcome.ranShort = protocol.GetLastError() == -1;
+    EXPECT_STREQ(protocol.GetLastErrorString(), outcome.ranShort ? "Out of memory" : "");
+    EXPECT_TRUE(answer.guardsIntact());
+    if (outcome.result == 0) {
+        EXPECT_TRUE(answer.untouched());
+    } else if (outcome.ranShort) {
+        EXPECT_EQ(answer.text(), "Out of memory");
+    }
+    return outcome;
+}
+
+TEST(ConsoleMemory, EveryShortageIsToldAndLeavesNothingBehind) {
+    const std::string uri = "a-uri-that-is-longer-than-a-short-string";
+    for (const std::string& command : {"read " + uri, "write " + uri + " " + std::string(130, '0'),
+                                       std::string("getmaxtm"), std::string("help")}) {
+        int refusals = 0;
+        Outcome last;
+        for (int requests = 0; requests < 40; ++requests) {
+            SCOPED_TRACE(command + ", requests granted: " + std::to_string(requests));
+            last = runShort(command, requests);
+            EXPECT_TRUE(last.ranShort || last.result == 1);
+            if (last.ranShort) ++refusals;
+        }
+        EXPECT_GT(refusals, 0) << command;
+        EXPECT_FALSE(last.ranShort) << command << " needs more requests than were tried";
+    }
+}
+
+}  // namespace
