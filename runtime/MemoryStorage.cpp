@@ -117,7 +117,7 @@ int MemoryStorage::keyCount(const char* section) {
 const char* MemoryStorage::keyName(const char* section, int index) {
     std::string name;
     findName(section, index, name);
-    return keptForThread(std::move(name));
+    return keptForThread(name);
 }
 
 int MemoryStorage::readStringInto(const char* section, const char* key, char* buffer, int size) {

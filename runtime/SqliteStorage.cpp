@@ -162,7 +162,7 @@ int SqliteStorage::keyCount(const char* section) {
 const char* SqliteStorage::keyName(const char* section, int index) {
     std::string name;
     findName(section, index, name);
-    return keptForThread(std::move(name));
+    return keptForThread(name);
 }
 
 int SqliteStorage::readStringInto(const char* section, const char* key, char* buffer, int size) {

@@ -1,14 +1,14 @@
 #include "runtime/Storage.h"
 
 #include <cstring>
-#include <utility>
+#include <vector>
 
 namespace runtime {
 
-const char* Storage::keptForThread(std::string text) {
-    thread_local std::string kept;
-    kept = std::move(text);
-    return kept.c_str();
+const char* Storage::keptForThread(const std::string& text) {
+    thread_local std::vector<char> kept;
+    kept.assign(text.c_str(), text.c_str() + text.size() + 1);
+    return kept.data();
 }
 
 int Storage::copyInto(const std::string& text, char* buffer, int size) {

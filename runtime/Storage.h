@@ -34,7 +34,7 @@ class Storage : public IPermanentStorage2 {
 
   protected:
     /// Keeps a text until the calling thread's next call of this.
-    static const char* keptForThread(std::string text);
+    static const char* keptForThread(const std::string& text);
     /// Copies a text with its terminating zero. @return 1, or 0 with `buffer` untouched when it
     /// does not fit.
     static int copyInto(const std::string& text, char* buffer, int size);
