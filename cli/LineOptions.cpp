@@ -12,7 +12,7 @@
 namespace cli {
 namespace {
 
-constexpr std::size_t kConfigLimit = 1024 * 1024;
+constexpr std::size_t kConfigLimit = std::size_t{1024} * 1024;
 
 [[noreturn]] void refuseConfig(const std::string& file, const std::string& why) {
     throw CommandError(ExitCode::Usage, fmt::format("configuration {}: {}", file, why));

@@ -92,7 +92,7 @@ void addFaults(sim::Simulator& simulator, const std::vector<std::string>& faults
     for (const std::string& text : faults) {
         std::string error;
         const auto fault = sim::parseFault(text, error);
-        if (!fault) throw CommandError(ExitCode::Usage, "--fault " + text + ": " + error);
+        if (!fault) throw CommandError(ExitCode::Usage, fmt::format("--fault {}: {}", text, error));
         simulator.faults().add(*fault);
     }
 }

@@ -40,6 +40,7 @@ std::vector<sim::NodeOptions> simNodesFor(std::string_view configText) {
         if (address >= 1 && address <= kHighestNode) addresses.insert(address);
     }
     std::vector<sim::NodeOptions> nodes;
+    nodes.reserve(addresses.size());
     for (const int address : addresses) {
         nodes.push_back(node(address, hasLongs(modelOf(configText, address))));
     }
