@@ -214,7 +214,6 @@ struct FaultCase {
 };
 
 TEST_F(SimLibmodbusTest, FaultsAreNoticedAndTheNextRequestSucceeds) {
-    ASSERT_EQ(modbus_set_response_timeout(client.get(), 0, 300000), 0);
     for (const FaultCase& each : {
              FaultCase{"silent", {.silent = true}, ETIMEDOUT},
              FaultCase{"wrong CRC", {.wrongCheck = true}, EMBBADCRC},
@@ -222,14 +221,16 @@ TEST_F(SimLibmodbusTest, FaultsAreNoticedAndTheNextRequestSucceeds) {
              FaultCase{"truncated", {.keep = 4}, ETIMEDOUT},
              FaultCase{"busy", {.exception = 6}, EMBXSBUSY},
          }) {
+        // Short only where the time has to run out: a busy computer must not change the verdict.
+        const std::uint32_t seconds = each.error == ETIMEDOUT ? 1 : 10;
+        ASSERT_EQ(modbus_set_response_timeout(client.get(), seconds, 0), 0);
         simulator.faults().add(each.fault);
         std::uint16_t word = 0;
         EXPECT_EQ(modbus_read_registers(client.get(), 0, 1, &word), -1) << each.what;
         EXPECT_EQ(errno, each.error) << each.what << ": " << modbus_strerror(errno);
         modbus_flush(client.get());
-        ASSERT_EQ(modbus_set_response_timeout(client.get(), 5, 0), 0);
+        ASSERT_EQ(modbus_set_response_timeout(client.get(), 10, 0), 0);
         EXPECT_EQ(modbus_read_registers(client.get(), 0, 1, &word), 1) << each.what;
-        ASSERT_EQ(modbus_set_response_timeout(client.get(), 0, 300000), 0);
     }
 }
 
