@@ -116,7 +116,8 @@ TEST_F(ReplacerRestoreDetail, TextTooLongForTheBufferIsEmpty) {
     EXPECT_EQ(replacer_.replacements(), (Pairs{{6, 0}, {7, 9}}));
 }
 
-/// A storage that offers its copying reads only some of the time.
+/// A storage that offers its copying reads with every other query only. A copy that fails leaves
+/// the text that fits behind.
 class MoodyStorage final : public testing_support::StorageOperations<IPermanentStorage2> {
   public:
     using StorageOperations::StorageOperations;
@@ -153,6 +154,16 @@ TEST_F(ReplacerRestoreDetail, ExtensionIsAskedForWithEveryKey) {
     EXPECT_EQ(moody.copiedKeys, 2);
     EXPECT_EQ(moody.count("keyName"), 2);
     EXPECT_EQ(moody.count("readString"), 2);
+}
+
+TEST_F(ReplacerRestoreDetail, CutTextOfAFailedCopyIsNotUsed) {
+    MoodyStorage moody(contents_);
+    piPermanentStorage = &moody;
+    contents_.put("MRTU", "tempNode1", std::string("9"));
+    contents_.put("MRTU", "tempNode2", "9" + std::string(300, ' '));
+    replacer_.restore("MRTU");
+    EXPECT_EQ(moody.copiedKeys, 1);
+    EXPECT_EQ(replacer_.replacements(), (Pairs{{1, 9}, {2, 0}}));
 }
 
 /// Answers null where a text is due.
