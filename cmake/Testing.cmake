@@ -1,5 +1,10 @@
-# mrtu_test(NAME SOURCES file... [LIBS target...])
+# mrtu_test(NAME [DESKTOP] SOURCES file... [LIBS target...])
 # One GoogleTest program, each of its tests a test of CTest.
+#
+# Every test has one of two labels. `portable` tests run on every architecture; `desktop` tests need
+# libraries or programs that a cross compiler does not bring, and are left out without MRTU_TOOLS.
+# A folder of desktop tests sets MRTU_TEST_LABEL instead of marking each program.
+set(MRTU_TEST_LABEL portable)
 
 if(MRTU_TESTS)
   # The library is built from Debian's source package: with the flags, the sanitizers and the
@@ -14,8 +19,15 @@ if(MRTU_TESTS)
 endif()
 
 function(mrtu_test name)
-  cmake_parse_arguments(PARSE_ARGV 1 arg "" "" "SOURCES;LIBS")
+  cmake_parse_arguments(PARSE_ARGV 1 arg "DESKTOP" "" "SOURCES;LIBS")
+  set(label ${MRTU_TEST_LABEL})
+  if(arg_DESKTOP)
+    set(label desktop)
+  endif()
+  if(label STREQUAL "desktop" AND NOT MRTU_TOOLS)
+    return()
+  endif()
   add_executable(${name} ${arg_SOURCES})
   target_link_libraries(${name} PRIVATE mrtu_flags ${arg_LIBS} GTest::gmock_main)
-  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST PROPERTIES TIMEOUT 300)
+  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST PROPERTIES TIMEOUT 300 LABELS ${label})
 endfunction()
