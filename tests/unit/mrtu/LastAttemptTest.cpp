@@ -112,6 +112,25 @@ TEST_F(LastAttemptTest, FourByteFrameIsNeverAcceptedEvenWithAGoodCrc) {
     expectError(-6, "The received message too short");
 }
 
+/// The rest of the frame arrived, but the port says that reading it failed: nothing of it counts.
+TEST_F(LastAttemptTest, FailedReceptionIsNoFrame) {
+    start("repeat=0");
+    port.failFrame(kGood);
+    EXPECT_FALSE(readOne());
+    expectError(-6, "Incorrect response checksum");
+    port.failFrame(firstOf(kGood, 3));
+    EXPECT_FALSE(readOne());
+    expectError(-6, "The received message too short");
+}
+
+TEST_F(LastAttemptTest, FailedReceptionIsRetried) {
+    start("repeat=1");
+    port.failFrame(kGood);
+    port.reply(kGood);
+    EXPECT_TRUE(readOne());
+    EXPECT_EQ(2U, port.sent().size());
+}
+
 TEST_F(LastAttemptTest, AsciiCountsCharacters) {
     start("txMode=ASCII repeat=0");
     for (const char* text : {":", ":01", ":010"}) {

@@ -153,6 +153,13 @@ TEST_F(WritePathTest, LongAcknowledgeMayEchoAllFourBytes) {
     EXPECT_NE(0, write(tag("1?LONG?5?int"), hex("44 33 22 11"), 1));
 }
 
+TEST_F(WritePathTest, ReadOnlyAreasNeverReachTheLine) {
+    start("repeat=0");
+    EXPECT_EQ(0, write(tag("1?IREG?300001?short"), hex("34 12"), 1));
+    EXPECT_EQ(0, write(tag("1?INP?100001?boolean"), hex("01"), 1));
+    EXPECT_TRUE(port.sent().empty());
+}
+
 TEST_F(WritePathTest, LargestBlocks) {
     start();
     acknowledgeAll();
