@@ -146,7 +146,7 @@ TEST_F(ProtocolBaseMemory, LongArrayIsNeitherReadNorWrittenWithoutMemory) {
 TEST_F(ProtocolBaseMemory, TagThatCannotBeListedIsDestroyed) {
     int destroyed = 0;
     protocol_.ready = new TestTag("1", bytesShape(1), &destroyed);
-    const ITag* tag = protocol_.ready;
+    const ITag* tag = nullptr;
     {
         const Shortage shortage;
         tag = protocol_.CreateTag("1");
