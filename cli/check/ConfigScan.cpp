@@ -17,7 +17,7 @@ void splitNodePrefix(ScannedItem& item) {
     item.key = item.name.substr(colons + 2);
 }
 
-ScannedItem itemOf(std::string_view word, Place place) {
+ScannedItem itemOf(std::string_view word, const Place& place) {
     ScannedItem item{};
     // An "=" that stands alone, or in front, names nothing.
     const std::size_t equals = word.find('=') == 0 ? std::string_view::npos : word.find('=');

@@ -57,6 +57,7 @@ Verdict unknownType(const TagLine& tag) {
     const std::string name = dataTypeText(tag.dataType()).name;
     if (typeNamed(name) != nullptr) return std::nullopt;
     std::vector<std::string> names;
+    names.reserve(kValueTypes.size());
     for (const ValueType& row : kValueTypes)
         names.emplace_back(row.name);
     const std::string nearest = nearestName(name, names);

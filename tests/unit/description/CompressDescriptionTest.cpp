@@ -63,15 +63,16 @@ std::string zlibStream(const std::string& text) {
 }
 
 TEST_F(CompressDescription, FramesAnyDocumentWithItsOwnLength) {
-    const std::string zero(1, '\0');
     for (const std::string& text : {std::string("<a/>"), std::string(40000, 'x')}) {
         store(text);
         ASSERT_EQ(run(output()), 0);
         const std::string stream = zlibStream(text);
-        EXPECT_EQ(block(),
-                  "<<ICOM_XML_START>>Name=MRTU?FullName=Modbus RTU?Version=126?Platform=KV58_LIN" +
-                      zero + "compressedXML=" + std::to_string(stream.size()) + zero + stream +
-                      "<<ICOM_XML_END>>" + zero);
+        std::string expected =
+            "<<ICOM_XML_START>>Name=MRTU?FullName=Modbus RTU?Version=126?Platform=KV58_LIN";
+        expected.append(1, '\0');
+        expected.append("compressedXML=").append(std::to_string(stream.size())).append(1, '\0');
+        expected.append(stream).append("<<ICOM_XML_END>>").append(1, '\0');
+        EXPECT_EQ(block(), expected);
     }
 }
 

@@ -63,7 +63,7 @@ std::vector<pugi::xml_node> configurable() {
 std::string configuration(const Items& items) {
     std::string text = "CfgVer=1";
     for (const auto& [key, value] : items)
-        text += " " + key + "=" + value;
+        text.append(" ").append(key).append("=").append(value);
     return text;
 }
 

@@ -28,6 +28,7 @@ TEST(DescriptionConversions, SectionHasItsDisplayText) {
 
 TEST(DescriptionConversions, NamesStandInOrder) {
     std::vector<std::string> names;
+    names.reserve(conversions.size());
     for (const Conversion& conversion : conversions)
         names.push_back(conversion.name);
     EXPECT_EQ(childTexts(root().child("conversions")), names);

@@ -84,6 +84,7 @@ TEST_F(DescriptionAndDriver, AgreeOnNamesAndNumbers) {
 
 TEST_F(DescriptionAndDriver, AgreeOnTheFieldsOfATagUri) {
     std::vector<std::string> names;
+    names.reserve(4);
     for (int i = 0; i < protocol7().getTagUriFieldCount(); ++i) {
         names.emplace_back(protocol7().getTagUriFieldName(i));
     }

@@ -66,6 +66,7 @@ Attributes expectedAttributes(const Area& area) {
 
 TEST(DescriptionMemoryTypes, NamesStandInOrder) {
     std::vector<std::string> names;
+    names.reserve(areas.size());
     for (const Area& area : areas)
         names.push_back(area.name);
     EXPECT_EQ(childTexts(root().child("memtypes")), names);

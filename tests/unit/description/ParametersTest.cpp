@@ -80,6 +80,7 @@ Attributes expectedAttributes(const Parameter& row) {
 
 TEST(DescriptionParameters, KeysStandInOrder) {
     std::vector<std::string> keys;
+    keys.reserve(parameters.size());
     for (const Parameter& row : parameters)
         keys.push_back(row.key);
     EXPECT_EQ(childTexts(root().child("parameters")), keys);

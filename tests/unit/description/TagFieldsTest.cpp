@@ -24,6 +24,7 @@ const std::vector<Field> fields{
 
 TEST(DescriptionTagFields, FieldsStandInTheOrderOfTheAddress) {
     std::vector<std::string> names;
+    names.reserve(fields.size());
     for (const Field& field : fields)
         names.push_back(field.name);
     EXPECT_EQ(childTexts(root().child("tag_uri")), names);

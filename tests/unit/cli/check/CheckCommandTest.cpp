@@ -44,6 +44,7 @@ class CheckCommand : public testing::Test {
         const std::string file = store("line.cfg", config);
         words.insert(words.begin(), {"mrtu", "check", "--config", file, "--plugin", PLUGIN});
         std::vector<const char*> argv;
+        argv.reserve(words.size());
         for (const std::string& word : words)
             argv.push_back(word.c_str());
         std::ostringstream out;

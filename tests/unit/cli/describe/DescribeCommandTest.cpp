@@ -22,6 +22,7 @@ Outcome describe(std::vector<std::string> words) {
     words.insert(words.begin(), {"mrtu", "describe"});
     words.insert(words.end(), {"--plugin", PLUGIN});
     std::vector<const char*> argv;
+    argv.reserve(words.size());
     for (const std::string& word : words)
         argv.push_back(word.c_str());
     std::ostringstream out;
