@@ -7,8 +7,7 @@ namespace runtime {
 
 /// The default place: "$XDG_STATE_HOME/mrtu/overrides.db", else
 /// "$HOME/.local/state/mrtu/overrides.db". A variable that is unset, empty or not an absolute path
-/// does not count. Empty when neither does.
-/// Source: XDG Base Directory Specification 0.8.
+/// does not count. Empty when neither does. The places are those of the XDG base directories, 0.8.
 std::string defaultStoragePath();
 /// The same from given values; null for an unset variable.
 std::string storagePathFrom(const char* xdgStateHome, const char* home);
