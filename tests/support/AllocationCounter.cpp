@@ -14,6 +14,12 @@ void* take(std::size_t size) {
     throw std::bad_alloc();
 }
 
+// The sanitizers' own forms would take what the operators below do not give back.
+void* takeOrNull(std::size_t size) {
+    ++allocated;
+    return std::malloc(size == 0 ? 1 : size);
+}
+
 void* takeAligned(std::size_t size, std::align_val_t alignment) {
     ++allocated;
     const auto step = static_cast<std::size_t>(alignment);
@@ -33,6 +39,12 @@ void* operator new(std::size_t size) {
 }
 void* operator new[](std::size_t size) {
     return take(size);
+}
+void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+    return takeOrNull(size);
+}
+void* operator new[](std::size_t size, const std::nothrow_t&) noexcept {
+    return takeOrNull(size);
 }
 void* operator new(std::size_t size, std::align_val_t alignment) {
     return takeAligned(size, alignment);
