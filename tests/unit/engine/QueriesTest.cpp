@@ -96,6 +96,10 @@ TEST_F(Queries, BitLimitFollowsTheItemLimit) {
     EXPECT_EQ(driver_.getMaxBitCount(coil, true), 1968);
 }
 
+TEST_F(Queries, ItemsOfArraysAreNotAddressedUnlessTheDriverSaysSo) {
+    EXPECT_EQ(driver_.ProtgenProtocol::arrayItemByTag(), 0);
+}
+
 TEST_F(Queries, DatagramLimitsComeFromTheModel) {
     EXPECT_EQ(driver_.MaxDatagramItems(tag("1?REG?0?short")), 3);
     EXPECT_EQ(driver_.MaxDatagramLength(tag("1?REG?0?short")), 10);
