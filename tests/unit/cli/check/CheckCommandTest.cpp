@@ -4,6 +4,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <iterator>
 #include <sstream>
 #include <vector>
 
@@ -143,6 +144,31 @@ TEST_F(CheckCommand, TagsMayComeFromAFile) {
     EXPECT_NE(outcome.out.find("tags:4:8: warning: overlaps '1?HREG?400001?short'"),
               std::string::npos)
         << outcome.out;
+}
+
+std::string contentsOf(const std::string& path) {
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+/// The text as Markdown shows it verbatim, without the folder that the test runs in.
+std::string asShown(std::string text, const std::string& folder) {
+    for (auto at = text.find(folder); at != std::string::npos; at = text.find(folder)) {
+        text.erase(at, folder.size());
+    }
+    std::istringstream lines(text);
+    std::string shown;
+    for (std::string line; std::getline(lines, line);)
+        shown.append("    ").append(line) += '\n';
+    return shown;
+}
+
+TEST_F(CheckCommand, DocumentationShowsTheRealOutput) {
+    const std::string folder = SOURCE_FOLDER "/examples/check/";
+    const std::string copy = store("tags.txt", contentsOf(folder + "tags.txt"));
+    const Outcome outcome = check(contentsOf(folder + "line.cfg"), {"--tags", copy});
+    const std::string shown = asShown(outcome.out, fs::path(copy).parent_path().string() + "/");
+    EXPECT_NE(contentsOf(SOURCE_FOLDER "/docs/check.md").find(shown), std::string::npos) << shown;
 }
 
 TEST_F(CheckCommand, JsonCountsWhatItLists) {

@@ -31,9 +31,31 @@ Outcome describe(std::vector<std::string> words) {
     return {code, out.str(), err.str()};
 }
 
+std::string contentsOf(const std::string& path) {
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+/// The text as Markdown shows it verbatim.
+std::string asShown(const std::string& text) {
+    std::istringstream lines(text);
+    std::string shown;
+    for (std::string line; std::getline(lines, line);)
+        shown.append("    ").append(line) += '\n';
+    return shown;
+}
+
+TEST(DescribeCommand, DocumentationShowsTheRealOutput) {
+    const std::string page = contentsOf(SOURCE_FOLDER "/docs/description.md");
+    for (const char* section : {"parameters", "memory", "conversions"}) {
+        const std::string shown = asShown(describe({section}).out);
+        EXPECT_GT(shown.size(), 100U) << section;
+        EXPECT_NE(page.find(shown), std::string::npos) << shown;
+    }
+}
+
 TEST(DescribeCommand, XmlIsTheDocumentByteForByte) {
-    std::ifstream file(DOCUMENT, std::ios::binary);
-    const std::string document{std::istreambuf_iterator<char>(file), {}};
+    const std::string document = contentsOf(SOURCE_FOLDER "/description/mrtu.xml");
     ASSERT_FALSE(document.empty());
     const Outcome outcome = describe({"--xml"});
     EXPECT_EQ(outcome.code, 0);
