@@ -1,0 +1,106 @@
+// The command and the driver against slaves that other people wrote, in both modes.
+#include <gtest/gtest.h>
+
+#include <memory>
+
+#include "OtherSlaves.h"
+#include "RunProgram.h"
+
+namespace {
+
+constexpr int kNode = 3;
+
+struct Peer {
+    const char* name;
+    const char* mode;
+    std::unique_ptr<peers::OtherSlave> (*make)();
+};
+
+void PrintTo(const Peer& peer, std::ostream* out) {
+    *out << peer.name;
+}
+
+const Peer kPeers[] = {
+    {"libmodbusRtu", "RTU",
+     []() -> std::unique_ptr<peers::OtherSlave> {
+         return std::make_unique<peers::LibmodbusSlave>(kNode);
+     }},
+    {"pymodbusRtu", "RTU",
+     []() -> std::unique_ptr<peers::OtherSlave> {
+         return std::make_unique<peers::PymodbusSlave>("rtu", kNode);
+     }},
+    {"pymodbusAscii", "ASCII",
+     []() -> std::unique_ptr<peers::OtherSlave> {
+         return std::make_unique<peers::PymodbusSlave>("ascii", kNode);
+     }},
+};
+
+class OtherSlavesTest : public testing::TestWithParam<Peer> {
+  protected:
+    /// Runs `mrtu` on the slave's line; `more` begins with the sub-command.
+    peers::ProgramResult mrtu(const std::vector<std::string>& more) const {
+        // Of an item that is set twice the first counts.
+        std::vector<std::string> words{MRTU_COMMAND};
+        words.insert(words.end(), more.begin(), more.end());
+        for (const std::string& item : {std::string("timeout=10000"), std::string("bits=8"),
+                                        std::string("txMode=") + GetParam().mode})
+            words.insert(words.end(), {"--set", item});
+        words.insert(words.end(), {"--port", slave_->port(), "--storage", "none"});
+        return peers::runProgram(words);
+    }
+
+    std::unique_ptr<peers::OtherSlave> slave_ = GetParam().make();
+};
+
+TEST_P(OtherSlavesTest, EveryAreaHoldsWhatTheSlaveSays) {
+    const auto result = mrtu({"read", "3?OUTP?1?boolean-8", "3?INP?100001?boolean-8",
+                              "3?HREG?400010?unsignedShort-3", "3?IREG?300001?unsignedShort-2",
+                              "3?HREG?400001?unsignedShort-130"});
+    EXPECT_EQ(result.exitCode, 0);
+    std::string block = "3?HREG?400001?unsignedShort-130 = 2000";
+    for (int address = 1; address < 130; ++address)
+        block += "," + std::to_string(2000 + address);
+    EXPECT_EQ(result.output,
+              "3?OUTP?1?boolean-8 = 1,0,0,1,0,0,1,0\n"
+              "3?INP?100001?boolean-8 = 0,1,0,0,0,1,0,0\n"
+              "3?HREG?400010?unsignedShort-3 = 2009,2010,2011\n"
+              "3?IREG?300001?unsignedShort-2 = 50000,50001\n" +
+                  block + "\n");
+}
+
+TEST_P(OtherSlavesTest, EveryWriteFunctionChangesJustItsItems) {
+    // Coils 100, 102, 110 to 113; registers 100, 105 to 107, bit 3 of 110 (2110 is 0x83E).
+    EXPECT_EQ(mrtu({"write", "3?OUTP?111?boolean-4=1,1,0,1", "3?HREG?400106?short-3=-1,0,1",
+                    "3?HREG?400111.3?boolean=0"})
+                  .exitCode,
+              0);
+    EXPECT_EQ(mrtu({"write", "--set", "forceFunction=05", "--set", "presetFunction=06",
+                    "3?OUTP?101?boolean=1", "3?OUTP?103?boolean=0", "3?HREG?400101?short=4711"})
+                  .exitCode,
+              0);
+    const peers::Written written = slave_->end();
+    EXPECT_EQ(written.coils, (std::vector<int>{1, 0, 0, 0, 0, 1, 0, 0, 1, 0,  //
+                                               1, 1, 0, 1, 1, 0, 0, 1, 0, 0}));
+    EXPECT_EQ(written.registers,
+              (std::vector<int>{4711, 2101, 2102, 2103, 2104, 65535, 0,    1,    2108, 2109,
+                                2102, 2111, 2112, 2113, 2114, 2115,  2116, 2117, 2118, 2119}));
+}
+
+TEST_P(OtherSlavesTest, AnAddressThatTheSlaveLacksIsAnException) {
+    const auto result = mrtu({"read", "3?HREG?401001?short"});
+    EXPECT_EQ(result.exitCode, 5);
+    EXPECT_NE(result.output.find("error -6: Exception: Illegal data address"), std::string::npos)
+        << result.output;
+}
+
+TEST_P(OtherSlavesTest, AnotherNodesRequestStaysUnanswered) {
+    const auto result =
+        mrtu({"read", "--set", "timeout=100", "--set", "repeat=0", "9?HREG?400001?short"});
+    EXPECT_EQ(result.exitCode, 4);
+    EXPECT_NE(result.output.find("error -4: No response"), std::string::npos) << result.output;
+}
+
+INSTANTIATE_TEST_SUITE_P(Peers, OtherSlavesTest, testing::ValuesIn(kPeers),
+                         [](const auto& peer) { return std::string(peer.param.name); });
+
+}  // namespace
