@@ -16,6 +16,13 @@ if(MRTU_TESTS)
     message(FATAL_ERROR "GoogleTest's source is missing: apt-get install googletest")
   endif()
   include(GoogleTest)
+
+  # What every test includes, parsed once.
+  file(WRITE "${CMAKE_BINARY_DIR}/test_headers.cpp" "int main() {}\n")
+  add_executable(mrtu_test_headers EXCLUDE_FROM_ALL "${CMAKE_BINARY_DIR}/test_headers.cpp")
+  target_link_libraries(mrtu_test_headers PRIVATE mrtu_flags GTest::gmock)
+  target_precompile_headers(mrtu_test_headers PRIVATE
+    <gmock/gmock.h> <gtest/gtest.h> <algorithm> <array> <map> <string> <vector>)
 endif()
 
 function(mrtu_test name)
@@ -29,5 +36,6 @@ function(mrtu_test name)
   endif()
   add_executable(${name} ${arg_SOURCES})
   target_link_libraries(${name} PRIVATE mrtu_flags ${arg_LIBS} GTest::gmock_main)
+  target_precompile_headers(${name} REUSE_FROM mrtu_test_headers)
   gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST PROPERTIES TIMEOUT 300 LABELS ${label})
 endfunction()
