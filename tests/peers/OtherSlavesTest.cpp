@@ -59,7 +59,7 @@ TEST_P(OtherSlavesTest, EveryAreaHoldsWhatTheSlaveSays) {
     EXPECT_EQ(result.exitCode, 0);
     std::string block = "3?HREG?400001?unsignedShort-130 = 2000";
     for (int address = 1; address < 130; ++address)
-        block += "," + std::to_string(2000 + address);
+        block.append(",").append(std::to_string(2000 + address));
     EXPECT_EQ(result.output,
               "3?OUTP?1?boolean-8 = 1,0,0,1,0,0,1,0\n"
               "3?INP?100001?boolean-8 = 0,1,0,0,0,1,0,0\n"

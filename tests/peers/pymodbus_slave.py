@@ -32,15 +32,17 @@ def memory():
 async def serve(mode, port, node):
     slave = memory()
     context = ModbusServerContext(slaves={node: slave}, single=False)
-    server = asyncio.ensure_future(
-        StartAsyncSerialServer(context, framer=FRAMERS[mode], port=port, baudrate=19200)
+    server = await StartAsyncSerialServer(
+        context, framer=FRAMERS[mode], port=port, baudrate=19200, defer_start=True
     )
+    await server.start()  # The port is open when this returns.
+    serving = asyncio.ensure_future(server.serve_forever())
     print("ready", flush=True)
     await asyncio.get_running_loop().run_in_executor(None, sys.stdin.read)
     print("coils", *(int(bit) for bit in slave.getValues(1, 100, 20)))
     print("registers", *slave.getValues(3, 100, 20))
     sys.stdout.flush()
-    server.cancel()
+    serving.cancel()
 
 
 asyncio.run(serve(sys.argv[1], sys.argv[2], int(sys.argv[3])))
