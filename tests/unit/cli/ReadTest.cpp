@@ -73,7 +73,7 @@ TEST(Read, ArraysLongerThanARequestComeWhole) {
     const Outcome outcome = readWith({"--sim"}, {"1?HREG?400001?unsignedShort-300"});
     std::string expected = "1?HREG?400001?unsignedShort-300 = 1000";
     for (int i = 1; i < 300; ++i)
-        expected += "," + std::to_string(1000 + i);
+        expected.append(",").append(std::to_string(1000 + i));
     EXPECT_EQ(outcome.out, expected + "\n");
     EXPECT_EQ(outcome.exitCode, 0);
 }

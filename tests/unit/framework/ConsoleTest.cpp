@@ -64,7 +64,7 @@ TEST_F(Console, XmlEndsAtTheFirstZeroOfTheBlock) {
     Described protocol;
     GuardedText answer(40);
     EXPECT_EQ(protocol.DoCommand("xml", answer.out(), 40), 1);
-    EXPECT_EQ(answer.content(), "compressedXML=5" + std::string(25, '\0'));
+    EXPECT_EQ(answer.content(), std::string("compressedXML=5").append(25, '\0'));
 }
 
 TEST_F(Console, XmlOfAProtocolWithoutDescriptionIsEmpty) {
