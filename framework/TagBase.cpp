@@ -2,36 +2,17 @@
 #include "framework/TagBase.h"
 
 #include <algorithm>
-#include <array>
 #include <cstddef>
-#include <memory>
-#include <new>
 
 #include "framework/BitUtils.h"
 #include "framework/Conversions.h"
 #include "framework/DataTypes.h"
+#include "framework/ScratchBuffer.h"
 
 namespace {
 
-// Zero-filled bytes: most values are small and need no heap.
-class WorkBuffer {
-  public:
-    explicit WorkBuffer(std::size_t size) {
-        if (size <= local_.size()) return;
-        heap_.reset(new (std::nothrow) unsigned char[size]());
-        data_ = heap_.get();
-    }
-    WorkBuffer(const WorkBuffer&) = delete;
-    WorkBuffer& operator=(const WorkBuffer&) = delete;
-
-    /// Null when there was no memory.
-    unsigned char* data() { return data_; }
-
-  private:
-    std::array<unsigned char, 256> local_{};
-    std::unique_ptr<unsigned char[]> heap_;
-    unsigned char* data_ = local_.data();
-};
+/// Bytes of a value that are converted without the heap.
+constexpr int kLocalValueBytes = 256;
 
 std::size_t atLeastZero(int length) {
     return static_cast<std::size_t>(std::max(length, 0));
@@ -49,7 +30,7 @@ bool TagBase::ConvertVariable(const unsigned char* src, unsigned char* dst, bool
 }
 
 bool TagBase::Convert(const unsigned char* src, unsigned char* dst, bool toDevice) const {
-    WorkBuffer work(atLeastZero(std::max(PackedLen(), GetVarLength())));
+    ScratchBuffer<kLocalValueBytes> work(std::max(PackedLen(), GetVarLength()));
     if (work.data() == nullptr) return false;
     return toDevice ? toDeviceForm(src, dst, work.data()) : toRunTimeForm(src, dst, work.data());
 }
