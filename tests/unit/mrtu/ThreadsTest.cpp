@@ -87,4 +87,33 @@ TEST_F(ThreadsTest, TransactionBehindAStopFindsTheLineClosed) {
     EXPECT_FALSE(host.multiTask.anyLockHeld());
 }
 
+/// A write of one bit is a read and a write of its register; were they not one step, a thread would
+/// now and then put back the other one's old bit.
+TEST_F(ThreadsTest, TwoThreadsFlippingBitsOfOneRegisterLoseNoUpdate) {
+    std::uint16_t holding = 0;  // Guarded by the line's lock, as on a real line.
+    start();
+    port.answerWith([&holding](const Bytes& frame) {
+        const Bytes message = rtuMessage(frame);
+        if (message[1] == 3) return rtuFrame(registersReply(1, 3, {holding}));
+        holding = static_cast<std::uint16_t>(message[7] * 256 + message[8]);
+        return rtuFrame(testing_support::writeReply(1, 16, 0, 1));
+    });
+
+    std::atomic<int> lost = 0;
+    const auto flip = [this, &lost](const Tag_MRTU* bit) {
+        for (int round = 0; round < 10000; ++round) {
+            const unsigned char wanted = round % 2 == 0 ? 1 : 0;
+            unsigned char found = 2;
+            if (driver->Write(bit, &wanted) == 0 || driver->Read(bit, &found) == 0) ++lost;
+            if (found != wanted) ++lost;
+        }
+    };
+    std::thread first(flip, tag("1?HREG?400001.3?boolean"));
+    std::thread second(flip, tag("1?HREG?400001.12?boolean"));
+    first.join();
+    second.join();
+    EXPECT_EQ(0, lost);
+    EXPECT_EQ(0, holding);
+}
+
 }  // namespace
