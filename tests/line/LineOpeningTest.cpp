@@ -170,6 +170,11 @@ TEST_F(LineTest, RefusedSecondOpenLeavesTheFirstExclusive) {
     other.mapPort("com7", terminal.path());
     EXPECT_EQ(other.openPort("com7"), nullptr);
     int exclusive = 0;
+#ifdef MRTU_EMULATED
+    // The emulator passes TIOCEXCL on, but does not know the question whether it is set.
+    if (::ioctl(terminal.watch(), TIOCGEXCL, &exclusive) != 0 && errno == ENOTTY)
+        GTEST_SKIP() << "qemu-user has no TIOCGEXCL";
+#endif
     ASSERT_EQ(::ioctl(terminal.watch(), TIOCGEXCL, &exclusive), 0);
     EXPECT_NE(exclusive, 0);
     factory.releasePort(port);
