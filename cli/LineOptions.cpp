@@ -89,6 +89,13 @@ void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& con
         ->excludes("--port")
         ->group("Line");
     command.add_flag("--trace", options.trace, "Show every frame on standard error")->group("Line");
+    command
+        .add_option(
+            "--min-gap", options.minGapMs,
+            "Shortest silence in ms that ends a reply, for USB adapters that pause, e.g. 20")
+        ->type_name("MS")
+        ->check(CLI::Range(0, 1000))
+        ->group("Line");
     command.add_option("--config", options.configFile, "Configuration text of the driver")
         ->type_name("FILE")
         ->group("Configuration");

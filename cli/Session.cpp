@@ -76,6 +76,7 @@ struct Session::Parts {
           tracing(serial, watcher(portGone, options.trace ? &context.err : nullptr)),
           host(multiTask, tracing, storage.get()),
           channel(makeProtocol(plugin, host, options.protocol)) {
+        serial.setGapFloor(options.minGapMs);
         for (const PortMapping& port : ports)
             mapPort(port);
     }

@@ -40,6 +40,20 @@ TEST(Sim, OnlyNamedNodesAnswer) {
     EXPECT_EQ(outcome.exitCode, 4);
 }
 
+/// As a USB adapter does it; the driver's own gap at 115200 baud is 2 ms.
+TEST(Sim, RepliesWithPausesNeedALongerGap) {
+    const RunningSim sim({"--fault", "drip=4/100,times=100"});
+    const std::vector<std::string> read{"read",   "--port", sim.device(), "--baud",
+                                        "115200", "--set",  "repeat=0",   "1?HREG?400001?int"};
+    std::vector<std::string> patient = read;
+    patient.insert(patient.end(), {"--min-gap", "1000"});
+    EXPECT_EQ(mrtu(patient).out, "1?HREG?400001?int = 65602536\n");
+
+    const auto hasty = mrtu(read);
+    EXPECT_EQ(hasty.exitCode, 5);
+    EXPECT_NE(hasty.err.find("error -6"), std::string::npos) << hasty.err;
+}
+
 TEST(Sim, DoesNotReplaceAFileByItsLink) {
     const std::string file = cli_test::scratchFile("precious");
     cli_test::writeFile(file, "kept");
