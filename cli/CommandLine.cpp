@@ -37,6 +37,7 @@ void addCommands(CLI::App& app, CommandContext& context) {
     addInfoCommand(app, context);
     addDescribeCommand(app, context);
     addCheckCommand(app, context);
+    addInspectCommand(app, context);
     addSimCommand(app, context);
 }
 

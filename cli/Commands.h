@@ -13,5 +13,6 @@ void addConsoleCommand(CLI::App& app, CommandContext& context);
 void addOverrideCommand(CLI::App& app, CommandContext& context);
 void addDescribeCommand(CLI::App& app, CommandContext& context);
 void addCheckCommand(CLI::App& app, CommandContext& context);
+void addInspectCommand(CLI::App& app, CommandContext& context);
 
 }  // namespace cli

@@ -1,0 +1,161 @@
+#include <fmt/format.h>
+#include <fmt/ranges.h>
+
+#include <CLI/CLI.hpp>
+#include <memory>
+#include <optional>
+#include <ostream>
+
+#include "cli/Commands.h"
+#include "cli/JsonValues.h"
+#include "cli/describe/OfflineDriver.h"
+#include "cli/inspect/Inspection.h"
+
+namespace cli {
+namespace {
+
+constexpr const char* kFooter = R"(Examples:
+  mrtu inspect build/arm/out/libmrtu.so
+  mrtu inspect --json ./libmrtu.so
+
+The exit code is 1 when the file is no plug-in, when a symbol is missing, and when a
+file for this architecture can't be loaded.)";
+
+struct InspectOptions {
+    std::string file;
+    std::string protocol = "MRTU";
+    bool json = false;
+    bool noLoad = false;
+};
+
+/// What the driver says when it is asked itself.
+struct Identity {
+    std::string name;
+    std::string displayName;
+    int type = 0;
+    int version = 0;
+    std::string implementation;
+    std::string description;
+};
+
+struct Loading {
+    std::optional<Identity> identity;
+    std::string refusal;  ///< Why there is no identity.
+    bool failed = false;  ///< It should have gone well.
+};
+
+Identity identityOf(const IProtocol& protocol) {
+    const unsigned char* const xml = protocol.GetXml();
+    return {
+        .name = protocol.GetName(),
+        .displayName = protocol.GetProtocolName(),
+        .type = protocol.GetProtocolType(),
+        .version = protocol.GetProtocolVersion(),
+        .implementation = fmt::format("{} v.{}", protocol.GetImpName(), protocol.GetImpVersion()),
+        .description = xml == nullptr ? "none" : reinterpret_cast<const char*>(xml)};
+}
+
+Loading load(const Inspection& found, const InspectOptions& options) {
+    if (!found.runsHere) return {{}, "another architecture; nothing of it was executed", false};
+    if (options.noLoad) return {{}, "not wanted", false};
+    if (!found.isComplete()) return {{}, "it is not complete", true};
+    try {
+        // The loader would look for a name without a folder somewhere else.
+        const auto file = std::filesystem::absolute(options.file).string();
+        const OfflineDriver driver(file, options.protocol);
+        return {identityOf(driver.protocol()), {}, false};
+    } catch (const CommandError& error) {
+        return {{}, error.what(), true};
+    }
+}
+
+void printFile(std::ostream& out, const Inspection& found) {
+    const auto line = [&out](const char* name, const auto& value) {
+        out << fmt::format("{:<15}{}\n", name, value);
+    };
+    line("file", found.file);
+    line("architecture", architectureText(found.architecture));
+    const std::string floats = floatAbiText(found.architecture);
+    if (!floats.empty()) line("float", floats);
+    line("C library", found.glibc.empty() ? "any" : fmt::format("{} or newer", found.glibc));
+    line("entry", found.hasEntry ? "present" : "missing");
+    for (const NeededLibrary& needed : found.needed)
+        line("needs", fmt::format("{} ({})", needed.name, needed.file.value_or("not found here")));
+    line("missing",
+         found.missing.empty() ? "nothing" : fmt::format("{} symbols", found.missing.size()));
+    for (const std::string& name : found.missing)
+        line("", name);
+    line("header", found.descriptionHeader.empty() ? "none" : found.descriptionHeader);
+}
+
+void printLoading(std::ostream& out, const Loading& loading) {
+    const auto line = [&out](const char* name, const auto& value) {
+        out << fmt::format("{:<15}{}\n", name, value);
+    };
+    if (!loading.identity) return line("not loaded", loading.refusal);
+    line("name", loading.identity->name);
+    line("display name", loading.identity->displayName);
+    line("type", loading.identity->type);
+    line("version", loading.identity->version);
+    line("implementation", loading.identity->implementation);
+    line("description", loading.identity->description);
+}
+
+Json jsonOf(const Inspection& found, const Loading& loading) {
+    Json json;
+    json["file"] = found.file;
+    json["architecture"] = architectureText(found.architecture);
+    const std::string floats = floatAbiText(found.architecture);
+    json["float"] = floats.empty() ? Json() : Json(floats);
+    json["glibc"] = found.glibc.empty() ? Json() : Json(found.glibc);
+    json["entry"] = found.hasEntry;
+    json["needed"] = Json::array();
+    for (const NeededLibrary& needed : found.needed) {
+        json["needed"].push_back(
+            {{"name", needed.name}, {"file", needed.file ? Json(*needed.file) : Json()}});
+    }
+    json["missing"] = found.missing;
+    json["header"] = found.descriptionHeader;
+    json["identity"] = Json();
+    if (loading.identity) {
+        json["identity"] = {{"name", loading.identity->name},
+                            {"displayName", loading.identity->displayName},
+                            {"type", loading.identity->type},
+                            {"version", loading.identity->version},
+                            {"implementation", loading.identity->implementation},
+                            {"description", loading.identity->description}};
+    } else {
+        json["notLoaded"] = loading.refusal;
+    }
+    return json;
+}
+
+void run(CommandContext& context, const InspectOptions& options) {
+    const Inspection found = inspect(options.file);
+    const Loading loading = load(found, options);
+    if (options.json) {
+        context.out << jsonOf(found, loading).dump(2) << '\n';
+    } else {
+        printFile(context.out, found);
+        printLoading(context.out, loading);
+    }
+    if (!found.isComplete() || loading.failed) context.exitCode = ExitCode::Other;
+}
+
+}  // namespace
+
+void addInspectCommand(CLI::App& app, CommandContext& context) {
+    const auto options = std::make_shared<InspectOptions>();
+    CLI::App* const command =
+        app.add_subcommand("inspect", "Tell what a plug-in file is and what it needs");
+    command->add_option("FILE", options->file, "The plug-in, of any architecture")->required();
+    command->add_flag("--json", options->json, "Print JSON");
+    command->add_flag("--no-load", options->noLoad, "Only read the file, never load it");
+    command->add_option("--protocol", options->protocol, "Protocol of the plug-in")
+        ->type_name("NAME")
+        ->capture_default_str();
+    command->footer(kFooter);
+    command->callback([options, &context] { run(context, *options); });
+}
+
+}  // namespace cli

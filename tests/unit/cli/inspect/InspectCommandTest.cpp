@@ -1,0 +1,105 @@
+// The sub-command as it is typed.
+#include <gtest/gtest.h>
+
+#include <sstream>
+#include <vector>
+
+#include "cli/Command.h"
+#include "cli/JsonValues.h"
+#include "tests/unit/cli/inspect/SampleFiles.h"
+
+namespace cli {
+namespace {
+
+struct Outcome {
+    int code;
+    std::string out;
+    std::string err;
+};
+
+Outcome inspect(std::vector<std::string> words) {
+    words.insert(words.begin(), {"mrtu", "inspect"});
+    std::vector<const char*> argv;
+    argv.reserve(words.size());
+    for (const std::string& word : words)
+        argv.push_back(word.c_str());
+    std::ostringstream out;
+    std::ostringstream err;
+    const int code = runCommandLine(static_cast<int>(argv.size()), argv.data(), out, err);
+    return {code, out.str(), err.str()};
+}
+
+bool has(const std::string& text, const std::string& part) {
+    return text.find(part) != std::string::npos;
+}
+
+TEST(InspectCommand, PluginForThisMachineIsAskedItself) {
+    const Outcome outcome = inspect({PLUGIN});
+    EXPECT_EQ(0, outcome.code) << outcome.err;
+    for (const char* line :
+         {"entry          present\n", "missing        nothing\n", "name           MRTU\n",
+          "display name   Modbus RTU\n", "type           184\n", "description    compressedXML="})
+        EXPECT_TRUE(has(outcome.out, line)) << line << "in\n" << outcome.out;
+}
+
+TEST(InspectCommand, JsonHoldsTheSame) {
+    const Outcome outcome = inspect({"--json", PLUGIN});
+    ASSERT_EQ(0, outcome.code) << outcome.err;
+    const Json json = Json::parse(outcome.out);
+    EXPECT_EQ(PLUGIN, json.at("file"));
+    EXPECT_EQ(true, json.at("entry"));
+    EXPECT_EQ(Json::array(), json.at("missing"));
+    EXPECT_EQ("MRTU", json.at("identity").at("name"));
+    EXPECT_EQ(184, json.at("identity").at("type"));
+    EXPECT_EQ(126, json.at("identity").at("version"));
+    EXPECT_FALSE(json.contains("notLoaded"));
+}
+
+TEST(InspectCommand, ForeignFileIsNeverExecuted) {
+    const SampleFiles files;
+    const std::string engine = files.foreignCopyOf(ENGINE);
+    const Outcome outcome = inspect({"--json", files.foreignCopyOf(PLUGIN)});
+    const Json json = Json::parse(outcome.out);
+    EXPECT_EQ("64-bit ARM", json.at("architecture"));
+    EXPECT_EQ(nullptr, json.at("identity"));
+    EXPECT_EQ("another architecture; nothing of it was executed", json.at("notLoaded"));
+}
+
+TEST(InspectCommand, LibraryWithoutEntryIsNotLoaded) {
+    // Its constructor would end this process.
+    const Outcome outcome = inspect({OTHER_LIBRARY});
+    EXPECT_EQ(1, outcome.code);
+    EXPECT_TRUE(has(outcome.out, "entry          missing\n")) << outcome.out;
+    EXPECT_TRUE(has(outcome.out, "not loaded     it is not complete\n")) << outcome.out;
+}
+
+TEST(InspectCommand, PluginWithoutEngineIsNamedIncomplete) {
+    const SampleFiles files;
+    const Outcome outcome = inspect({files.copyOf(PLUGIN)});
+    EXPECT_EQ(1, outcome.code);
+    EXPECT_TRUE(has(outcome.out, "needs          libprotgen.so (not found here)\n")) << outcome.out;
+    EXPECT_TRUE(has(outcome.out, "ProtgenTag::PackedLen() const\n")) << outcome.out;
+}
+
+TEST(InspectCommand, NoLoadOnlyReads) {
+    const Outcome outcome = inspect({"--no-load", PLUGIN});
+    EXPECT_EQ(0, outcome.code);
+    EXPECT_TRUE(has(outcome.out, "not loaded     not wanted\n")) << outcome.out;
+}
+
+TEST(InspectCommand, UnknownProtocolIsAFailure) {
+    const Outcome outcome = inspect({"--protocol", "MTCP", PLUGIN});
+    EXPECT_EQ(1, outcome.code);
+    EXPECT_TRUE(has(outcome.out, "not loaded     ")) << outcome.out;
+}
+
+TEST(InspectCommand, FileThatCannotBeReadIsComplainedAbout) {
+    const Outcome outcome = inspect({"/nonexistent.so"});
+    EXPECT_EQ(1, outcome.code);
+    EXPECT_EQ("mrtu: /nonexistent.so: No such file or directory\n", outcome.err);
+    EXPECT_EQ("", outcome.out);
+    EXPECT_EQ(2, inspect({}).code);
+}
+
+}  // namespace
+}  // namespace cli
