@@ -1,4 +1,5 @@
 // The driver's console commands.
+#include <algorithm>
 #include <cstring>
 
 #include "framework/TextUtils.h"
@@ -59,9 +60,9 @@ void Protocol_MRTU::commandGetId(char* answer, int size) const {
             "id " + std::to_string(node) + " -> " + std::to_string(replacement) + '\n';
         const int length = static_cast<int>(line.size());
         if (length > size) return;
-        // Copies the terminating zero too, unless the line fills the answer to its last byte.
-        std::memcpy(answer, line.c_str(), line.size() + (length < size ? 1 : 0));
-        answer += length;
+        answer = std::copy(line.begin(), line.end(), answer);
         size -= length;
+        // A line that fills the answer to its last byte goes without a terminating zero.
+        if (size > 0) *answer = '\0';
     }
 }

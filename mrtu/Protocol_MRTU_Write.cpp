@@ -71,8 +71,8 @@ int Protocol_MRTU::doWrite(const ProtgenTag* tag, int index, const unsigned char
     // One request for each item. Coils all look at the same first byte, each at the bit of its own
     // number; registers walk through the data.
     const int step = own.writeFunction() == kWriteCoil ? 0 : own.memoryItemLength();
-    for (int item = 0; item < count; ++item)
-        if (writeItems(&own, index + item, data + item * step, 1) == 0) return 0;
+    for (int item = 0; item < count; ++item, data += step)
+        if (writeItems(&own, index + item, data, 1) == 0) return 0;
     return 1;
 }
 
