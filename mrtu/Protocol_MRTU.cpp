@@ -70,6 +70,9 @@ int Protocol_MRTU::Config(const char* text) {
 
 int Protocol_MRTU::Start() {
     if (started_) return 1;
+    // Before a configuration there is no port, and the first look-up of an override would keep the
+    // settings that are not there yet.
+    if (line_.portName.empty()) return fail(_MRTU::kCannotOpen);
     nodeOverrides_.restore(GetIdent());
     overrides_.setSection(GetIdent());
     applySerialOverrides();

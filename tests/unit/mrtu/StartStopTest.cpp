@@ -297,4 +297,11 @@ TEST_F(PoorHostTest, RestoresFromAStorageWithoutCopyingReads) {
     EXPECT_EQ(1, host.plainStorage.count("readString"));
 }
 
+/// The first look-up of an override decides for good, so it must not come before there is a value.
+TEST_F(StartStopTest, StartBeforeConfigFailsAndSpoilsNothing) {
+    EXPECT_EQ(0, driver->Start());
+    expectError(-1, "Can't open serial port");
+    start();
+}
+
 }  // namespace
