@@ -16,7 +16,7 @@ struct LineOptions {
     bool ascii = false;
     bool sim = false;
     bool trace = false;
-    int minGapMs = 0;  ///< 0..1000, the shortest silence that ends a reply; 0: the driver's own.
+    int minGapMs = 0;     ///< 0..1000, the shortest silence that ends a reply; 0: the driver's own.
     std::string storage;  ///< A file, "none", or empty for the default.
     std::string ident;
     std::string protocol = "MRTU";
