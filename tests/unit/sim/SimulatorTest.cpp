@@ -180,9 +180,12 @@ TEST(SimulatorTest, StartWhileServingKeepsTheLine) {
 TEST(SimulatorTest, WaitReturnsWhenTheStopIsRequested) {
     Simulator simulator({});
     simulator.start();
+    // Held open: once both ends are closed, the device's number is free for the next comer.
+    TestMaster master(simulator.path());
     auto end = std::async(std::launch::async, [&] { return simulator.wait(); });
     simulator.requestStop();
     EXPECT_EQ(end.get(), Simulator::End::stopped);
+    EXPECT_TRUE(master.seesHangUp());
     EXPECT_FALSE(std::filesystem::exists(simulator.device()));
 }
 
