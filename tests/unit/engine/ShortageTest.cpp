@@ -1,33 +1,21 @@
 // What the engine does when there is no memory for more than one request: an error, nothing sent,
 // nothing thrown.
-//
-// This program replaces the global operator new by one that refuses when told.
 #include <gtest/gtest.h>
 
 #include <array>
-#include <cstdlib>
-#include <limits>
-#include <new>
 #include <vector>
 
+#include "tests/support/MemoryShortage.h"
 #include "tests/unit/engine/FakeDriver.h"
 
 namespace {
 
-constexpr int kNever = std::numeric_limits<int>::max();
+using testing_support::MemoryShortage;
 
-// Requests for memory that are still granted.
-thread_local int granted = kNever;
-
-void* take(std::size_t size) {
-    if (granted <= 0) return nullptr;
-    if (granted != kNever) --granted;
-    return std::malloc(size == 0 ? 1 : size);
-}
-
-// Not inlined: the compiler would see a free() of what came from operator new, and object.
-[[gnu::noinline]] void give(void* memory) {
-    std::free(memory);
+template <class Access>
+int withMemory(int requests, Access access) {
+    const MemoryShortage shortage(requests);
+    return access();
 }
 
 class Shortage : public testing::Test {
@@ -41,9 +29,7 @@ class Shortage : public testing::Test {
         int calls = 0;
         driver_.onCall([&calls] { ++calls; });
         for (int memory = 0; memory < failures; ++memory) {
-            granted = memory;
-            const int done = access();
-            granted = kNever;
+            const int done = withMemory(memory, access);
             EXPECT_EQ(done, 0) << what << " with " << memory;
             EXPECT_EQ(driver_.GetLastError(), -1) << what << " with " << memory;
             EXPECT_STREQ(driver_.GetLastErrorString(), "Out of memory") << what;
@@ -55,34 +41,6 @@ class Shortage : public testing::Test {
     FakeDriver driver_;
     std::array<unsigned char, 5000> value_{};
 };
-
-}  // namespace
-
-void* operator new(std::size_t size) {
-    if (void* memory = take(size)) return memory;
-    throw std::bad_alloc();
-}
-void* operator new[](std::size_t size) {
-    return operator new(size);
-}
-void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
-    return take(size);
-}
-void* operator new[](std::size_t size, const std::nothrow_t&) noexcept {
-    return take(size);
-}
-void operator delete(void* memory) noexcept {
-    give(memory);
-}
-void operator delete[](void* memory) noexcept {
-    give(memory);
-}
-void operator delete(void* memory, std::size_t) noexcept {
-    give(memory);
-}
-void operator delete[](void* memory, std::size_t) noexcept {
-    give(memory);
-}
 
 TEST_F(Shortage, LongReadsAreRefused) {
     const ITag* registers = driver_.tag("1?REG?0?short-400");
@@ -111,9 +69,8 @@ TEST_F(Shortage, ItemsOfLongArraysAreRefused) {
 TEST_F(Shortage, DatagramsAreRefused) {
     const std::vector<const ITag*> tags = {driver_.tag("1?REG?0?short")};
     for (int memory = 0; memory < 2; ++memory) {
-        granted = memory;
-        const int done = driver_.ReadDatagram(tags.data(), 1, value_.data());
-        granted = kNever;
+        const int done =
+            withMemory(memory, [&] { return driver_.ReadDatagram(tags.data(), 1, value_.data()); });
         EXPECT_EQ(done, 0);
         EXPECT_STREQ(driver_.GetLastErrorString(), "Out of memory") << memory;
     }
@@ -121,8 +78,9 @@ TEST_F(Shortage, DatagramsAreRefused) {
 
 TEST_F(Shortage, OneRequestNeedsNoMemory) {
     const ITag* tag = driver_.tag("1?REG?0?string-63");
-    granted = 0;
-    const int done = driver_.Read(tag, value_.data()) & driver_.Write(tag, value_.data());
-    granted = kNever;
+    const int done = withMemory(
+        0, [&] { return driver_.Read(tag, value_.data()) & driver_.Write(tag, value_.data()); });
     EXPECT_NE(done, 0);
 }
+
+}  // namespace

@@ -1,74 +1,17 @@
 // What happens when there is no memory: an error, nothing lost, nothing thrown.
-//
-// This program replaces the global operator new by one that refuses when told.
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-#include <limits>
 #include <memory>
-#include <new>
 #include <string>
 #include <vector>
 
+#include "tests/support/MemoryShortage.h"
 #include "tests/unit/framework/GuardedText.h"
 #include "tests/unit/framework/TestProtocol.h"
 
 namespace {
 
-constexpr int kNever = std::numeric_limits<int>::max();
-
-// Requests that are still granted.
-thread_local int granted = kNever;
-
-void* take(std::size_t size) {
-    if (granted <= 0) return nullptr;
-    if (granted != kNever) --granted;
-    return std::malloc(size == 0 ? 1 : size);
-}
-
-// Not inlined: the compiler would see a free() of what came from operator new, and object.
-[[gnu::noinline]] void give(void* memory) {
-    std::free(memory);
-}
-
-/// While it lives only `requests` more requests for memory are granted.
-class Shortage {
-  public:
-    explicit Shortage(int requests = 0) { granted = requests; }
-    ~Shortage() { granted = kNever; }
-    Shortage(const Shortage&) = delete;
-    Shortage& operator=(const Shortage&) = delete;
-};
-
-}  // namespace
-
-void* operator new(std::size_t size) {
-    if (void* memory = take(size)) return memory;
-    throw std::bad_alloc();
-}
-void* operator new[](std::size_t size) {
-    return operator new(size);
-}
-void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
-    return take(size);
-}
-void* operator new[](std::size_t size, const std::nothrow_t&) noexcept {
-    return take(size);
-}
-void operator delete(void* memory) noexcept {
-    give(memory);
-}
-void operator delete[](void* memory) noexcept {
-    give(memory);
-}
-void operator delete(void* memory, std::size_t) noexcept {
-    give(memory);
-}
-void operator delete[](void* memory, std::size_t) noexcept {
-    give(memory);
-}
-
-namespace {
+using testing_support::MemoryShortage;
 
 /// Notes nothing, so that it needs no memory itself.
 class FrugalProtocol : public TestProtocol {
@@ -106,7 +49,7 @@ TEST_F(ProtocolBaseMemory, LongTagIsNotReadWithoutMemory) {
     const TestTag tag("1", bytesShape(65));
     int ok = 1;
     {
-        const Shortage shortage;
+        const MemoryShortage shortage;
         ok = protocol_.Read(&tag, value_.data());
     }
     EXPECT_EQ(ok, 0);
@@ -120,7 +63,7 @@ TEST_F(ProtocolBaseMemory, ShortTagNeedsNoMemory) {
     protocol_.device = {1};
     int ok = 0;
     {
-        const Shortage shortage;
+        const MemoryShortage shortage;
         ok = protocol_.Read(&tag, value_.data());
     }
     EXPECT_EQ(ok, 1);
@@ -133,7 +76,7 @@ TEST_F(ProtocolBaseMemory, LongArrayIsNeitherReadNorWrittenWithoutMemory) {
     int read = 1;
     int written = 1;
     {
-        const Shortage shortage;
+        const MemoryShortage shortage;
         read = protocol_.readArrayItem(&tag, 0, value_.data());
         written = protocol_.writeArrayItem(&tag, 0, value_.data());
     }
@@ -148,7 +91,7 @@ TEST_F(ProtocolBaseMemory, TagThatCannotBeListedIsDestroyed) {
     protocol_.ready = new TestTag("1", bytesShape(1), &destroyed);
     const ITag* tag = nullptr;
     {
-        const Shortage shortage;
+        const MemoryShortage shortage;
         tag = protocol_.CreateTag("1");
     }
     EXPECT_EQ(tag, nullptr);
@@ -159,7 +102,7 @@ TEST_F(ProtocolBaseMemory, TagThatCannotBeListedIsDestroyed) {
 TEST_F(ProtocolBaseMemory, CommonErrorTextsNeedNoMemory) {
     const std::string text(256, 'x');
     {
-        const Shortage shortage;
+        const MemoryShortage shortage;
         protocol_.SetError(-6, text.c_str());
     }
     EXPECT_EQ(protocol_.GetLastErrorString(), text);
@@ -168,7 +111,7 @@ TEST_F(ProtocolBaseMemory, CommonErrorTextsNeedNoMemory) {
 TEST_F(ProtocolBaseMemory, LongErrorTextIsCutWithoutMemory) {
     const std::string text(5000, 'x');
     {
-        const Shortage shortage;
+        const MemoryShortage shortage;
         protocol_.SetError(-6, text.c_str());
     }
     EXPECT_EQ(protocol_.GetLastError(), -6);
@@ -181,7 +124,7 @@ TEST_F(ProtocolBaseMemory, IdentStaysWithoutMemory) {
     protocol_.SetIdent("line");
     const std::string ident(100, 'i');
     {
-        const Shortage shortage;
+        const MemoryShortage shortage;
         protocol_.SetIdent(ident.c_str());
     }
     EXPECT_STREQ(protocol_.GetIdent(), "line");
@@ -191,7 +134,7 @@ TEST_F(ProtocolBaseMemory, IdentStaysWithoutMemory) {
 TEST_F(ProtocolBaseMemory, TagErrorIsReplacedByTheShortage) {
     const TestTag tag("a URI that is longer than a short string", bytesShape(1));
     {
-        const Shortage shortage;
+        const MemoryShortage shortage;
         protocol_.SetTagError(&tag);
     }
     expectOutOfMemory();
@@ -213,7 +156,7 @@ Outcome runShort(const std::string& command, int requests) {
     GuardedText answer(200);
     Outcome outcome;
     {
-        const Shortage shortage(requests);
+        const MemoryShortage shortage(requests);
         outcome.result = protocol.DoCommand(command.c_str(), answer.out(), 200);
     }
     const bool tagWasTaken = protocol.ready == nullptr;
