@@ -1,6 +1,8 @@
 // The client of pymodbus against the simulator, in both modes.
 #include <gtest/gtest.h>
 
+#include <string>
+
 #include "RunProgram.h"
 #include "sim/Simulator.h"
 
@@ -22,8 +24,8 @@ TEST_P(SimPymodbusTest, EveryFunctionCodeAgrees) {
     const auto [mode, name] = GetParam();
     sim::Simulator simulator({.mode = mode, .nodes = {{.address = 7}}});
     simulator.start();
-    const auto result = peers::runProgram(
-        {kPython, PEERS_DIRECTORY "/pymodbus_client.py", name, simulator.path(), "7"});
+    const std::string script = PEERS_DIRECTORY "/pymodbus_client.py";
+    const auto result = peers::runProgram({kPython, script, name, simulator.path(), "7"});
     EXPECT_EQ(result.exitCode, 0);
     EXPECT_EQ(result.output,
               "coils 1 0 0 1 0 0 1 0 0\n"

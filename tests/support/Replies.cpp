@@ -58,7 +58,7 @@ Bytes rtuMessage(const Bytes& frame) {
         ADD_FAILURE() << "no frame: " << toHex(frame);
         return {};
     }
-    const Bytes message = firstOf(frame, frame.size() - 2);
+    Bytes message = firstOf(frame, frame.size() - 2);
     EXPECT_EQ(toHex(rtuFrame(message)), toHex(frame));
     return message;
 }

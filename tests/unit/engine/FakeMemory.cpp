@@ -28,9 +28,13 @@ FakeMemory::FakeMemory(const MemoryType& type)
     }
 }
 
+std::ptrdiff_t FakeMemory::firstByteOf(int index) const {
+    return static_cast<std::ptrdiff_t>(index) * itemLength_;
+}
+
 void FakeMemory::read(int index, unsigned char* data, int count) const {
     if (!bits_) {
-        std::copy_n(image_.begin() + index * itemLength_, count * itemLength_, data);
+        std::copy_n(image_.begin() + firstByteOf(index), count * itemLength_, data);
         return;
     }
     for (int i = 0; i < count; ++i) {
@@ -43,7 +47,7 @@ void FakeMemory::read(int index, unsigned char* data, int count) const {
 
 void FakeMemory::write(int index, const unsigned char* data, int count) {
     if (!bits_) {
-        std::copy_n(data, count * itemLength_, image_.begin() + index * itemLength_);
+        std::copy_n(data, count * itemLength_, image_.begin() + firstByteOf(index));
         return;
     }
     for (int i = 0; i < count; ++i) {
@@ -54,12 +58,12 @@ void FakeMemory::write(int index, const unsigned char* data, int count) {
 }
 
 std::vector<unsigned char> FakeMemory::bytes(int index, int length) const {
-    const auto first = image_.begin() + index * itemLength_;
+    const auto first = image_.begin() + firstByteOf(index);
     return {first, first + length};
 }
 
 void FakeMemory::setBytes(int index, const std::vector<unsigned char>& bytes) {
-    std::copy(bytes.begin(), bytes.end(), image_.begin() + index * itemLength_);
+    std::copy(bytes.begin(), bytes.end(), image_.begin() + firstByteOf(index));
 }
 
 unsigned char FakeMemory::bit(int number) const {

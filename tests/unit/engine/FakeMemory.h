@@ -1,6 +1,7 @@
 // One memory area of a device as an array, for a driver that plays.
 #pragma once
 
+#include <cstddef>
 #include <vector>
 
 #include "framework/MemoryManager.h"
@@ -28,6 +29,8 @@ class FakeMemory {
     void setBit(int number, unsigned char value);
 
   private:
+    std::ptrdiff_t firstByteOf(int index) const;
+
     MemoryType type_;
     bool bits_;
     int itemLength_;

@@ -3,6 +3,8 @@
 
 #include <gmock/gmock.h>
 
+#include <array>
+#include <cstddef>
 #include <string>
 #include <thread>
 #include <vector>
@@ -83,9 +85,9 @@ TYPED_TEST_P(StorageContract, KeysAreListedByteByByte) {
     for (const char* key : {"b", "a", "B", "a1", "\xC3\xA4"})
         storage.writeInt("s", key, 1);
     ASSERT_EQ(storage.keyCount("s"), 5);
-    std::vector<std::string> keys;
+    std::array<std::string, 5> keys;
     for (int index = 0; index < 5; ++index)
-        keys.emplace_back(storage.keyName("s", index));
+        keys[static_cast<std::size_t>(index)] = storage.keyName("s", index);
     EXPECT_THAT(keys, ::testing::ElementsAre("B", "a", "a1", "b", "\xC3\xA4"));
     EXPECT_STREQ(storage.keyName("s", 5), "");
     EXPECT_STREQ(storage.keyName("s", -1), "");
@@ -160,6 +162,7 @@ TYPED_TEST_P(StorageContract, ThreadsLoseNoWrite) {
     constexpr int kThreads = 4;
     constexpr int kKeys = 25;
     std::vector<std::thread> threads;
+    threads.reserve(kThreads);
     for (int thread = 0; thread < kThreads; ++thread) {
         threads.emplace_back([&storage, thread] {
             const std::string section = "line" + std::to_string(thread);

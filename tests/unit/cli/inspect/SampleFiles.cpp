@@ -28,7 +28,7 @@ std::string SampleFiles::copyOf(const std::string& file) const {
 }
 
 std::string SampleFiles::foreignCopyOf(const std::string& file) const {
-    const std::string copy = copyOf(file);
+    std::string copy = copyOf(file);
     std::fstream bytes(copy, std::ios::in | std::ios::out | std::ios::binary);
     bytes.seekp(offsetof(Elf64_Ehdr, e_machine));
     bytes.put(static_cast<char>(EM_AARCH64));
@@ -37,7 +37,7 @@ std::string SampleFiles::foreignCopyOf(const std::string& file) const {
 }
 
 std::string SampleFiles::beginningOf(const std::string& file, std::uintmax_t bytes) const {
-    const std::string copy = copyOf(file);
+    std::string copy = copyOf(file);
     std::filesystem::resize_file(copy, bytes);
     return copy;
 }
