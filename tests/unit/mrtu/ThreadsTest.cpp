@@ -28,8 +28,10 @@ TEST_F(ThreadsTest, EveryThreadGetsItsOwnAnswer) {
     port.answerWith(answer);
     const Tag_MRTU* word = tag("1?HREG?400001?short");
     std::atomic<int> wrong = 0;
+    constexpr int kThreads = 4;
     std::vector<std::thread> threads;
-    for (int thread = 0; thread < 4; ++thread)
+    threads.reserve(kThreads);
+    for (int thread = 0; thread < kThreads; ++thread)
         threads.emplace_back([this, word, thread, &wrong] {
             for (int i = 0; i < 500; ++i) {
                 const int index = thread * 1000 + i;

@@ -13,6 +13,8 @@ namespace slots {
 /// Calls entry `slot` of the object's table.
 template <class Result, class... Arguments>
 Result call(void* object, std::size_t slot, Arguments... arguments) {
+    // The analyzer does not see that a constructor has set the pointer to the table.
+    // NOLINTNEXTLINE(clang-analyzer-core.uninitialized.Assign)
     void** const operations = *static_cast<void***>(object);
     using Operation = Result (*)(void*, Arguments...);
     const auto operation = reinterpret_cast<Operation>(operations[slot]);

@@ -32,7 +32,7 @@ std::vector<Symbol> symbols(bool demangled) {
         const auto kind = text.find_first_of("ABCDGNRSTUVWbdrtuvwi", text.find(' '));
         if (kind == std::string::npos) continue;
         std::string name = text.substr(kind + 2);
-        name = name.substr(0, name.find_last_not_of("\n") + 1);
+        name = name.substr(0, name.find_last_not_of('\n') + 1);
         found.push_back({text[kind], name.substr(0, name.find('@'))});
     }
     EXPECT_EQ(0, pclose(pipe)) << command;

@@ -25,6 +25,7 @@ TEST(PosixMultiTask, LockLetsOneThreadInAtATime) {
         }
     };
     std::vector<std::thread> threads;
+    threads.reserve(4);
     for (int i = 0; i < 4; ++i)
         threads.emplace_back(count);
     for (std::thread& thread : threads)

@@ -25,6 +25,7 @@ const Bytes kReadNode2Reply{0x02, 0x03, 0x02, 0x07, 0xD0, 0xFF, 0xE8};
 
 std::vector<Kind> kindsOf(const std::vector<LineEvent>& events) {
     std::vector<Kind> kinds;
+    kinds.reserve(events.size());
     for (const LineEvent& event : events)
         kinds.push_back(event.kind);
     return kinds;
