@@ -6,10 +6,11 @@
 #include <fstream>
 #include <iterator>
 #include <sstream>
+#include <utility>
 #include <vector>
 
-#include "cli/Command.h"
 #include "cli/JsonValues.h"
+#include "tests/unit/cli/InProcess.h"
 
 namespace cli {
 namespace {
@@ -19,12 +20,6 @@ namespace fs = std::filesystem;
 const std::string kGood =
     "CfgVer=1 defNodeId=1 txMode=RTU uart=com1 baudrate=9600\n"
     "parity=even stopbits=1 mode=RS-485\n";
-
-struct Outcome {
-    int code;
-    std::string out;
-    std::string err;
-};
 
 class CheckCommand : public testing::Test {
   protected:
@@ -43,15 +38,8 @@ class CheckCommand : public testing::Test {
 
     Outcome check(const std::string& config, std::vector<std::string> words) const {
         const std::string file = store("line.cfg", config);
-        words.insert(words.begin(), {"mrtu", "check", "--config", file, "--plugin", PLUGIN});
-        std::vector<const char*> argv;
-        argv.reserve(words.size());
-        for (const std::string& word : words)
-            argv.push_back(word.c_str());
-        std::ostringstream out;
-        std::ostringstream err;
-        const int code = runCommandLine(static_cast<int>(argv.size()), argv.data(), out, err);
-        return {code, out.str(), err.str()};
+        words.insert(words.begin(), {"check", "--config", file, "--plugin", PLUGIN});
+        return runInProcess(std::move(words));
     }
 
     /// The rules of the findings, in order, from --json.

@@ -4,31 +4,19 @@
 #include <fstream>
 #include <iterator>
 #include <sstream>
+#include <utility>
 #include <vector>
 
-#include "cli/Command.h"
 #include "cli/JsonValues.h"
+#include "tests/unit/cli/InProcess.h"
 
 namespace cli {
 namespace {
 
-struct Outcome {
-    int code;
-    std::string out;
-    std::string err;
-};
-
 Outcome describe(std::vector<std::string> words) {
-    words.insert(words.begin(), {"mrtu", "describe"});
+    words.insert(words.begin(), "describe");
     words.insert(words.end(), {"--plugin", PLUGIN});
-    std::vector<const char*> argv;
-    argv.reserve(words.size());
-    for (const std::string& word : words)
-        argv.push_back(word.c_str());
-    std::ostringstream out;
-    std::ostringstream err;
-    const int code = runCommandLine(static_cast<int>(argv.size()), argv.data(), out, err);
-    return {code, out.str(), err.str()};
+    return runInProcess(std::move(words));
 }
 
 std::string contentsOf(const std::string& path) {

@@ -1,32 +1,19 @@
 // The sub-command as it is typed.
 #include <gtest/gtest.h>
 
-#include <sstream>
+#include <utility>
 #include <vector>
 
-#include "cli/Command.h"
 #include "cli/JsonValues.h"
+#include "tests/unit/cli/InProcess.h"
 #include "tests/unit/cli/inspect/SampleFiles.h"
 
 namespace cli {
 namespace {
 
-struct Outcome {
-    int code;
-    std::string out;
-    std::string err;
-};
-
 Outcome inspect(std::vector<std::string> words) {
-    words.insert(words.begin(), {"mrtu", "inspect"});
-    std::vector<const char*> argv;
-    argv.reserve(words.size());
-    for (const std::string& word : words)
-        argv.push_back(word.c_str());
-    std::ostringstream out;
-    std::ostringstream err;
-    const int code = runCommandLine(static_cast<int>(argv.size()), argv.data(), out, err);
-    return {code, out.str(), err.str()};
+    words.insert(words.begin(), "inspect");
+    return runInProcess(std::move(words));
 }
 
 bool has(const std::string& text, const std::string& part) {
