@@ -4,7 +4,9 @@
 #include <algorithm>
 #include <array>
 #include <cstddef>
+#include <optional>
 #include <string_view>
+#include <unordered_set>
 
 #include "framework/TextUtils.h"
 
@@ -16,13 +18,19 @@ constexpr std::string_view kNode = "Node";
 constexpr std::string_view kNodeEnd = "::";
 constexpr std::string_view kBlank = "&nbsp;";
 
-// An item begins the text or follows white space; elsewhere the key is the tail of another name.
-std::size_t findKey(const std::string& text, const std::string& key) {
+// For a name that no item has, since it holds "=" or white space: it is compared across items. Such
+// a key too begins the text or follows white space; elsewhere it is the tail of another name.
+std::optional<std::string_view> scanFor(std::string_view text, const std::string& name) {
+    const std::string key = name + "=";
     std::size_t at = text.find(key);
-    while (at != std::string::npos && at != 0 && !ProtUtilsN::IsWhiteSpace(text[at - 1])) {
+    while (at != std::string_view::npos && at != 0 && !ProtUtilsN::IsWhiteSpace(text[at - 1])) {
         at = text.find(key, at + 1);
     }
-    return at;
+    if (at == std::string_view::npos) return std::nullopt;
+
+    text.remove_prefix(at + key.size());
+    const auto* const end = std::find_if(text.begin(), text.end(), ProtUtilsN::IsWhiteSpace);
+    return text.substr(0, static_cast<std::size_t>(end - text.begin()));
 }
 
 std::size_t skipDigits(const std::string& text, std::size_t at) {
@@ -55,24 +63,25 @@ bool decode(const std::string& raw, std::string& value) {
 
 CfgParser::CfgParser(const char* text) : text_(text == nullptr ? "" : text) {
     const std::size_t marker = text_.find(kMarker);
-    if (marker == std::string::npos) return;
-
-    knownFormat_ = true;
-    const std::size_t start = marker + kMarker.size();
-    const std::size_t end = text_.find(kAnyMarker, start);
-    text_ = text_.substr(start, end - start);
-    collectNodes();
+    knownFormat_ = marker != std::string::npos;
+    if (knownFormat_) {
+        const std::size_t start = marker + kMarker.size();
+        const std::size_t end = text_.find(kAnyMarker, start);
+        text_ = text_.substr(start, end - start);
+        collectNodes();
+    }
+    items_ = CfgItems(text_);
 }
 
 void CfgParser::collectNodes() {
+    std::unordered_set<int> known;
     std::size_t at = text_.find(kNode);
     while (at != std::string::npos) {
         const std::size_t digits = at + kNode.size();
         const std::size_t end = skipDigits(text_, digits);
         if (text_.compare(end, kNodeEnd.size(), kNodeEnd) == 0) {
             const int id = ProtUtilsN::ParseDecimal(text_.substr(digits, end - digits).c_str());
-            const bool known = std::find(nodeIds_.begin(), nodeIds_.end(), id) != nodeIds_.end();
-            if (!known) nodeIds_.push_back(id);
+            if (known.insert(id).second) nodeIds_.push_back(id);
         }
         at = text_.find(kNode, end);
     }
@@ -84,12 +93,9 @@ int CfgParser::GetNodeID(int index) const {
 }
 
 const char* CfgParser::GetParam(const char* name) {
-    const std::string key = std::string(name) + "=";
-    const std::size_t at = findKey(text_, key);
-    if (at == std::string::npos) return nullptr;
-
-    const auto start = text_.begin() + static_cast<std::ptrdiff_t>(at + key.size());
-    lastValue_.assign(start, std::find_if(start, text_.end(), ProtUtilsN::IsWhiteSpace));
+    const auto value = CfgItems::isName(name) ? items_.find(text_, name) : scanFor(text_, name);
+    if (!value) return nullptr;
+    lastValue_ = *value;
     return lastValue_.c_str();
 }
 

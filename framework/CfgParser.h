@@ -7,6 +7,8 @@
 #include <string>
 #include <vector>
 
+#include "framework/CfgItems.h"
+
 /// Threads: an object belongs to one thread.
 class CfgParser {
   public:
@@ -49,6 +51,7 @@ class CfgParser {
     std::string lastValue_;
     std::vector<int> nodeIds_;
     bool knownFormat_ = false;
+    CfgItems items_;
 };
 
 namespace CfgParserN {
