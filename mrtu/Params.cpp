@@ -11,6 +11,8 @@ constexpr int kWideNode = -1;
 constexpr bool kRequired = false;
 constexpr bool kOptional = true;
 
+constexpr std::size_t kFirstPlace = 0;
+
 constexpr int kMaxRegisterBytes = 250;
 constexpr int kMaxBits = 2000;
 
@@ -95,6 +97,20 @@ int maxTransactionTime(const NodeParams& node) {
     return static_cast<int>(std::clamp(product, kLowest, kHighest));
 }
 
+NodeRecords::NodeRecords(NodeParams wide, std::vector<NodeParams> nodes)
+    : wide_(std::move(wide)), nodes_(std::move(nodes)) {
+    places_.reserve(nodes_.size());
+    for (std::size_t place = 0; place < nodes_.size(); ++place)
+        places_.emplace_back(nodes_[place].nodeId, place);
+    std::sort(places_.begin(), places_.end());
+}
+
+const NodeParams& NodeRecords::of(int node) const {
+    const auto at = std::lower_bound(places_.begin(), places_.end(), std::pair(node, kFirstPlace));
+    const bool named = at != places_.end() && at->first == node;
+    return named ? nodes_[at->second] : wide_;
+}
+
 bool ParamManager::parse(const char* text) {
     CfgParser parser(text);
     if (!parser.KnownFormat()) {
@@ -102,7 +118,7 @@ bool ParamManager::parse(const char* text) {
         return false;
     }
     NodeParams wide;
-    wide.oneBased = wide_.oneBased;
+    wide.oneBased = records_->wide().oneBased;
     if (!wide.parse(parser, kWideNode, lastError_)) return false;
     int maxTm = std::max(0, maxTransactionTime(wide));
 
@@ -118,18 +134,14 @@ bool ParamManager::parse(const char* text) {
     CommonParams common;
     if (!common.parse(parser, lastError_)) return false;
 
-    nodes_ = std::move(nodes);
-    wide_ = std::move(wide);
+    records_ = std::make_shared<const NodeRecords>(std::move(wide), std::move(nodes));
     common_ = std::move(common);
     maxTm_ = maxTm;
     return true;
 }
 
-const NodeParams* ParamManager::getNodeParams(int node) const {
-    const auto named = std::find_if(nodes_.begin(), nodes_.end(), [node](const NodeParams& params) {
-        return params.nodeId == node;
-    });
-    return named != nodes_.end() ? &*named : &wide_;
+std::shared_ptr<const NodeParams> ParamManager::shareNodeParams(int node) const {
+    return {records_, getNodeParams(node)};
 }
 
 }  // namespace _MRTU

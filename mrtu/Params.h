@@ -1,7 +1,10 @@
 // The driver's configuration: what the configuration text says, for each node and for the line.
 #pragma once
 
+#include <cstddef>
+#include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "framework/CfgParser.h"
@@ -48,15 +51,38 @@ struct CommonParams {
     bool isRtu() const { return txMode == "RTU"; }
 };
 
-/// Owns the parameters. The pointers that it hands out stay valid until the next parse().
+/// The node records that one text made. Never changed once they are in force.
+class NodeRecords {
+  public:
+    NodeRecords() = default;
+    /// @param nodes  Each with a number of its own.
+    NodeRecords(NodeParams wide, std::vector<NodeParams> nodes);
+
+    const NodeParams& wide() const { return wide_; }
+    const std::vector<NodeParams>& nodes() const { return nodes_; }
+    /// @return the node's record, or the configuration-wide one when the node is not named.
+    const NodeParams& of(int node) const;
+
+  private:
+    NodeParams wide_;
+    std::vector<NodeParams> nodes_;
+    std::vector<std::pair<int, std::size_t>> places_;  ///< Number and place in `nodes_`, sorted.
+};
+
+/// Owns the parameters.
+/// Threads: the caller orders parse() against everything else.
 class ParamManager {
   public:
     /// @return false, with getLastError() set and all else as before, when the text is refused.
+    /// Throws std::bad_alloc, with everything as before, when memory is short.
     bool parse(const char* text);
 
     /// @return the node's record, or the configuration-wide one when the text does not name the
-    /// node. Never null.
-    const NodeParams* getNodeParams(int node) const;
+    /// node. Never null; valid until the next parse() that succeeds.
+    const NodeParams* getNodeParams(int node) const { return &records_->of(node); }
+    /// The same record for a holder that outlives the next parse(). Never null.
+    std::shared_ptr<const NodeParams> shareNodeParams(int node) const;
+    /// Never null; the one place of the line's parameters, whatever text made them.
     const CommonParams* getCommonParams() const { return &common_; }
     const char* getLastError() const { return lastError_.c_str(); }
 
@@ -64,11 +90,10 @@ class ParamManager {
     int getMaxTm() const { return maxTm_; }
 
     /// The records of the nodes in the order in which the text names them.
-    const std::vector<NodeParams>& nodes() const { return nodes_; }
+    const std::vector<NodeParams>& nodes() const { return records_->nodes(); }
 
   private:
-    std::vector<NodeParams> nodes_;
-    NodeParams wide_;
+    std::shared_ptr<const NodeRecords> records_ = std::make_shared<const NodeRecords>();
     CommonParams common_;
     std::string lastError_;
     int maxTm_ = 0;

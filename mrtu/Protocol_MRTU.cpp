@@ -15,6 +15,24 @@ namespace {
 constexpr _MRTU::Fault kParity{-1, "Parser: parameter 'parity' has invalid value"};
 constexpr _MRTU::Fault kMode{-1, "Parser: parameter 'mode' has invalid value"};
 
+/// Takes the settings over one by one, up to the first that is refused.
+_MRTU::Fault takeOver(const _MRTU::CommonParams& common, _MRTU::SerialSettings& line) {
+    line.baud = common.baudrate;
+    line.dataBits = common.isRtu() ? 8 : common.bits;
+    line.stopBits = common.stopbits;
+
+    const int parity = _MRTU::parityCode(common.parity);
+    if (parity < 0) return kParity;
+    line.parity = parity;
+
+    const int mode = _MRTU::modeCode(common.mode);
+    if (mode < 0) return kMode;
+    line.mode = mode;
+
+    line.gapMs = _MRTU::interCharacterGap(line.baud);
+    return _MRTU::kNoFault;
+}
+
 constexpr const char* uriNames[] = {"nodeid", "memorytype", "arrayindex.subindex", "datatype",
                                     nullptr};
 
@@ -51,28 +69,17 @@ int Protocol_MRTU::fail(const _MRTU::Fault& fault) {
 
 int Protocol_MRTU::Config(const char* text) {
     if (!params_.parse(text)) return fail({-1, params_.getLastError()});
-
-    const _MRTU::CommonParams& common = *params_.getCommonParams();
-    const int parity = _MRTU::parityCode(common.parity);
-    if (parity < 0) return fail(kParity);
-    const int mode = _MRTU::modeCode(common.mode);
-    if (mode < 0) return fail(kMode);
-
-    line_.portName = common.uart;
-    line_.baud = common.baudrate;
-    line_.dataBits = common.isRtu() ? 8 : common.bits;
-    line_.stopBits = common.stopbits;
-    line_.parity = parity;
-    line_.mode = mode;
-    line_.gapMs = _MRTU::interCharacterGap(line_.baud);
-    return 1;
+    // What follows takes no memory, so that a shortage cannot leave it half done.
+    configured_ = true;
+    const _MRTU::Fault fault = takeOver(*params_.getCommonParams(), line_);
+    return fault ? fail(fault) : 1;
 }
 
 int Protocol_MRTU::Start() {
     if (started_) return 1;
     // Before a configuration there is no port, and the first look-up of an override would keep the
     // settings that are not there yet.
-    if (line_.portName.empty()) return fail(_MRTU::kCannotOpen);
+    if (!configured_) return fail(_MRTU::kCannotOpen);
     nodeOverrides_.restore(GetIdent());
     overrides_.setSection(GetIdent());
     applySerialOverrides();
@@ -93,7 +100,7 @@ void Protocol_MRTU::applySerialOverrides() {
 bool Protocol_MRTU::openPort() {
     // No line runs at 0 baud, and a host's port may divide by it.
     if (line_.baud == 0 || serialFactory_ == nullptr || lock_ == nullptr) return false;
-    port_ = serialFactory_->openPort(line_.portName.c_str());
+    port_ = serialFactory_->openPort(params_.getCommonParams()->uart.c_str());
     if (port_ == nullptr) return false;
     if (configurePort()) return true;
     releasePort();
@@ -139,8 +146,8 @@ const char* const* Protocol_MRTU::tagUriNames() const {
 }
 
 int Protocol_MRTU::vcsGetComParams(char* text, int size) const {
-    const std::string report = line_.portName + ',' + std::to_string(line_.baud) + ',' +
-                               _MRTU::parityWord(line_.parity) + ',' +
+    const std::string report = params_.getCommonParams()->uart + ',' + std::to_string(line_.baud) +
+                               ',' + _MRTU::parityWord(line_.parity) + ',' +
                                std::to_string(line_.dataBits) + ',' +
                                std::to_string(line_.stopBits) + ',' + _MRTU::modeWord(line_.mode);
     ProtUtilsN::CopyBounded(text, report.c_str(), size);

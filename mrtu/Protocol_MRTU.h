@@ -100,6 +100,7 @@ class Protocol_MRTU : public ProtgenProtocol {
 
     std::atomic<bool> started_ = false;
     _MRTU::ParamManager params_;
+    bool configured_ = false;  ///< A text was accepted, if only up to its parity or mode.
     MemoryManager memoryManager_;
     _MRTU::SerialSettings line_;
     ISerialPort* port_ = nullptr;

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <cstddef>
+#include <functional>
 
 namespace _MRTU {
 
@@ -22,10 +23,10 @@ constexpr std::array modeWords{Word{"RS-232", true}, Word{"RS-485", true}, Word{
 constexpr std::array listedBaudRates{150,  300,   600,   1200,  2400,  4800,
                                      9600, 19200, 38400, 57600, 115200};
 
-template <std::size_t Count>
-int codeOf(const std::array<Word, Count>& words, std::string_view word) {
+template <std::size_t Count, class Same>
+int codeOf(const std::array<Word, Count>& words, std::string_view word, Same same) {
     for (std::size_t code = 0; code < Count; ++code)
-        if (words[code].configurable && word == words[code].text) return static_cast<int>(code);
+        if (words[code].configurable && same(word, words[code].text)) return static_cast<int>(code);
     return -1;
 }
 
@@ -39,6 +40,11 @@ char lowered(char letter) {
     return letter >= 'A' && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
 }
 
+bool sameWhenLowered(std::string_view word, std::string_view lowerCase) {
+    return std::equal(word.begin(), word.end(), lowerCase.begin(), lowerCase.end(),
+                      [](char letter, char wanted) { return lowered(letter) == wanted; });
+}
+
 }  // namespace
 
 int interCharacterGap(int baud) {
@@ -49,13 +55,11 @@ int interCharacterGap(int baud) {
 }
 
 int parityCode(std::string_view word) {
-    std::string lowerCase(word);
-    std::transform(lowerCase.begin(), lowerCase.end(), lowerCase.begin(), lowered);
-    return codeOf(parityWords, lowerCase);
+    return codeOf(parityWords, word, sameWhenLowered);
 }
 
 int modeCode(std::string_view word) {
-    return codeOf(modeWords, word);
+    return codeOf(modeWords, word, std::equal_to<std::string_view>());
 }
 
 const char* parityWord(int code) {

@@ -1,14 +1,12 @@
 // The line settings in force and the words and numbers that stand for them.
 #pragma once
 
-#include <string>
 #include <string_view>
 
 namespace _MRTU {
 
-/// What the port is opened with.
+/// What the port is set to.
 struct SerialSettings {
-    std::string portName;
     int baud = 0;
     int dataBits = 8;
     int stopBits = 1;
@@ -20,8 +18,9 @@ struct SerialSettings {
 /// @return the inter-character gap in ms: 120000 / baud rounded up, at least 1; 1 for baud 0.
 int interCharacterGap(int baud);
 
-/// @return the code of a configured word, -1 when there is none. The parity word is compared
-/// without regard to case. The configuration knows fewer words than the report has codes for.
+/// @return the code of a configured word, -1 when there is none; takes no memory. The parity word
+/// is compared without regard to case. The configuration knows fewer words than the report has
+/// codes for.
 int parityCode(std::string_view word);
 int modeCode(std::string_view word);
 

@@ -68,7 +68,7 @@ bool Tag_MRTU::resolveArea(const Protocol_MRTU& protocol, const std::string& nod
     if (commonParams_ == nullptr) return refuse("Can't access protocol common parameters");
 
     setNodeId(ProtUtilsN::ParseInteger(node.c_str()));
-    nodeParams_ = params.getNodeParams(nodeId());
+    nodeParams_ = params.shareNodeParams(nodeId());
     if (nodeParams_ == nullptr) return refuse("Can't access protocol node parameters");
 
     const MemoryManager& memory = *protocol.getMemoryManager();

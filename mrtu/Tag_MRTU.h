@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <string>
 
 #include "engine/ProtgenTag.h"
@@ -11,8 +12,9 @@
 class Protocol_MRTU;
 
 /// URI: nodeid?memorytype?arrayindex.subindex?datatype, e.g. 1?HREG?400010?unsignedShort.
-/// What its pointers point to belongs to the protocol and stays valid until the protocol is
-/// configured again or destroyed.
+/// A tag and its clones keep the node's parameters that were in force when the tag was made, since
+/// address and function codes were chosen by them. The line's parameters, model and memory type are
+/// the protocol's and valid as long as it lives.
 class Tag_MRTU final : public ProtgenTag {
   public:
     Tag_MRTU(const char* uri, const char* const* fieldNames);
@@ -31,7 +33,8 @@ class Tag_MRTU final : public ProtgenTag {
     /// Sets the function codes after the memory type and the node's choice.
     void getCodes();
 
-    const _MRTU::NodeParams* nodeParams() const { return nodeParams_; }
+    const _MRTU::NodeParams* nodeParams() const { return nodeParams_.get(); }
+    /// The line's parameters now in force, whatever they were when the tag was made.
     const _MRTU::CommonParams* commonParams() const { return commonParams_; }
     /// Modbus function codes; the write function is 0 where writing is not possible.
     std::uint8_t readFunction() const { return readFunction_; }
@@ -47,7 +50,7 @@ class Tag_MRTU final : public ProtgenTag {
                      const std::string& area);
     bool resolveType(const std::string& text);
 
-    const _MRTU::NodeParams* nodeParams_ = nullptr;
+    std::shared_ptr<const _MRTU::NodeParams> nodeParams_;
     const _MRTU::CommonParams* commonParams_ = nullptr;
     std::uint8_t readFunction_ = 0;
     std::uint8_t writeFunction_ = 0;

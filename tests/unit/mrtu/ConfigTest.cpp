@@ -7,6 +7,8 @@ namespace {
 
 using driver_test::configText;
 using driver_test::DriverTest;
+using driver_test::hex;
+using driver_test::rtuFrame;
 using driver_test::ScriptedPort;
 
 class ConfigTest : public DriverTest {
@@ -19,6 +21,13 @@ class ConfigTest : public DriverTest {
         start(items);
         driver->Stop();
         return port.settings().empty() ? ScriptedPort::Settings{} : port.settings().back();
+    }
+
+    /// The settings that the driver holds.
+    std::string report() const {
+        char text[80] = {};
+        driver->vcsGetComParams(text, sizeof(text) - 1);
+        return text;
     }
 
     /// The message of a refused configuration.
@@ -95,10 +104,43 @@ TEST_F(ConfigTest, RecordsStayFilledWhenParityIsRefused) {
     EXPECT_EQ(77, driver->getParamManager()->getNodeParams(1)->timeout);
 }
 
-TEST_F(ConfigTest, RecordsStayAsTheyWereWhenTheTextIsRefused) {
-    configure("timeout=77");
+TEST_F(ConfigTest, RefusedParityComesBehindPortRateAndBits) {
+    configure("txMode=RTU uart=com1 baudrate=9600 parity=even stopbits=1 mode=RS-485");
+    refusal(
+        configText("txMode=ASCII uart=com2 baudrate=19200 parity=bad bits=7 stopbits=2 "
+                   "mode=RS-232"));
+    EXPECT_EQ("com2,19200,even,7,2,RS-485", report());
+}
+
+TEST_F(ConfigTest, RefusedModeComesBehindTheParity) {
+    configure("parity=even mode=RS-485");
+    refusal(configText("uart=com2 baudrate=19200 parity=odd stopbits=2 mode=bad"));
+    EXPECT_EQ("com2,19200,odd,8,2,RS-485", report());
+}
+
+TEST_F(ConfigTest, RefusedFirstTextIsTakenOverAsFarAsItGoes) {
+    refusal(configText("uart=com3 baudrate=300 parity=bad stopbits=2 mode=RS-485"));
+    EXPECT_EQ("com3,300,none,8,2,RS-232", report());
+}
+
+TEST_F(ConfigTest, GapStaysWhenParityOrModeIsRefused) {
+    start("baudrate=9600");
+    for (const char* bad : {"parity=bad", "mode=bad"}) {
+        refusal(configText(std::string("baudrate=150 ") + bad));
+        port.forget();
+        port.reply(rtuFrame(hex("01 03 02 12 34")));
+        EXPECT_TRUE(read(tag("1?HREG?400001?short"), 1));
+        EXPECT_EQ(13, port.frameWaits().at(0).gapMs) << bad;
+    }
+}
+
+TEST_F(ConfigTest, EverythingStaysAsItWasWhenTheTextIsRefused) {
+    configure("timeout=77 uart=com2 parity=odd");
+    const std::string before = report();
     refusal("CfgVer=1 timeout=5");
+    refusal("CfgVer=1 timeout=5 defNodeId=1 uart=com7 baudrate=300 parity=none");
     EXPECT_EQ(77, driver->getParamManager()->getNodeParams(1)->timeout);
+    EXPECT_EQ(before, report());
 }
 
 TEST(SerialSettingsTest, InterCharacterGap) {

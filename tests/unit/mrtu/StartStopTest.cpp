@@ -301,7 +301,30 @@ TEST_F(PoorHostTest, RestoresFromAStorageWithoutCopyingReads) {
 TEST_F(StartStopTest, StartBeforeConfigFailsAndSpoilsNothing) {
     EXPECT_EQ(0, driver->Start());
     expectError(-1, "Can't open serial port");
+    EXPECT_EQ(0, driver->Config("CfgVer=1 uart=com1"));
+    EXPECT_EQ(0, driver->Start()) << "a text that is refused as a whole configures nothing";
+    EXPECT_TRUE(host.storage.calls().empty());
+    EXPECT_TRUE(host.serialFactory.opened().empty());
     start();
+    EXPECT_EQ((std::vector<ScriptedPort::Settings>{{9600, 0, 8, 1, 0}}), port.settings());
+}
+
+TEST_F(StartStopTest, HostIsAskedForAPortWithoutAName) {
+    configure("uart=");
+    EXPECT_EQ(0, driver->Start());
+    expectError(-1, "Can't open serial port");
+    EXPECT_EQ(std::vector<std::string>{""}, host.serialFactory.opened());
+
+    host.serialFactory.offer("", port);
+    EXPECT_NE(0, driver->Start()) << "what a name means is the host's";
+}
+
+TEST_F(StartStopTest, PortOfAConfigurationRefusedForItsModeIsTheOneThatIsOpened) {
+    configure("uart=com9");
+    EXPECT_EQ(0, driver->Config(driver_test::configText("baudrate=19200 mode=bad").c_str()));
+    EXPECT_NE(0, driver->Start());
+    EXPECT_EQ(std::vector<std::string>{"com1"}, host.serialFactory.opened());
+    EXPECT_EQ((std::vector<ScriptedPort::Settings>{{19200, 0, 8, 1, 0}}), port.settings());
 }
 
 }  // namespace

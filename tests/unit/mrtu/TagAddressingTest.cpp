@@ -260,6 +260,33 @@ TEST_F(TagAddressingTest, CloneCopiesEveryField) {
     EXPECT_EQ(_MRTU::DriverArea::nodeOverride, static_cast<Tag_MRTU*>(area.get())->driverArea());
 }
 
+/// A later configuration once freed the records that tags pointed to.
+TEST_F(TagAddressingTest, TagKeepsItsNodesParametersThroughALaterConfiguration) {
+    configure("timeout=70 Node2::timeout=90 Node2::presetFunction=06");
+    const Tag_MRTU* named = tag("2?HREG?400001?short");
+    const Tag_MRTU* unnamed = tag("9?HREG?400001?short");
+    const std::unique_ptr<ITag> copy(named->Clone());
+    const auto* clone = static_cast<const Tag_MRTU*>(copy.get());
+
+    for (const char* items : {"timeout=5", "timeout=6 Node2::timeout=7", "timeout=8 parity=bad"}) {
+        driver->Config(driver_test::configText(items).c_str());
+        EXPECT_EQ(90, named->nodeParams()->timeout) << items;
+        EXPECT_EQ("06", named->nodeParams()->presetFunction) << items;
+        EXPECT_EQ(90, clone->nodeParams()->timeout) << items;
+        EXPECT_EQ(70, unnamed->nodeParams()->timeout) << items;
+    }
+    EXPECT_EQ(8, tag("2?HREG?400001?short")->nodeParams()->timeout);
+    EXPECT_EQ(6, named->writeFunction());
+    EXPECT_EQ(16, tag("2?HREG?400001?short")->writeFunction());
+}
+
+TEST_F(TagAddressingTest, TagIsFramedAsTheLineIsNow) {
+    configure("txMode=RTU");
+    const Tag_MRTU* word = tag("1?HREG?400001?short");
+    configure("txMode=ASCII");
+    EXPECT_TRUE(word->commonParams()->isAscii());
+}
+
 TEST_F(TagAddressingTest, ReadOnlyAreasGiveReadOnlyTags) {
     configure();
     EXPECT_TRUE(tag("1?IREG?300001?short")->IsReadOnly());
