@@ -20,21 +20,24 @@ constexpr int kMaxRest = 0x200;
 /// A line that still delivers bytes after this many is babbling, and waiting does not end it.
 constexpr int kMaxFlush = 65536;
 
+/// Lays a frame over the one before; what is longer than the buffer is cut.
+void keep(_MRTU::ByteView frame, Reply& reply) {
+    reply.length = static_cast<int>(frame.size());
+    std::copy_n(frame.begin(), std::min(frame.size(), reply.bytes.size()), reply.bytes.begin());
+}
+
 /// Takes over what was received, good or bad: after the last attempt the bytes are looked at again.
 /// @return whether it is a good frame.
 bool acceptRtu(_MRTU::ByteView received, Reply& reply) {
     if (received.size() < kMinReply) return false;
-    reply.length = static_cast<int>(received.size());
-    const std::size_t kept = std::min(received.size(), reply.bytes.size());
-    std::copy_n(received.begin(), kept, reply.bytes.begin());
+    keep(received, reply);
     return _MRTU::isGoodRtuFrame(received);
 }
 
 bool acceptAscii(_MRTU::ByteView received, Reply& reply) {
     const _MRTU::AsciiBytes decoded = _MRTU::decodeAscii(received);
     if (decoded.length == 0) return false;
-    reply.length = decoded.length;
-    reply.bytes = decoded.bytes;
+    keep({decoded.bytes.data(), static_cast<std::size_t>(decoded.length)}, reply);
     return _MRTU::isGoodAsciiFrame(decoded);
 }
 

@@ -30,8 +30,9 @@ inline constexpr Fault kAcknowledge{-6, "Incorrect writing data acknowledge"};
 inline constexpr Fault kNodeDisabled{-10, "Node disabled"};
 inline constexpr Fault kBroadcast{-10, "Broadcast request"};
 
-/// An accepted frame. The buffer is zero behind the frame's end, so that a check of a field that a
-/// short frame lacks compares with zero.
+/// An accepted frame. The buffer is zero when an exchange begins, and every frame of the exchange,
+/// good or bad, is laid over the one before: a check of a field that a short frame lacks compares
+/// with zero, or with what a longer frame of an earlier attempt left there.
 struct Reply {
     std::array<std::uint8_t, kMaxFrame> bytes{};
     int length = 0;       ///< Bytes of the frame, check included; may exceed the buffer.

@@ -113,6 +113,27 @@ TEST_F(AllocationTest, WriteOfSingleItems) {
     EXPECT_EQ(0U, costOfWrite(tag("1?OUTP?1?boolean"), 1));
 }
 
+TEST_F(AllocationTest, FirstRequestOfASecondTag) {
+    start("");
+    port.setReply(rtuFrame(hex("01 03 02 12 34")));
+    ASSERT_EQ(0U, costOfRead(tag("1?HREG?400001?short"), 1));
+    const Tag_MRTU* second = tag("1?HREG?400002?short");
+    const AllocationCounter counter;
+    EXPECT_TRUE(driver.doReadBlock(second, second->offset(), data.data(), 1));
+    EXPECT_EQ(0U, counter.allocations() + counter.releases());
+}
+
+TEST_F(AllocationTest, FailedRequest) {
+    start("repeat=0");
+    port.setReply(rtuFrame(hex("01 83 02")));
+    const Tag_MRTU* word = tag("1?HREG?400001?short");
+    EXPECT_FALSE(driver.doReadBlock(word, word->offset(), data.data(), 1));
+    const AllocationCounter counter;
+    EXPECT_FALSE(driver.doReadBlock(word, word->offset(), data.data(), 1));
+    EXPECT_EQ(0U, counter.allocations() + counter.releases());
+    EXPECT_STREQ("Exception: Illegal data address", driver.GetLastErrorString());
+}
+
 /// The key of a node's Modicon mode is longer than what a string holds without the heap.
 TEST_F(AllocationTest, SecondRequestOfANodeWithALongNumber) {
     start("");
