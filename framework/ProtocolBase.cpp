@@ -93,7 +93,7 @@ ITag* ProtocolBase::CreateTag(const char* uri) {
     ITag* tag = CreateTagBase(uri);
     if (tag == nullptr) return nullptr;
     try {
-        tags_.push_back(tag);
+        tags_.add(tag);
     } catch (const std::bad_alloc&) {
         delete tag;
         SetError(-1, "Out of memory");

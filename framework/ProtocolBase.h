@@ -1,10 +1,10 @@
 // The framework's base of every protocol.
 #pragma once
 
-#include <list>
 #include <string>
 #include <vector>
 
+#include "framework/TagList.h"
 #include "platform/IProtocol.h"
 
 class TagBase;
@@ -139,7 +139,7 @@ class ProtocolBase : public IProtocol7 {
     int commandWrite(const std::string& uri, const std::string& hex, char* answer, int size);
     const char* writeHex(const ITag* tag, const std::string& hex);
 
-    std::list<ITag*> tags_;
+    TagList tags_;
     int lastError_ = 1;
     std::string lastErrorText_;
     std::string ident_;
