@@ -3,10 +3,10 @@
 
 #include <algorithm>
 #include <map>
-#include <tuple>
 #include <utility>
 
 #include "cli/ValueTypes.h"
+#include "cli/check/FirstMeetings.h"
 #include "cli/check/LintTags.h"
 
 namespace cli {
@@ -49,40 +49,20 @@ Span spanOf(const TagLine& tag, std::size_t order, const AreaInfo& area) {
     return {&tag, order, item, begin, begin + std::max(length, 0LL), itemBits, facts.readOnly};
 }
 
-bool share(long long beginA, long long endA, long long beginB, long long endB) {
-    return beginA < endB && beginB < endA;
-}
-
-/// One value of both is the same: an array and one of its items, say.
-bool sameValues(const Span& a, const Span& b) {
-    const long long bytes = rowOf(a.item).bytes;
-    return a.item == b.item && (a.begin - b.begin) % (bytes * 8) == 0;
-}
-
 std::string describe(const Span& span) {
     return fmt::format("'{}' ({}:{})", span.tag->uri, span.tag->place.source, span.tag->place.line);
 }
 
-/// @return what is wrong between two tags of one area; `later` stands further down in the text.
-std::optional<Finding> conflict(const Span& earlier, const Span& later) {
-    if (earlier.isBits() && later.isBits()) return std::nullopt;
-    if (earlier.isBits() || later.isBits()) {
-        const bool shared =
-            share(earlier.firstItem(), earlier.endItem(), later.firstItem(), later.endItem());
-        // Reading the bits of a status word beside the word is what status words are for.
-        if (!shared || later.readOnly) return std::nullopt;
-        const Span& bit = earlier.isBits() ? earlier : later;
-        const Span& owner = earlier.isBits() ? later : earlier;
-        return Finding{
-            Severity::Warning, "shared-register", bit.tag->placeOf(2),
+Finding sharedRegister(const Span& bit, const Span& owner) {
+    return {Severity::Warning, "shared-register", bit.tag->placeOf(2),
             fmt::format("writing a bit rewrites the register that {} owns", describe(owner)),
             "write it through one of the two tags only"};
-    }
-    if (!share(earlier.begin, earlier.end, later.begin, later.end)) return std::nullopt;
-    if (sameValues(earlier, later)) return std::nullopt;
-    return Finding{Severity::Warning, "overlap", later.tag->placeOf(2),
-                   fmt::format("overlaps {} with another data type", describe(earlier)),
-                   "check the address and the data type of both"};
+}
+
+Finding overlap(const Span& later, const Span& earlier) {
+    return {Severity::Warning, "overlap", later.tag->placeOf(2),
+            fmt::format("overlaps {} with another data type", describe(earlier)),
+            "check the address and the data type of both"};
 }
 
 using Area = std::pair<int, std::string>;  // Node and name.
@@ -99,47 +79,67 @@ std::map<Area, std::vector<Span>> spansByArea(const std::vector<TagLine>& tags,
     return areas;
 }
 
-/// Goes through the tags from low to high addresses; `open` holds those that reach further.
-void sweep(std::vector<Span>& spans,
-           std::map<const TagLine*, std::pair<std::size_t, Finding>>& out) {
-    const auto byBegin = [](const Span& a, const Span& b) {
-        return std::tuple(a.firstItem(), a.begin, a.order) <
-               std::tuple(b.firstItem(), b.begin, b.order);
+using Reports = std::map<std::size_t, Finding>;  ///< By the order of the tag.
+
+/// Gives a number to each kind of values: type and place in the raster of its length. Values of one
+/// kind are the same wherever they meet: those of an array and one of its items, say.
+class Kinds {
+  public:
+    int of(const Span& span) {
+        const long long bits = std::max<long long>(rowOf(span.item).bytes, 1) * 8;
+        const long long phase = (span.begin % bits + bits) % bits;
+        const auto next = static_cast<int>(numbers_.size());
+        return numbers_.try_emplace({span.item, phase}, next).first->second;
+    }
+
+  private:
+    std::map<std::pair<ICU_Type, long long>, int> numbers_;
+};
+
+/// Values that lie on values of another kind are reported further down in the text.
+void lintValues(const std::vector<Span>& values, Reports& out) {
+    std::vector<Stretch> stretches;
+    Kinds kinds;
+    for (const Span& each : values)
+        stretches.push_back({each.begin, each.end, kinds.of(each)});
+    const auto met = firstMeetings(stretches, stretches);
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        if (met[i] && *met[i] < i)
+            out.emplace(values[i].order, overlap(values[i], values[*met[i]]));
+    }
+}
+
+/// Bits that can be written are reported where a register is also part of a value. Reading the bits
+/// of a status word beside the word is what status words are for.
+void lintBits(const std::vector<Span>& bits, const std::vector<Span>& values, Reports& out) {
+    const auto items = [](const std::vector<Span>& spans, int kind) {
+        std::vector<Stretch> stretches;
+        for (const Span& each : spans)
+            stretches.push_back({each.firstItem(), each.endItem(), kind});
+        return stretches;
     };
-    std::sort(spans.begin(), spans.end(), byBegin);
-    std::vector<const Span*> open;
-    for (const Span& span : spans) {
-        std::erase_if(open, [&](const Span* each) { return each->endItem() <= span.firstItem(); });
-        for (const Span* other : open) {
-            const bool inOrder = other->order < span.order;
-            const Span& earlier = inOrder ? *other : span;
-            const Span& later = inOrder ? span : *other;
-            const auto finding = conflict(earlier, later);
-            if (!finding) continue;
-            // The tag that is reported, and the one that it meets.
-            const bool atLater = finding->place == later.tag->placeOf(2);
-            const Span& reported = atLater ? later : earlier;
-            const Span& met = atLater ? earlier : later;
-            const auto known = out.find(reported.tag);
-            if (known == out.end() || met.order < known->second.first) {
-                out.insert_or_assign(reported.tag, std::pair(met.order, *finding));
-            }
-        }
-        open.push_back(&span);
+    const auto met = firstMeetings(items(bits, kNoKind), items(values, 0));
+    for (std::size_t i = 0; i < bits.size(); ++i) {
+        if (met[i] && !bits[i].readOnly)
+            out.emplace(bits[i].order, sharedRegister(bits[i], values[*met[i]]));
     }
 }
 
 }  // namespace
 
 Findings lintOverlaps(const std::vector<TagLine>& tags, const Description& description) {
-    std::map<const TagLine*, std::pair<std::size_t, Finding>> reported;
-    for (auto& [area, spans] : spansByArea(tags, description))
-        sweep(spans, reported);
-    Findings out;
-    for (const TagLine& tag : tags) {
-        const auto finding = reported.find(&tag);
-        if (finding != reported.end()) out.push_back(finding->second.second);
+    Reports reports;
+    for (auto& [area, spans] : spansByArea(tags, description)) {
+        const auto middle = std::stable_partition(spans.begin(), spans.end(),
+                                                  [](const Span& each) { return each.isBits(); });
+        const std::vector<Span> bits(spans.begin(), middle);
+        const std::vector<Span> values(middle, spans.end());
+        lintValues(values, reports);
+        lintBits(bits, values, reports);
     }
+    Findings out;
+    for (auto& [order, finding] : reports)
+        out.push_back(std::move(finding));
     return out;
 }
 

@@ -1,6 +1,8 @@
 // Tags side by side.
 #include <gtest/gtest.h>
 
+#include <random>
+
 #include "cli/check/LintTags.h"
 #include "tests/unit/cli/check/Samples.h"
 
@@ -100,6 +102,57 @@ TEST(LintOverlaps, ATagIsReportedOnceAgainstTheFirstThatItMeets) {
         sampleDescription());
     EXPECT_EQ(placesOf(findings), "overlap@3:8");
     EXPECT_NE(findings[0].message.find("tags:1"), std::string::npos) << findings[0].message;
+}
+
+TagLine randomTag(std::mt19937& random, int line) {
+    const char* const area = random() % 4 == 0 ? "IREG" : "HREG";
+    const auto offset = static_cast<unsigned>(random() % 12);
+    switch (random() % 6) {
+        case 0:
+            return bit(line, area, offset, static_cast<int>(random() % 20));
+        case 1:
+            return bit(line, area, offset, static_cast<int>(random() % 16), 20);
+        case 2:
+            return reg(line, area, offset, ICU_Type::short_, 2);
+        case 3:
+            return reg(line, area, offset, ICU_Type::intArray, 4 * static_cast<int>(random() % 4),
+                       ICU_Type::int_);
+        case 4:
+            return reg(line, area, offset, ICU_Type::int_, 4);
+        default:
+            return reg(line, area, offset, ICU_Type::string, static_cast<int>(random() % 9));
+    }
+}
+
+/// What the tags give two by two: for each the finding against the first that it meets.
+Findings lintPairs(const std::vector<TagLine>& tags) {
+    Findings out;
+    for (const TagLine& tag : tags) {
+        for (const TagLine& other : tags) {
+            if (other.place.line == tag.place.line) continue;
+            const bool inOrder = other.place.line < tag.place.line;
+            const auto found =
+                lintOverlaps({inOrder ? other : tag, inOrder ? tag : other}, sampleDescription());
+            if (found.empty() || found[0].place.line != tag.place.line) continue;
+            out.push_back(found[0]);
+            break;
+        }
+    }
+    return out;
+}
+
+TEST(LintOverlaps, ManyTagsGiveWhatTheirPairsGive) {
+    std::mt19937 random(1);
+    for (int round = 0; round < 300; ++round) {
+        std::vector<TagLine> tags;
+        for (int line = 1; line <= 12; ++line)
+            tags.push_back(randomTag(random, line));
+        const Findings all = lintOverlaps(tags, sampleDescription());
+        const Findings pairs = lintPairs(tags);
+        ASSERT_EQ(placesOf(pairs), placesOf(all)) << round;
+        for (std::size_t i = 0; i < all.size(); ++i)
+            ASSERT_EQ(pairs[i].message, all[i].message) << round;
+    }
 }
 
 TEST(LintOverlaps, RefusedAndEmptyTagsTakeNoPart) {
