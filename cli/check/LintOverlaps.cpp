@@ -99,6 +99,7 @@ class Kinds {
 /// Values that lie on values of another kind are reported further down in the text.
 void lintValues(const std::vector<Span>& values, Reports& out) {
     std::vector<Stretch> stretches;
+    stretches.reserve(values.size());
     Kinds kinds;
     for (const Span& each : values)
         stretches.push_back({each.begin, each.end, kinds.of(each)});
@@ -114,6 +115,7 @@ void lintValues(const std::vector<Span>& values, Reports& out) {
 void lintBits(const std::vector<Span>& bits, const std::vector<Span>& values, Reports& out) {
     const auto items = [](const std::vector<Span>& spans, int kind) {
         std::vector<Stretch> stretches;
+        stretches.reserve(spans.size());
         for (const Span& each : spans)
             stretches.push_back({each.firstItem(), each.endItem(), kind});
         return stretches;

@@ -59,6 +59,7 @@ Value looked(CfgParser& parser, const std::string& name) {
 
 std::vector<int> nodesOf(const CfgParser& parser) {
     std::vector<int> nodes;
+    nodes.reserve(static_cast<std::size_t>(parser.GetNodeCount()));
     for (int index = 0; index < parser.GetNodeCount(); ++index)
         nodes.push_back(parser.GetNodeID(index));
     return nodes;
