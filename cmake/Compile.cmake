@@ -35,8 +35,10 @@ find_package(Threads REQUIRED)
 
 # mrtu_shared_library(TARGET EXPORTS): what plug-in and engine have in common.
 function(mrtu_shared_library target exports)
+  # The same run path in the build tree: what CMake pads it with there is an empty entry, by which
+  # the loader understands the current folder.
   set_target_properties(${target} PROPERTIES
-    BUILD_RPATH "$ORIGIN" INSTALL_RPATH "$ORIGIN" BUILD_RPATH_USE_ORIGIN ON
+    INSTALL_RPATH "$ORIGIN" BUILD_WITH_INSTALL_RPATH ON
     LINK_DEPENDS "${exports}")
   target_link_options(${target} PRIVATE "-Wl,--version-script=${exports}" "-Wl,--gc-sections")
   if(MRTU_STATIC_RUNTIME)
