@@ -1,6 +1,7 @@
 #include <fmt/format.h>
 
 #include <CLI/CLI.hpp>
+#include <memory>
 #include <ostream>
 
 #include "cli/Commands.h"
@@ -73,16 +74,21 @@ void complain(CommandContext& context, const std::string& text) {
     context.err.flush();
 }
 
+std::unique_ptr<CLI::App> makeCommandLine(CommandContext& context) {
+    auto app = std::make_unique<CLI::App>(
+        "Reads and writes tags of Modbus RTU and ASCII devices through a driver plug-in.", "mrtu");
+    app->set_version_flag("--version", "mrtu " MRTU_VERSION);
+    app->footer(kFooter);
+    // At most one, or the word "read" behind "console" would be a command of its own.
+    app->require_subcommand(0, 1);
+    addCommands(*app, context);
+    return app;
+}
+
 int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::ostream& err) {
     CommandContext context{.out = out, .err = err, .exitCode = ExitCode::Done, .pluginOption = {}};
-    CLI::App app("Reads and writes tags of Modbus RTU and ASCII devices through a driver plug-in.",
-                 "mrtu");
-    app.set_version_flag("--version", "mrtu " MRTU_VERSION);
-    app.footer(kFooter);
-    // At most one, or the word "read" behind "console" would be a command of its own.
-    app.require_subcommand(0, 1);
-    addCommands(app, context);
-    ExitCode code = run(app, argc, argv, context);
+    const auto app = makeCommandLine(context);
+    ExitCode code = run(*app, argc, argv, context);
     out.flush();
     if (!out && code == ExitCode::Done) {
         complain(context, "the output can't be written");
