@@ -39,7 +39,7 @@ std::string pluginFile(const CommandContext& context);
 /// Prints "mrtu: " and the text as one line on context.err.
 void complain(CommandContext& context, const std::string& text);
 
-/// @return the parser of the whole command line. Its callbacks use `context`, which must outlive it.
+/// @return the parser of the whole command line. Its callbacks use `context`: it must outlive it.
 std::unique_ptr<CLI::App> makeCommandLine(CommandContext& context);
 
 /// Runs a whole command line, also `--help` and `--version`.
