@@ -3,34 +3,12 @@
 #include <fmt/format.h>
 
 #include <CLI/CLI.hpp>
-#include <cerrno>
-#include <cstring>
-#include <fstream>
 
 #include "cli/ConfigText.h"
+#include "cli/FileReader.h"
 
 namespace cli {
 namespace {
-
-constexpr std::size_t kConfigLimit = std::size_t{1024} * 1024;
-
-[[noreturn]] void refuseConfig(const std::string& file, const std::string& why) {
-    throw CommandError(ExitCode::Usage, fmt::format("configuration {}: {}", file, why));
-}
-
-std::string readConfigFile(const std::string& file) {
-    errno = 0;
-    std::ifstream in(file, std::ios::binary);
-    if (!in) refuseConfig(file, std::strerror(errno));
-    std::string text(kConfigLimit + 1, '\0');
-    in.read(text.data(), static_cast<std::streamsize>(text.size()));
-    if (in.bad()) refuseConfig(file, errno != 0 ? std::strerror(errno) : "can't be read");
-    text.resize(static_cast<std::size_t>(in.gcount()));
-    if (text.size() > kConfigLimit) refuseConfig(file, "longer than 1 MiB");
-    // The driver takes a C string: what stands behind a zero would be lost without a word.
-    if (text.find('\0') != std::string::npos) refuseConfig(file, "holds a zero byte");
-    return text;
-}
 
 void addShortForms(CLI::App& command, LineOptions& options) {
     struct Row {
@@ -123,8 +101,10 @@ void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& con
 }
 
 std::string configTextOf(const LineOptions& options) {
-    const std::string base = options.configFile.empty() ? defaultConfig(options.sim ? "3" : "1")
-                                                        : readConfigFile(options.configFile);
+    const std::string base =
+        options.configFile.empty()
+            ? defaultConfig(options.sim ? "3" : "1")
+            : readText("configuration", options.configFile, {.bytes = kConfigBytes});
     std::vector<ConfigItem> items = itemsOf(options);
     const bool bitsMissing = !itemOf(withItems(base, items), "bits");
     if (options.ascii && bitsMissing) items.push_back({"bits", "8"});

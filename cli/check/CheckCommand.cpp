@@ -2,12 +2,11 @@
 #include <fmt/format.h>
 
 #include <CLI/CLI.hpp>
-#include <fstream>
 #include <memory>
 #include <ostream>
-#include <sstream>
 
 #include "cli/Commands.h"
+#include "cli/FileReader.h"
 #include "cli/check/LintConfig.h"
 #include "cli/check/LintTags.h"
 #include "cli/describe/OfflineDriver.h"
@@ -31,20 +30,11 @@ struct Report {
     bool configAccepted = false;
 };
 
-std::string readFile(const std::string& name) {
-    std::ifstream file(name, std::ios::binary);
-    std::ostringstream text;
-    // An empty file, too, sets the fail bit of what it is written to; a folder can be opened.
-    const bool empty = file.is_open() && file.peek() == std::ifstream::traits_type::eof();
-    if (!empty) text << file.rdbuf();
-    if (!file.is_open() || file.bad() || !text) {
-        throw CommandError(ExitCode::Usage, fmt::format("can't read {}", name));
-    }
-    return text.str();
-}
-
 std::vector<TagLine> tagsOf(const Options& options) {
-    if (!options.tagsFile.empty()) return tagLines(options.tagsFile, readFile(options.tagsFile));
+    if (!options.tagsFile.empty()) {
+        return tagLines(options.tagsFile,
+                        readText("tags", options.tagsFile, {.bytes = kTagListBytes}));
+    }
     std::vector<TagLine> tags;
     for (const std::string& uri : options.uris) {
         tags.push_back(tagLine(uri, "argument", static_cast<int>(tags.size()) + 1, 1));
@@ -88,7 +78,7 @@ void checkTags(IProtocol& protocol, const TagSurroundings& surroundings, std::ve
 }
 
 Report check(const Options& options, const std::string& plugin) {
-    const std::string text = readFile(options.configFile);
+    const std::string text = readText("configuration", options.configFile, {.bytes = kConfigBytes});
     std::vector<TagLine> tags = tagsOf(options);
     const OfflineDriver driver(plugin, options.protocol);
     const Description description = parseDescription(driver.description());

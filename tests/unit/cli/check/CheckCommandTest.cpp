@@ -180,6 +180,29 @@ TEST_F(CheckCommand, UnreadableFilesAreWrongUsage) {
     EXPECT_EQ(check(kGood, {"--tags", "/"}).code, 2);
 }
 
+TEST_F(CheckCommand, WhatReadRefusesIsRefused) {
+    const struct {
+        std::string config;
+        const char* reason;
+    } cases[] = {
+        {kGood + std::string("\0timeout=1", 10), ": holds a zero byte\n"},
+        {kGood + std::string(1024 * 1024, ' '), ": longer than 1 MiB\n"},
+    };
+    for (const auto& each : cases) {
+        const Outcome outcome = check(each.config, {});
+        EXPECT_EQ(2, outcome.code);
+        EXPECT_TRUE(outcome.err.ends_with(each.reason)) << outcome.err;
+    }
+    const Outcome endless = runInProcess({"check", "--config", "/dev/zero", "--plugin", PLUGIN});
+    EXPECT_EQ(2, endless.code);
+    EXPECT_EQ("mrtu: configuration /dev/zero: longer than 1 MiB\n", endless.err);
+}
+
+TEST_F(CheckCommand, TagsFileIsReadWithTheSameCare) {
+    EXPECT_EQ(2, check(kGood, {"--tags", "/dev/zero"}).code);
+    EXPECT_EQ(2, check(kGood, {"--tags", store("tags", std::string("1?\0", 3))}).code);
+}
+
 TEST_F(CheckCommand, FileAndArgumentsExcludeEachOther) {
     EXPECT_EQ(check(kGood, {"--tags", "x", "1?HREG?400001?short"}).code, 2);
 }

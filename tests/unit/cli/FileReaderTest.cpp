@@ -1,0 +1,114 @@
+// Files of every kind: reading ends, whatever a name stands for.
+#include "cli/FileReader.h"
+
+#include <fcntl.h>
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+
+#include "cli/ExitCode.h"
+#include "runtime/FileDescriptor.h"
+
+namespace cli {
+namespace {
+
+constexpr FileLimits kSmall{.bytes = 8, .silence = std::chrono::milliseconds(1)};
+constexpr FileLimits kPatient{.bytes = 8, .silence = std::chrono::seconds(60)};
+
+class FileReader : public testing::Test {
+  protected:
+    void SetUp() override {
+        std::string name = testing::TempDir() + "file_reader_XXXXXX";
+        ASSERT_NE(nullptr, mkdtemp(name.data()));
+        folder_ = name;
+    }
+    void TearDown() override { std::filesystem::remove_all(folder_); }
+
+    std::string store(const std::string& text) const {
+        std::ofstream(folder_ / "file", std::ios::binary) << text;
+        return (folder_ / "file").string();
+    }
+    std::string pipe() const {
+        const std::string path = (folder_ / "pipe").string();
+        EXPECT_EQ(0, mkfifo(path.c_str(), 0600));
+        return path;
+    }
+
+  private:
+    std::filesystem::path folder_;
+};
+
+std::string reasonOf(const std::string& path, const FileLimits& limits) {
+    try {
+        readFile(path, limits);
+    } catch (const FileError& error) {
+        return error.what();
+    }
+    return "read";
+}
+
+std::string refusalOf(const std::string& path, const FileLimits& limits) {
+    try {
+        readText("configuration", path, limits);
+    } catch (const CommandError& error) {
+        EXPECT_EQ(ExitCode::Usage, error.code());
+        return error.what();
+    }
+    return "read";
+}
+
+TEST_F(FileReader, TakesEveryByteUpToTheLimit) {
+    EXPECT_EQ("", readFile(store(""), kSmall));
+    EXPECT_EQ("12345678", readFile(store("12345678"), kSmall));
+    EXPECT_EQ(std::string("\0a", 2), readFile(store(std::string("\0a", 2)), kSmall));
+    EXPECT_EQ("longer than 8 bytes", reasonOf(store("123456789"), kSmall));
+}
+
+TEST_F(FileReader, EndlessDevicesAreCutOff) {
+    EXPECT_EQ("longer than 1 MiB", reasonOf("/dev/zero", {.bytes = kConfigBytes}));
+    EXPECT_EQ("longer than 8 bytes", reasonOf("/dev/urandom", kSmall));
+    EXPECT_EQ("", readFile("/dev/null", kSmall));
+}
+
+TEST_F(FileReader, WhatCannotBeReadSaysWhy) {
+    EXPECT_EQ("No such file or directory", reasonOf("/nowhere/at/all", kSmall));
+    EXPECT_EQ("Is a directory", reasonOf("/", kSmall));
+    EXPECT_EQ("No such file or directory", reasonOf("", kSmall));
+}
+
+TEST_F(FileReader, PipeWithoutWriterIsGivenUp) {
+    EXPECT_EQ("nothing came for 1 ms", reasonOf(pipe(), kSmall));
+}
+
+TEST_F(FileReader, PipeThatIsNeverClosedIsGivenUp) {
+    const std::string path = pipe();
+    const runtime::FileDescriptor both(open(path.c_str(), O_RDWR | O_CLOEXEC));
+    ASSERT_EQ(3, write(both.get(), "abc", 3));
+    EXPECT_EQ("nothing came for 1 ms", reasonOf(path, kSmall));
+}
+
+TEST_F(FileReader, PipeIsReadToItsEnd) {
+    // As a shell's <(command) hands it over.
+    int ends[2];
+    ASSERT_EQ(0, ::pipe2(ends, O_CLOEXEC));
+    const runtime::FileDescriptor out(ends[0]);
+    {
+        const runtime::FileDescriptor in(ends[1]);
+        ASSERT_EQ(3, write(in.get(), "abc", 3));
+    }
+    EXPECT_EQ("abc", readFile("/dev/fd/" + std::to_string(out.get()), kPatient));
+}
+
+TEST_F(FileReader, TextForTheDriverHoldsNoZero) {
+    const std::string path = store(std::string("a\0b", 3));
+    EXPECT_EQ("configuration " + path + ": holds a zero byte", refusalOf(path, kSmall));
+    EXPECT_EQ("configuration /: Is a directory", refusalOf("/", kSmall));
+    EXPECT_EQ("ab", readText("configuration", store("ab"), kSmall));
+}
+
+}  // namespace
+}  // namespace cli
