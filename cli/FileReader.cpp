@@ -3,6 +3,7 @@
 #include <fcntl.h>
 #include <fmt/format.h>
 #include <poll.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <array>
@@ -10,7 +11,6 @@
 #include <cstring>
 
 #include "cli/ExitCode.h"
-#include "runtime/FileDescriptor.h"
 
 namespace cli {
 namespace {
@@ -57,6 +57,13 @@ std::size_t readSome(int fd, char* buffer, std::size_t size, std::chrono::millis
 }
 
 }  // namespace
+
+runtime::FileDescriptor openRegularFile(const std::string& path) {
+    struct stat status {};
+    if (::stat(path.c_str(), &status) != 0) refuseByErrno();
+    if (!S_ISREG(status.st_mode)) throw FileError("not a regular file");
+    return openForReading(path);
+}
 
 std::string readFile(const std::string& path, const FileLimits& limits) {
     const runtime::FileDescriptor file = openForReading(path);

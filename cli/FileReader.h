@@ -9,6 +9,8 @@
 #include <stdexcept>
 #include <string>
 
+#include "runtime/FileDescriptor.h"
+
 namespace cli {
 
 /// Why a file was not read: what() is the reason alone, without the file's name.
@@ -21,6 +23,10 @@ struct FileLimits {
     std::size_t bytes;                                             ///< The most that is taken.
     std::chrono::milliseconds silence = std::chrono::seconds(10);  ///< Of a pipe, at a stretch.
 };
+
+/// Opens a file to look into, here and there. Devices, pipes and folders are not even opened.
+/// Errors: FileError.
+runtime::FileDescriptor openRegularFile(const std::string& path);
 
 /// @return all bytes of a file, a pipe or a device.
 /// Errors: FileError when it can't be opened or read, is longer than the limit, or stays silent.

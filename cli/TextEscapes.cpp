@@ -101,6 +101,21 @@ std::string escapeText(ByteView bytes) {
     return text;
 }
 
+std::string printableText(std::string_view text) {
+    const Bytes bytes(text.begin(), text.end());
+    std::string shown;
+    for (std::size_t at = 0; at < bytes.size();) {
+        const std::size_t length = utf8Length(ByteView(bytes).subspan(at));
+        if (length == 0 || isControl(ByteView(bytes).subspan(at, length))) {
+            shown += fmt::format("\\x{:02x}", bytes[at++]);
+        } else {
+            shown.append(text.substr(at, length));
+            at += length;
+        }
+    }
+    return shown;
+}
+
 Bytes unescapeText(std::string_view text) {
     const bool quoted = text.starts_with('"');
     Bytes bytes;

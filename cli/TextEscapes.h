@@ -13,6 +13,10 @@ namespace cli {
 /// printable UTF-8 character as \xHH.
 std::string escapeText(ByteView bytes);
 
+/// @return the text as a terminal may show it: what it would act on, and what is not UTF-8, as
+/// \xHH; everything else, quotes and backslashes too, as it stands.
+std::string printableText(std::string_view text);
+
 /// Undoes escapeText(). A text in double quotes loses them; characters that need no escape may
 /// stand for themselves.
 /// Errors: CommandError (Usage) on an unknown or cut escape or a quote without its partner.

@@ -103,6 +103,22 @@ TEST_F(FileReader, PipeIsReadToItsEnd) {
     EXPECT_EQ("abc", readFile("/dev/fd/" + std::to_string(out.get()), kPatient));
 }
 
+TEST_F(FileReader, OnlyRegularFilesAreOpenedToLookInto) {
+    EXPECT_TRUE(openRegularFile(store("a")));
+    const auto reason = [](const std::string& path) -> std::string {
+        try {
+            openRegularFile(path);
+        } catch (const FileError& error) {
+            return error.what();
+        }
+        return "opened";
+    };
+    EXPECT_EQ("not a regular file", reason("/dev/zero"));
+    EXPECT_EQ("not a regular file", reason("/"));
+    EXPECT_EQ("not a regular file", reason(pipe()));
+    EXPECT_EQ("No such file or directory", reason("/nowhere/at/all"));
+}
+
 TEST_F(FileReader, TextForTheDriverHoldsNoZero) {
     const std::string path = store(std::string("a\0b", 3));
     EXPECT_EQ("configuration " + path + ": holds a zero byte", refusalOf(path, kSmall));

@@ -49,6 +49,13 @@ TEST(TextEscapes, AreUndone) {
     }
 }
 
+TEST(TextEscapes, PrintableTextKeepsQuotesAndBackslashes) {
+    EXPECT_EQ("a \"b\" c:\\d", cli::printableText("a \"b\" c:\\d"));
+    EXPECT_EQ("\\x1b[2J\\x0a\\x00\\xff\\x7f\\xc2\\x9b",
+              cli::printableText("\x1b[2J\n\0\xff\x7f\xc2\x9b"sv));
+    EXPECT_EQ("K\xc3\xbchler", cli::printableText("K\xc3\xbchler"));
+}
+
 TEST(TextEscapes, QuotesInsideAnUnquotedTextStandForThemselves) {
     EXPECT_EQ(unescapeText("a\"b\""), bytesOf("a\"b\""));
 }
