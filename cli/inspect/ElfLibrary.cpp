@@ -1,24 +1,15 @@
 #include "cli/inspect/ElfLibrary.h"
 
-#include <fcntl.h>
-#include <fmt/format.h>
-#include <gelf.h>
-#include <libelf.h>
-
-#include <cerrno>
-#include <cstring>
 #include <map>
 #include <sstream>
 
-#include "cli/ExitCode.h"
-#include "runtime/FileDescriptor.h"
+#include "cli/inspect/ElfFile.h"
 
 namespace cli {
 namespace {
 
-[[noreturn]] void refuse(const std::string& path, const std::string& why) {
-    throw CommandError(ExitCode::Other, fmt::format("{}: {}", path, why));
-}
+constexpr std::size_t kMostNeeded = 256;
+constexpr std::size_t kMostRunPaths = 64;
 
 /// The versions by the number that the symbols refer to them with.
 struct Version {
@@ -28,109 +19,95 @@ struct Version {
 
 class Reader {
   public:
-    explicit Reader(const std::string& path);
-    ~Reader() { elf_end(elf_); }
-    Reader(const Reader&) = delete;
-    Reader& operator=(const Reader&) = delete;
+    explicit Reader(ElfFile& file) : file_(file) { found_.architecture = file.architecture(); }
 
     ElfLibrary library();
 
   private:
-    void readHeader(const std::string& path);
-    void readSections();
-    void readDynamic(Elf_Data* data, const GElf_Shdr& header);
-    void readVersions(Elf_Data* data, const GElf_Shdr& header);
-    void readSymbols();
-    std::string text(std::size_t section, std::size_t offset) const;
+    void readDynamic(const ElfSection& section);
+    void readRunPaths(const std::string& list);
+    void readVersions(const ElfSection& section);
+    void readVersionsOf(const ElfSection& section, const GElf_Verneed& need, std::size_t offset);
+    void readSymbols(const ElfSection& section);
     Version versionOf(int symbol) const;
 
-    runtime::FileDescriptor file_;
-    Elf* elf_ = nullptr;
+    ElfFile& file_;
     ElfLibrary found_;
     std::map<int, Version> versions_;
     Elf_Data* symbolVersions_ = nullptr;
-    Elf_Data* symbols_ = nullptr;
-    GElf_Shdr symbolHeader_{};
 };
 
-Reader::Reader(const std::string& path) : file_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)) {
-    if (!file_) refuse(path, std::strerror(errno));
-    elf_version(EV_CURRENT);
-    elf_ = elf_begin(file_.get(), ELF_C_READ, nullptr);
-    try {
-        readHeader(path);
-    } catch (...) {
-        elf_end(elf_);
-        throw;
-    }
-}
-
-void Reader::readHeader(const std::string& path) {
-    GElf_Ehdr header{};
-    if (elf_ == nullptr || elf_kind(elf_) != ELF_K_ELF || gelf_getehdr(elf_, &header) == nullptr) {
-        refuse(path, "not an ELF file");
-    }
-    if (header.e_type != ET_DYN) refuse(path, "not a shared library");
-    found_.architecture = {.machine = header.e_machine,
-                           .bits = header.e_ident[EI_CLASS] == ELFCLASS64 ? 64 : 32,
-                           .littleEndian = header.e_ident[EI_DATA] == ELFDATA2LSB,
-                           .flags = header.e_flags};
-}
-
 ElfLibrary Reader::library() {
-    readSections();
-    if (symbols_ != nullptr) readSymbols();
+    std::vector<ElfSection> symbols;
+    for (const ElfSection& section :
+         file_.sections({SHT_DYNAMIC, SHT_GNU_verneed, SHT_GNU_versym, SHT_DYNSYM})) {
+        if (section.header.sh_type == SHT_DYNAMIC) readDynamic(section);
+        if (section.header.sh_type == SHT_GNU_verneed) readVersions(section);
+        if (section.header.sh_type == SHT_GNU_versym) symbolVersions_ = section.data;
+        if (section.header.sh_type == SHT_DYNSYM) symbols.push_back(section);
+    }
+    // They refer to the versions, wherever those stand.
+    for (const ElfSection& section : symbols)
+        readSymbols(section);
     return std::move(found_);
 }
 
-void Reader::readSections() {
-    for (Elf_Scn* section = nullptr; (section = elf_nextscn(elf_, section)) != nullptr;) {
-        GElf_Shdr header{};
-        if (gelf_getshdr(section, &header) == nullptr || header.sh_type == SHT_NOBITS) continue;
-        Elf_Data* const data = elf_getdata(section, nullptr);
-        if (data == nullptr) continue;
-        if (header.sh_type == SHT_DYNAMIC) readDynamic(data, header);
-        if (header.sh_type == SHT_GNU_verneed) readVersions(data, header);
-        if (header.sh_type == SHT_GNU_versym) symbolVersions_ = data;
-        if (header.sh_type == SHT_DYNSYM) {
-            symbols_ = data;
-            symbolHeader_ = header;
-        }
-    }
-}
-
-std::string Reader::text(std::size_t section, std::size_t offset) const {
-    const char* const found = elf_strptr(elf_, section, offset);
-    return found == nullptr ? "" : found;
-}
-
-void Reader::readDynamic(Elf_Data* data, const GElf_Shdr& header) {
+void Reader::readDynamic(const ElfSection& section) {
     GElf_Dyn entry{};
-    for (int i = 0; gelf_getdyn(data, i, &entry) != nullptr && entry.d_tag != DT_NULL; ++i) {
+    for (int i = 0; gelf_getdyn(section.data, i, &entry) != nullptr && entry.d_tag != DT_NULL;
+         ++i) {
+        file_.step();
+        const std::size_t strings = section.header.sh_link;
         if (entry.d_tag == DT_NEEDED) {
-            found_.needed.push_back(text(header.sh_link, entry.d_un.d_val));
+            found_.needed.push_back(file_.text(strings, entry.d_un.d_val));
+            if (found_.needed.size() > kMostNeeded) file_.refuse("needs more than 256 libraries");
         }
-        if (entry.d_tag != DT_RUNPATH && entry.d_tag != DT_RPATH) continue;
-        std::istringstream folders(text(header.sh_link, entry.d_un.d_val));
-        for (std::string folder; std::getline(folders, folder, ':');)
-            found_.runPaths.push_back(folder);
+        if (entry.d_tag == DT_RUNPATH || entry.d_tag == DT_RPATH) {
+            readRunPaths(file_.text(strings, entry.d_un.d_val));
+        }
     }
 }
 
-void Reader::readVersions(Elf_Data* data, const GElf_Shdr& header) {
-    int offset = 0;
+void Reader::readRunPaths(const std::string& list) {
+    std::istringstream folders(list);
+    for (std::string folder; std::getline(folders, folder, ':');) {
+        found_.runPaths.push_back(folder);
+        if (found_.runPaths.size() > kMostRunPaths) file_.refuse("more than 64 run paths");
+    }
+}
+
+/// Moves an offset by what the file says is the way to the next entry.
+/// @return false at the end: without a next entry, and for one outside the section. An offset
+/// never goes back, so no list is without end.
+bool advance(std::size_t& offset, std::size_t way, std::size_t size) {
+    if (way == 0 || way >= size - offset) return false;
+    offset += way;
+    return true;
+}
+
+void Reader::readVersions(const ElfSection& section) {
+    std::size_t offset = 0;
     GElf_Verneed need{};
-    while (gelf_getverneed(data, offset, &need) != nullptr) {
-        int auxOffset = offset + static_cast<int>(need.vn_aux);
-        GElf_Vernaux aux{};
-        for (int i = 0; i < need.vn_cnt && gelf_getvernaux(data, auxOffset, &aux) != nullptr; ++i) {
-            const std::string name = text(header.sh_link, aux.vna_name);
-            versions_[aux.vna_other] = {name, text(header.sh_link, need.vn_file)};
-            found_.versions.push_back(name);
-            auxOffset += static_cast<int>(aux.vna_next);
-        }
-        if (need.vn_next == 0) return;
-        offset += static_cast<int>(need.vn_next);
+    while (gelf_getverneed(section.data, static_cast<int>(offset), &need) != nullptr) {
+        file_.step();
+        std::size_t first = offset;
+        if (advance(first, need.vn_aux, section.data->d_size)) readVersionsOf(section, need, first);
+        if (!advance(offset, need.vn_next, section.data->d_size)) return;
+    }
+}
+
+void Reader::readVersionsOf(const ElfSection& section, const GElf_Verneed& need,
+                            std::size_t offset) {
+    const std::string library = file_.text(section.header.sh_link, need.vn_file);
+    GElf_Vernaux entry{};
+    for (int i = 0; i < need.vn_cnt; ++i) {
+        if (gelf_getvernaux(section.data, static_cast<int>(offset), &entry) == nullptr) return;
+        file_.step();
+        const std::string name = file_.text(section.header.sh_link, entry.vna_name);
+        file_.pay(library.size());
+        versions_[entry.vna_other] = {name, library};
+        found_.versions.push_back(name);
+        if (!advance(offset, entry.vna_next, section.data->d_size)) return;
     }
 }
 
@@ -143,15 +120,16 @@ Version Reader::versionOf(int symbol) const {
     return found == versions_.end() ? Version{} : found->second;
 }
 
-void Reader::readSymbols() {
+void Reader::readSymbols(const ElfSection& section) {
     GElf_Sym symbol{};
-    for (int i = 1; gelf_getsym(symbols_, i, &symbol) != nullptr; ++i) {
-        const std::string name = text(symbolHeader_.sh_link, symbol.st_name);
+    for (int i = 1; gelf_getsym(section.data, i, &symbol) != nullptr; ++i) {
+        const std::string name = file_.text(section.header.sh_link, symbol.st_name);
         if (name.empty() || GELF_ST_BIND(symbol.st_info) == STB_LOCAL) continue;
         if (symbol.st_shndx != SHN_UNDEF) {
             found_.defined.insert(name);
         } else if (GELF_ST_BIND(symbol.st_info) != STB_WEAK) {
             const Version version = versionOf(i);
+            file_.pay(version.name.size() + version.library.size());
             found_.expected.push_back({name, version.name, version.library});
         }
     }
@@ -159,8 +137,19 @@ void Reader::readSymbols() {
 
 }  // namespace
 
+ElfLibrary ElfLibrary::read(const std::string& path, ReadingBudget& budget) {
+    ElfFile file(path, budget);
+    return Reader(file).library();
+}
+
 ElfLibrary ElfLibrary::read(const std::string& path) {
-    return Reader(path).library();
+    ReadingBudget budget;
+    return read(path, budget);
+}
+
+Architecture ElfLibrary::architectureOf(const std::string& path) {
+    ReadingBudget budget;
+    return ElfFile(path, budget).architecture();
 }
 
 }  // namespace cli

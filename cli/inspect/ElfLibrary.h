@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "cli/inspect/Architecture.h"
+#include "cli/inspect/ReadingBudget.h"
 
 namespace cli {
 
@@ -16,6 +17,7 @@ struct ExpectedSymbol {
     std::string library;  ///< Who shall have that version, e.g. "libc.so.6"; empty without version.
 };
 
+/// The texts are the file's own bytes: they may hold anything but zeroes.
 struct ElfLibrary {
     Architecture architecture;
     std::vector<std::string> needed;       ///< Names of libraries, in the order of the file.
@@ -25,8 +27,17 @@ struct ElfLibrary {
     std::set<std::string> defined;         ///< Mangled names.
 
     /// Reads the dynamic sections of a file.
-    /// Errors: CommandError (Other) when it can't be read or is no shared library.
+    /// Errors: CommandError (Other) when it can't be read, is no shared library, is larger than
+    /// 128 MiB, names more than 256 libraries or 64 folders, or exhausts the budget.
+    static ElfLibrary read(const std::string& path, ReadingBudget& budget);
     static ElfLibrary read(const std::string& path);
+
+    /// Reads the header alone.
+    /// Errors: as read().
+    static Architecture architectureOf(const std::string& path);
 };
+
+/// No library is read beyond this length.
+inline constexpr std::size_t kLargestLibrary = std::size_t{128} * 1024 * 1024;
 
 }  // namespace cli

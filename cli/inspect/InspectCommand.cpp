@@ -2,12 +2,14 @@
 #include <fmt/ranges.h>
 
 #include <CLI/CLI.hpp>
+#include <filesystem>
 #include <memory>
 #include <optional>
 #include <ostream>
 
 #include "cli/Commands.h"
 #include "cli/JsonValues.h"
+#include "cli/TextEscapes.h"
 #include "cli/describe/OfflineDriver.h"
 #include "cli/inspect/Inspection.h"
 
@@ -17,15 +19,18 @@ namespace {
 constexpr const char* kFooter = R"(Examples:
   mrtu inspect build/arm/out/libmrtu.so
   mrtu inspect --json ./libmrtu.so
+  mrtu inspect --load ./libmrtu.so
 
-The exit code is 1 when the file is no plug-in, when a symbol is missing, and when a
-file for this architecture can't be loaded.)";
+The file is only read. --load also runs its start-up code: not for a file that you do
+not trust.
+The exit code is 1 when the file is no plug-in, when a symbol is missing, and when
+--load can't load a file for this architecture.)";
 
 struct InspectOptions {
     std::string file;
     std::string protocol = "MRTU";
     bool json = false;
-    bool noLoad = false;
+    bool load = false;
 };
 
 /// What the driver says when it is asked itself.
@@ -44,24 +49,30 @@ struct Loading {
     bool failed = false;  ///< It should have gone well.
 };
 
-Identity identityOf(const IProtocol& protocol) {
-    const unsigned char* const xml = protocol.GetXml();
-    return {
-        .name = protocol.GetName(),
-        .displayName = protocol.GetProtocolName(),
-        .type = protocol.GetProtocolType(),
-        .version = protocol.GetProtocolVersion(),
-        .implementation = fmt::format("{} v.{}", protocol.GetImpName(), protocol.GetImpVersion()),
-        .description = xml == nullptr ? "none" : reinterpret_cast<const char*>(xml)};
+std::string textOrNone(const char* text) {
+    return text != nullptr ? text : "none";
 }
 
-Loading load(const Inspection& found, const InspectOptions& options) {
+Identity identityOf(const IProtocol& protocol) {
+    const auto* const xml = reinterpret_cast<const char*>(protocol.GetXml());
+    return {.name = textOrNone(protocol.GetName()),
+            .displayName = textOrNone(protocol.GetProtocolName()),
+            .type = protocol.GetProtocolType(),
+            .version = protocol.GetProtocolVersion(),
+            .implementation =
+                fmt::format("{} v.{}", textOrNone(protocol.GetImpName()), protocol.GetImpVersion()),
+            .description = textOrNone(xml)};
+}
+
+Loading load(const Inspection& found, const InspectOptions& options, CommandContext& context) {
     if (!found.runsHere) return {{}, "another architecture; nothing of it was executed", false};
-    if (options.noLoad) return {{}, "not wanted", false};
+    if (!options.load) return {{}, "only read; --load runs its start-up code and asks it", false};
     if (!found.isComplete()) return {{}, "it is not complete", true};
     try {
         // The loader would look for a name without a folder somewhere else.
         const auto file = std::filesystem::absolute(options.file).string();
+        complain(context, fmt::format("loading {}: its start-up code runs now",
+                                      printableText(options.file)));
         const OfflineDriver driver(file, options.protocol);
         return {identityOf(driver.protocol()), {}, false};
     } catch (const CommandError& error) {
@@ -69,9 +80,14 @@ Loading load(const Inspection& found, const InspectOptions& options) {
     }
 }
 
+/// Prints "name           value"; a value may be whatever the file holds.
+void printLine(std::ostream& out, const char* name, const std::string& value) {
+    out << fmt::format("{:<15}{}\n", name, printableText(value));
+}
+
 void printFile(std::ostream& out, const Inspection& found) {
-    const auto line = [&out](const char* name, const auto& value) {
-        out << fmt::format("{:<15}{}\n", name, value);
+    const auto line = [&out](const char* name, const std::string& value) {
+        printLine(out, name, value);
     };
     line("file", found.file);
     line("architecture", architectureText(found.architecture));
@@ -82,21 +98,22 @@ void printFile(std::ostream& out, const Inspection& found) {
     for (const NeededLibrary& needed : found.needed)
         line("needs", fmt::format("{} ({})", needed.name, needed.file.value_or("not found here")));
     line("missing",
-         found.missing.empty() ? "nothing" : fmt::format("{} symbols", found.missing.size()));
+         found.missing.empty() ? "nothing" : fmt::format("{} symbols", found.missingCount));
     for (const std::string& name : found.missing)
         line("", name);
+    if (found.missing.size() < found.missingCount) line("", "...");
     line("header", found.descriptionHeader.empty() ? "none" : found.descriptionHeader);
 }
 
 void printLoading(std::ostream& out, const Loading& loading) {
-    const auto line = [&out](const char* name, const auto& value) {
-        out << fmt::format("{:<15}{}\n", name, value);
+    const auto line = [&out](const char* name, const std::string& value) {
+        printLine(out, name, value);
     };
     if (!loading.identity) return line("not loaded", loading.refusal);
     line("name", loading.identity->name);
     line("display name", loading.identity->displayName);
-    line("type", loading.identity->type);
-    line("version", loading.identity->version);
+    line("type", std::to_string(loading.identity->type));
+    line("version", std::to_string(loading.identity->version));
     line("implementation", loading.identity->implementation);
     line("description", loading.identity->description);
 }
@@ -115,6 +132,7 @@ Json jsonOf(const Inspection& found, const Loading& loading) {
             {{"name", needed.name}, {"file", needed.file ? Json(*needed.file) : Json()}});
     }
     json["missing"] = found.missing;
+    json["missingCount"] = found.missingCount;
     json["header"] = found.descriptionHeader;
     json["identity"] = Json();
     if (loading.identity) {
@@ -132,9 +150,11 @@ Json jsonOf(const Inspection& found, const Loading& loading) {
 
 void run(CommandContext& context, const InspectOptions& options) {
     const Inspection found = inspect(options.file);
-    const Loading loading = load(found, options);
+    const Loading loading = load(found, options, context);
     if (options.json) {
-        context.out << jsonOf(found, loading).dump(2) << '\n';
+        // What is not UTF-8 is shown as such, and nothing but ASCII reaches a terminal.
+        const auto replace = Json::error_handler_t::replace;
+        context.out << jsonOf(found, loading).dump(2, ' ', true, replace) << '\n';
     } else {
         printFile(context.out, found);
         printLoading(context.out, loading);
@@ -150,7 +170,8 @@ void addInspectCommand(CLI::App& app, CommandContext& context) {
         app.add_subcommand("inspect", "Tell what a plug-in file is and what it needs");
     command->add_option("FILE", options->file, "The plug-in, of any architecture")->required();
     command->add_flag("--json", options->json, "Print JSON");
-    command->add_flag("--no-load", options->noLoad, "Only read the file, never load it");
+    command->add_flag("--load", options->load,
+                      "Run the file's start-up code and ask it for its names");
     command->add_option("--protocol", options->protocol, "Protocol of the plug-in")
         ->type_name("NAME")
         ->capture_default_str();

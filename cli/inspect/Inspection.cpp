@@ -1,15 +1,15 @@
 #include "cli/inspect/Inspection.h"
 
-#include <cxxabi.h>
+#include <fmt/format.h>
 
 #include <algorithm>
-#include <cstdlib>
 #include <deque>
-#include <fstream>
-#include <iterator>
-#include <memory>
 #include <set>
 
+#include "cli/ExitCode.h"
+#include "cli/FileReader.h"
+#include "cli/TextEscapes.h"
+#include "cli/inspect/ReadableName.h"
 #include "cli/inspect/SearchPlaces.h"
 #include "cli/inspect/SymbolVersion.h"
 
@@ -19,20 +19,23 @@ namespace {
 constexpr const char* kEntry = "GetInterfaceFactory";
 constexpr std::string_view kMarker = "<<ICOM_XML_START>>";
 
-std::string demangled(const std::string& name) {
-    int status = 0;
-    const std::unique_ptr<char, decltype(&std::free)> text(
-        abi::__cxa_demangle(name.c_str(), nullptr, nullptr, &status), &std::free);
-    return status == 0 && text != nullptr ? text.get() : name;
-}
+/// The marker line of a description is shorter.
+constexpr std::size_t kLongestHeader = 500;
+constexpr std::size_t kMostMissing = 1000;
+constexpr std::size_t kMostLibraries = 256;
 
 std::string descriptionHeaderIn(const std::string& path) {
-    std::ifstream file(path, std::ios::binary);
-    const std::string bytes{std::istreambuf_iterator<char>(file), {}};
+    std::string bytes;
+    try {
+        bytes = readFile(path, {.bytes = kLargestLibrary});
+    } catch (const FileError& error) {
+        throw CommandError(ExitCode::Other,
+                           fmt::format("{}: {}", printableText(path), error.what()));
+    }
     const auto at = bytes.find(kMarker);
     if (at == std::string::npos) return {};
     const auto begin = at + kMarker.size();
-    return bytes.substr(begin, bytes.find('\0', begin) - begin);
+    return bytes.substr(begin, std::min(bytes.find('\0', begin) - begin, kLongestHeader));
 }
 
 /// What the needed libraries define, and those that they need in their turn.
@@ -41,7 +44,8 @@ struct Surroundings {
     std::set<std::string> absent;
 };
 
-Surroundings surroundingsOf(const std::string& path, const ElfLibrary& library) {
+Surroundings surroundingsOf(const std::string& path, const ElfLibrary& library,
+                            ReadingBudget& budget) {
     Surroundings around;
     const auto places = searchPlaces(path, library);
     std::deque<std::string> waiting(library.needed.begin(), library.needed.end());
@@ -52,10 +56,14 @@ Surroundings surroundingsOf(const std::string& path, const ElfLibrary& library) 
             around.absent.insert(waiting.front());
             continue;
         }
-        const ElfLibrary other = ElfLibrary::read(file->string());
+        const ElfLibrary other = ElfLibrary::read(file->string(), budget);
         around.defined.insert(other.defined.begin(), other.defined.end());
         for (const std::string& name : other.needed)
             if (seen.insert(name).second) waiting.push_back(name);
+        if (seen.size() > kMostLibraries) {
+            throw CommandError(ExitCode::Other, fmt::format("{}: needs more than {} libraries",
+                                                            printableText(path), kMostLibraries));
+        }
     }
     return around;
 }
@@ -65,10 +73,17 @@ std::vector<std::string> missingIn(const ElfLibrary& library, const Surroundings
     for (const ExpectedSymbol& symbol : library.expected) {
         if (library.defined.contains(symbol.name) || around.defined.contains(symbol.name)) continue;
         if (around.absent.contains(symbol.library)) continue;
-        missing.push_back(demangled(symbol.name));
+        missing.push_back(symbol.name);
     }
     std::sort(missing.begin(), missing.end());
     return missing;
+}
+
+std::vector<std::string> readable(std::vector<std::string> names) {
+    names.resize(std::min(names.size(), kMostMissing));
+    std::transform(names.begin(), names.end(), names.begin(), readableName);
+    std::sort(names.begin(), names.end());
+    return names;
 }
 
 std::vector<NeededLibrary> neededBy(const std::string& path, const ElfLibrary& library) {
@@ -84,14 +99,17 @@ std::vector<NeededLibrary> neededBy(const std::string& path, const ElfLibrary& l
 }  // namespace
 
 Inspection inspect(const std::string& path) {
-    const ElfLibrary library = ElfLibrary::read(path);
+    ReadingBudget budget;
+    const ElfLibrary library = ElfLibrary::read(path, budget);
+    const auto missing = missingIn(library, surroundingsOf(path, library, budget));
     return {.file = path,
             .architecture = library.architecture,
             .runsHere = sameArchitecture(library.architecture, ownArchitecture()),
             .hasEntry = library.defined.contains(kEntry),
             .glibc = newestGlibc(library.versions),
             .needed = neededBy(path, library),
-            .missing = missingIn(library, surroundingsOf(path, library)),
+            .missing = readable(missing),
+            .missingCount = missing.size(),
             .descriptionHeader = descriptionHeaderIn(path)};
 }
 

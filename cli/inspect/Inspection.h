@@ -21,17 +21,20 @@ struct Inspection {
     bool hasEntry = false;  ///< "GetInterfaceFactory" is defined.
     std::string glibc;      ///< The oldest C library that it loads on, e.g. "2.4".
     std::vector<NeededLibrary> needed;
-    /// Symbols that no library found here defines, demangled. Those that a library not found here
-    /// must have, by their version, are not among them.
+    /// Symbols that no library found here defines, demangled; the first thousand of them. Those
+    /// that a library not found here must have, by their version, are not among them.
     std::vector<std::string> missing;
-    /// The marker line in front of the description, e.g. "Name=MRTU?FullName=..."; empty when the
-    /// file has none.
+    std::size_t missingCount = 0;  ///< All of them.
+    /// The marker line in front of the description, e.g. "Name=MRTU?FullName=...", its first 500
+    /// bytes; empty when the file has none.
     std::string descriptionHeader;
 
     [[nodiscard]] bool isComplete() const { return hasEntry && missing.empty(); }
 };
 
-/// Errors: CommandError (Other) when the file can't be read or is no shared library.
+/// Ends with every file, whatever it holds; texts are the file's own bytes.
+/// Errors: CommandError (Other) when the file can't be read, is no shared library, or holds more
+/// than a library does (see ElfLibrary::read()).
 Inspection inspect(const std::string& path);
 
 }  // namespace cli

@@ -22,7 +22,7 @@ fs::path expanded(std::string runPath, const fs::path& origin) {
 
 bool isLibraryFor(const Architecture& architecture, const fs::path& file) {
     try {
-        return sameArchitecture(ElfLibrary::read(file.string()).architecture, architecture);
+        return sameArchitecture(ElfLibrary::architectureOf(file.string()), architecture);
     } catch (const CommandError&) {
         return false;
     }

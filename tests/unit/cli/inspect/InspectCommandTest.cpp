@@ -1,6 +1,7 @@
 // The sub-command as it is typed.
 #include <gtest/gtest.h>
 
+#include <iostream>
 #include <utility>
 #include <vector>
 
@@ -20,8 +21,8 @@ bool has(const std::string& text, const std::string& part) {
     return text.find(part) != std::string::npos;
 }
 
-TEST(InspectCommand, PluginForThisMachineIsAskedItself) {
-    const Outcome outcome = inspect({PLUGIN});
+TEST(InspectCommand, PluginForThisMachineIsAskedItselfWhenWanted) {
+    const Outcome outcome = inspect({"--load", PLUGIN});
     EXPECT_EQ(0, outcome.code) << outcome.err;
     for (const char* line :
          {"entry          present\n", "missing        nothing\n", "name           MRTU\n",
@@ -30,7 +31,7 @@ TEST(InspectCommand, PluginForThisMachineIsAskedItself) {
 }
 
 TEST(InspectCommand, JsonHoldsTheSame) {
-    const Outcome outcome = inspect({"--json", PLUGIN});
+    const Outcome outcome = inspect({"--json", "--load", PLUGIN});
     ASSERT_EQ(0, outcome.code) << outcome.err;
     const Json json = Json::parse(outcome.out);
     EXPECT_EQ(PLUGIN, json.at("file"));
@@ -45,7 +46,7 @@ TEST(InspectCommand, JsonHoldsTheSame) {
 TEST(InspectCommand, ForeignFileIsNeverExecuted) {
     const SampleFiles files;
     const std::string engine = files.foreignCopyOf(ENGINE);
-    const Outcome outcome = inspect({"--json", files.foreignCopyOf(PLUGIN)});
+    const Outcome outcome = inspect({"--json", "--load", files.foreignCopyOf(PLUGIN)});
     const Json json = Json::parse(outcome.out);
     EXPECT_EQ("64-bit ARM", json.at("architecture"));
     EXPECT_EQ(nullptr, json.at("identity"));
@@ -54,7 +55,7 @@ TEST(InspectCommand, ForeignFileIsNeverExecuted) {
 
 TEST(InspectCommand, LibraryWithoutEntryIsNotLoaded) {
     // Its constructor would end this process.
-    const Outcome outcome = inspect({OTHER_LIBRARY});
+    const Outcome outcome = inspect({"--load", OTHER_LIBRARY});
     EXPECT_EQ(1, outcome.code);
     EXPECT_TRUE(has(outcome.out, "entry          missing\n")) << outcome.out;
     EXPECT_TRUE(has(outcome.out, "not loaded     it is not complete\n")) << outcome.out;
@@ -68,14 +69,25 @@ TEST(InspectCommand, PluginWithoutEngineIsNamedIncomplete) {
     EXPECT_TRUE(has(outcome.out, "ProtgenTag::PackedLen() const\n")) << outcome.out;
 }
 
-TEST(InspectCommand, NoLoadOnlyReads) {
-    const Outcome outcome = inspect({"--no-load", PLUGIN});
-    EXPECT_EQ(0, outcome.code);
-    EXPECT_TRUE(has(outcome.out, "not loaded     not wanted\n")) << outcome.out;
+TEST(InspectCommand, NothingOfTheFileIsExecutedUnlessWanted) {
+    // Its constructor would end this process.
+    const Outcome outcome = inspect({DEADLY_PLUGIN});
+    EXPECT_EQ(0, outcome.code) << outcome.err;
+    EXPECT_EQ("", outcome.err);
+    EXPECT_TRUE(has(outcome.out, "entry          present\n")) << outcome.out;
+    EXPECT_TRUE(has(outcome.out, "not loaded     only read; --load runs its start-up code"))
+        << outcome.out;
+    EXPECT_TRUE(Json::parse(inspect({"--json", DEADLY_PLUGIN}).out).contains("notLoaded"));
+}
+
+TEST(InspectCommandDeathTest, LoadingIsAnnouncedBeforeItHappens) {
+    const char* const words[] = {"mrtu", "inspect", "--load", DEADLY_PLUGIN};
+    EXPECT_EXIT(runCommandLine(4, words, std::cout, std::cerr), testing::ExitedWithCode(99),
+                "^mrtu: loading .*: its start-up code runs now\n$");
 }
 
 TEST(InspectCommand, UnknownProtocolIsAFailure) {
-    const Outcome outcome = inspect({"--protocol", "MTCP", PLUGIN});
+    const Outcome outcome = inspect({"--load", "--protocol", "MTCP", PLUGIN});
     EXPECT_EQ(1, outcome.code);
     EXPECT_TRUE(has(outcome.out, "not loaded     ")) << outcome.out;
 }

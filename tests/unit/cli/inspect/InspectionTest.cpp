@@ -89,7 +89,7 @@ TEST(Inspection, WhatIsNoLibraryIsRefused) {
     const SampleFiles files;
     EXPECT_EQ("/nonexistent.so: No such file or directory", refusalOf("/nonexistent.so"));
     EXPECT_EQ("/etc/passwd: not an ELF file", refusalOf("/etc/passwd"));
-    EXPECT_EQ("/tmp: not an ELF file", refusalOf("/tmp"));
+    EXPECT_EQ("/tmp: not a regular file", refusalOf("/tmp"));
     const std::string empty = files.beginningOf(ENGINE, 0);
     EXPECT_EQ(empty + ": not an ELF file", refusalOf(empty));
 }

@@ -21,6 +21,10 @@ SampleFiles::~SampleFiles() {
     std::filesystem::remove_all(folder_, ignored);
 }
 
+std::string SampleFiles::path(const std::string& name) const {
+    return (folder_ / name).string();
+}
+
 std::string SampleFiles::copyOf(const std::string& file) const {
     const auto copy = folder_ / std::filesystem::path(file).filename();
     std::filesystem::copy_file(file, copy);

@@ -13,6 +13,8 @@ class SampleFiles {
     SampleFiles(const SampleFiles&) = delete;
     SampleFiles& operator=(const SampleFiles&) = delete;
 
+    /// @return a path in the folder; nothing is there yet.
+    std::string path(const std::string& name) const;
     /// @return the copy's path.
     std::string copyOf(const std::string& file) const;
     /// A copy whose header says that it is for 64-bit ARM.
