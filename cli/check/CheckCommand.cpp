@@ -7,6 +7,7 @@
 
 #include "cli/Commands.h"
 #include "cli/FileReader.h"
+#include "cli/check/DriverFacts.h"
 #include "cli/check/LintConfig.h"
 #include "cli/check/LintTags.h"
 #include "cli/describe/OfflineDriver.h"
@@ -44,26 +45,6 @@ std::vector<TagLine> tagsOf(const Options& options) {
 
 void append(Findings& all, const Findings& more) {
     all.insert(all.end(), more.begin(), more.end());
-}
-
-/// @return what the driver knows of the tag; nothing, with its message in `refusal`, when it
-/// refuses the tag.
-std::optional<TagFacts> factsOf(IProtocol& protocol, const std::string& uri, std::string& refusal) {
-    ITag* tag = protocol.CreateTag(uri.c_str());
-    if (tag == nullptr) {
-        refusal = protocol.GetLastErrorString();
-        return std::nullopt;
-    }
-    const auto* nodes = static_cast<IProtocol4*>(protocol.ConvertTo("IProtocol4"));
-    const TagFacts facts{.node = nodes != nullptr ? nodes->GetNodeID(tag) : 0,
-                         .byteOffset = tag->GetByteOffset(),
-                         .bitIndex = tag->GetBitIndex(),
-                         .type = tag->GetVarType(),
-                         .itemType = tag->GetItemType(),
-                         .length = tag->GetVarLength(),
-                         .readOnly = tag->IsReadOnly()};
-    protocol.FreeTag(tag);
-    return facts;
 }
 
 void checkTags(IProtocol& protocol, const TagSurroundings& surroundings, std::vector<TagLine>& tags,

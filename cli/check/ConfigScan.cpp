@@ -34,21 +34,37 @@ ScannedItem itemOf(std::string_view word, const Place& place) {
     return item;
 }
 
+/// Places of a text, asked for from its front to its end: each character is looked at once.
+class PlaceWalk {
+  public:
+    PlaceWalk(const std::string& source, std::string_view text) : source_(source), text_(text) {}
+
+    Place at(std::size_t index) {
+        for (; at_ < index; ++at_) {
+            if (text_[at_] != '\n') continue;
+            ++line_;
+            lineStart_ = at_ + 1;
+        }
+        return {source_, line_, static_cast<int>(index - lineStart_) + 1};
+    }
+
+  private:
+    std::string source_;
+    std::string_view text_;
+    std::size_t at_ = 0;
+    std::size_t lineStart_ = 0;
+    int line_ = 1;
+};
+
 }  // namespace
 
 Place placeIn(const std::string& source, std::string_view text, std::size_t index) {
-    const std::string_view front = text.substr(0, index);
-    const auto lines = std::count(front.begin(), front.end(), '\n');
-    const std::size_t lineStart = front.rfind('\n');
-    const std::size_t column = lineStart == std::string_view::npos ? index : index - lineStart - 1;
-    return {source, static_cast<int>(lines) + 1, static_cast<int>(column) + 1};
+    return PlaceWalk(source, text).at(index);
 }
 
 const ScannedItem* ScannedConfig::item(std::string_view name) const {
-    const auto found = std::find_if(items.begin(), items.end(), [name](const ScannedItem& each) {
-        return each.name == name && each.value.has_value();
-    });
-    return found != items.end() ? &*found : nullptr;
+    const auto found = firstOf.find(name);
+    return found != firstOf.end() ? &items[found->second] : nullptr;
 }
 
 ScannedConfig scanConfig(const std::string& source, std::string_view text) {
@@ -65,9 +81,12 @@ ScannedConfig scanConfig(const std::string& source, std::string_view text) {
     const std::size_t next = text.find(kNextMarker, begin);
     if (next != std::string_view::npos) config.ignoredRemainder = placeIn(source, text, next);
     const std::string_view body = text.substr(0, next);
+    PlaceWalk places(source, text);
     for (std::size_t at = body.find_first_not_of(kWhite, begin); at != std::string_view::npos;) {
         const std::size_t end = std::min(body.find_first_of(kWhite, at), body.size());
-        config.items.push_back(itemOf(body.substr(at, end - at), placeIn(source, text, at)));
+        const ScannedItem item = itemOf(body.substr(at, end - at), places.at(at));
+        if (item.value) config.firstOf.emplace(item.name, config.items.size());
+        config.items.push_back(item);
         at = body.find_first_not_of(kWhite, end);
     }
     return config;

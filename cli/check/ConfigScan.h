@@ -2,6 +2,8 @@
 // of its words. Pure.
 #pragma once
 
+#include <functional>
+#include <map>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -24,9 +26,11 @@ struct ScannedItem {
 };
 
 struct ScannedConfig {
-    bool marked = false;                    ///< The marker "CfgVer=1" is there.
-    Place end;                              ///< Behind the last character.
-    std::vector<ScannedItem> items;         ///< Of the body.
+    bool marked = false;             ///< The marker "CfgVer=1" is there.
+    Place end;                       ///< Behind the last character.
+    std::vector<ScannedItem> items;  ///< Of the body.
+    /// Where in `items` the first of a full name stands that has a value.
+    std::map<std::string, std::size_t, std::less<>> firstOf;
     std::optional<Place> ignoredFront;      ///< Text in front of the marker.
     std::optional<Place> ignoredRemainder;  ///< A second "CfgVer=", which ends the body.
 

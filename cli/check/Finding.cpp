@@ -5,6 +5,9 @@
 #include <algorithm>
 #include <map>
 #include <tuple>
+#include <utility>
+
+#include "cli/TextEscapes.h"
 
 namespace cli {
 namespace {
@@ -14,6 +17,11 @@ const char* word(Severity severity) {
 }
 
 }  // namespace
+
+void warn(Findings& out, const char* rule, const Place& place, std::string message,
+          std::string suggestion) {
+    out.push_back({Severity::Warning, rule, place, std::move(message), std::move(suggestion)});
+}
 
 int countOf(const Findings& findings, Severity severity) {
     return static_cast<int>(
@@ -34,10 +42,12 @@ void sortByPlace(Findings& findings) {
 std::string findingsText(const Findings& findings) {
     std::string text;
     for (const Finding& finding : findings) {
-        text += fmt::format("{}:{}:{}: {}: {} [{}]\n", finding.place.source, finding.place.line,
-                            finding.place.column, word(finding.severity), finding.message,
-                            finding.rule);
-        if (!finding.suggestion.empty()) text += "    " + finding.suggestion + '\n';
+        const std::string line = fmt::format("{}:{}:{}: {}: {} [{}]", finding.place.source,
+                                             finding.place.line, finding.place.column,
+                                             word(finding.severity), finding.message, finding.rule);
+        // They quote the files, which may hold anything.
+        text += printableText(line) + '\n';
+        if (!finding.suggestion.empty()) text += "    " + printableText(finding.suggestion) + '\n';
     }
     return text;
 }

@@ -12,7 +12,7 @@ namespace cli {
 
 enum class Severity : std::uint8_t {
     Warning,  ///< The driver accepts it, but hardly as it was meant.
-    Error,    ///< The driver refuses it.
+    Error,    ///< The driver refuses it, or every access to it.
 };
 
 /// Where something stands. Lines and columns count from 1, columns in bytes.
@@ -33,6 +33,9 @@ struct Finding {
 };
 
 using Findings = std::vector<Finding>;
+
+void warn(Findings& out, const char* rule, const Place& place, std::string message,
+          std::string suggestion);
 
 int countOf(const Findings& findings, Severity severity);
 

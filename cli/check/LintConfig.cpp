@@ -5,9 +5,10 @@
 
 #include <algorithm>
 #include <charconv>
-#include <map>
+#include <set>
 
 #include "cli/check/NearestName.h"
+#include "cli/check/NodeNumber.h"
 #include "cli/check/NumberText.h"
 
 namespace cli {
@@ -20,11 +21,6 @@ struct Item {
     const ScannedItem& word;
     const ParameterInfo* parameter;  ///< Null for an unknown key.
 };
-
-void warn(Findings& out, const char* rule, const Place& place, std::string message,
-          std::string suggestion) {
-    out.push_back({Severity::Warning, rule, place, std::move(message), std::move(suggestion)});
-}
 
 std::string choicesText(const ParameterInfo& parameter) {
     return fmt::format("choices: {}", fmt::join(parameter.choices, ", "));
@@ -198,6 +194,18 @@ void ignoredText(const ScannedConfig& config, Findings& out) {
     }
 }
 
+/// Each number once, however many keys it is given.
+void unusableNodes(const ScannedConfig& config, Findings& out) {
+    std::set<std::string> seen;
+    for (const ScannedItem& item : config.items) {
+        if (!item.node || !item.value || !seen.insert(*item.node).second) continue;
+        const auto spelled = spelledNode(*item.node);
+        if (spelled != item.node) continue;
+        const std::string fault = nodeFault(readNumber(*spelled).value);
+        if (!fault.empty()) warn(out, "unusable-node", item.place, fault, kUsableNodes);
+    }
+}
+
 /// @return what stands between the first pair of single quotes.
 std::string quotedIn(const std::string& message) {
     const std::size_t open = message.find('\'');
@@ -231,6 +239,7 @@ Findings lintConfig(const ScannedConfig& config, const Description& description)
         for (const auto rule : kRules)
             rule(item, out);
     }
+    unusableNodes(config, out);
     sortByPlace(out);
     return out;
 }

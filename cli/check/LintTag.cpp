@@ -2,28 +2,19 @@
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 
-#include <algorithm>
-
-#include "cli/ValueTypes.h"
 #include "cli/check/LintTags.h"
-#include "cli/check/NearestName.h"
 #include "cli/check/NumberText.h"
+#include "cli/check/TagSpan.h"
 
 namespace cli {
 namespace {
 
 constexpr std::size_t kNodeField = 0;
 constexpr std::size_t kAddressField = 2;
-constexpr std::size_t kTypeField = 3;
 
 /// The areas' address ranges begin a hundred thousand apart; in the five-digit form, ten thousand.
 constexpr long kDecade = 100000;
 constexpr long kShortDecade = 10000;
-
-void warn(Findings& out, const char* rule, const Place& place, std::string message,
-          std::string suggestion) {
-    out.push_back({Severity::Warning, rule, place, std::move(message), std::move(suggestion)});
-}
 
 void unnamedNode(const TagLine& tag, const TagSurroundings& around, Findings& out) {
     const int node = static_cast<int>(readNumber(tag.node()).value);
@@ -104,10 +95,14 @@ bool isBitType(ICU_Type type) {
 
 void ignoredSubIndex(const TagLine& tag, const TagSurroundings& around, Findings& out) {
     const auto subIndex = tag.subIndex();
-    if (!tag.facts || !subIndex || readNumber(*subIndex).value == 0) return;
+    if (!tag.facts || !subIndex) return;
+    const long bit = readNumber(*subIndex).value;
     const AreaInfo* area = around.description.area(tag.area());
-    const bool bitArea = area != nullptr && area->naturalType == "boolean";
-    if (!bitArea && isBitType(tag.facts->type)) return;
+    const bool bitArea = area != nullptr && isBitArea(*area);
+    // Nothing but a bit of a register has a number, and zero is what all others have anyway. A
+    // negative one is worse than without effect where there are bits.
+    const bool bits = isBitType(tag.facts->type);
+    if (bit == 0 || (bits && (!bitArea || bit < 0))) return;
     warn(out, "ignored-subindex", tag.placeOf(kAddressField),
          fmt::format("the sub-index '.{}' has no effect: {}", *subIndex,
                      bitArea ? "an item of the area is a bit already"
@@ -116,37 +111,8 @@ void ignoredSubIndex(const TagLine& tag, const TagSurroundings& around, Findings
                  : fmt::format("write {}, or a data type of bits", tag.address()));
 }
 
-std::uint32_t flagOf(const std::string& name) {
-    for (std::size_t row = 0; row < kValueTypes.size(); ++row) {
-        if (kValueTypes[row].name == name) return std::uint32_t{1} << row;
-    }
-    return 0;
-}
-
-/// A conversion that can't be carried out is found when the tag is read or written, not before.
-void oddConversions(const TagLine& tag, const TagSurroundings& around, Findings& out) {
-    const DataTypeText type = dataTypeText(tag.dataType());
-    std::vector<std::string> names;
-    for (const ConversionInfo& each : around.description.conversions)
-        names.push_back(each.name);
-    for (const std::string& name : type.conversions) {
-        const ConversionInfo* conversion = around.description.conversion(name);
-        if (conversion == nullptr) {
-            const std::string nearest = nearestName(name, names);
-            warn(out, "unknown-conversion", tag.placeOf(kTypeField),
-                 fmt::format("unknown conversion '{}': every access will fail", name),
-                 nearest.empty() ? fmt::format("choices: {}", fmt::join(names, ", "))
-                                 : fmt::format("did you mean '{}'?", nearest));
-        } else if ((conversion->types & flagOf(type.name)) == 0) {
-            warn(out, "unsuitable-conversion", tag.placeOf(kTypeField),
-                 fmt::format("conversion '{}' is not meant for the data type {}", name, type.name),
-                 "'mrtu describe conversions' lists the data types");
-        }
-    }
-}
-
 constexpr void (*kRules[])(const TagLine&, const TagSurroundings&, Findings&) = {
-    unnamedNode, oddNumbers, shortAddress, foreignAddress, ignoredSubIndex, oddConversions,
+    unnamedNode, oddNumbers, shortAddress, foreignAddress, ignoredSubIndex,
 };
 
 }  // namespace
@@ -156,6 +122,8 @@ Findings lintTag(const TagLine& tag, const TagSurroundings& surroundings) {
     if (!tag.wellFormed() || !tag.facts) return out;
     for (const auto rule : kRules)
         rule(tag, surroundings, out);
+    lintAccess(tag, surroundings, out);
+    lintConversions(tag, surroundings, out);
     sortByPlace(out);
     return out;
 }

@@ -15,21 +15,33 @@ namespace cli {
 /// What the tags of a configuration stand on.
 struct TagSurroundings {
     const Description& description;
-    std::set<int> nodes;                ///< The nodes that the configuration names.
-    std::map<int, std::string> models;  ///< Of the named nodes.
-    std::string model;                  ///< Of all other nodes.
+    std::set<int> nodes;                       ///< The nodes that the configuration names.
+    std::map<int, std::string> models;         ///< Of the named nodes.
+    std::string model;                         ///< Of all other nodes.
+    std::map<int, std::string> coilFunctions;  ///< "15" or "05", of nodes with one of their own.
+    std::string coilFunction;                  ///< Of all other nodes.
 
     /// @return the node's model; the first of all for an unknown model name, as drivers do. Null
     /// when the description has no models.
     [[nodiscard]] const ModelInfo* modelOf(int node) const;
+    /// @return the function that writes the node's coils, as the configuration has it.
+    [[nodiscard]] const std::string& coilFunctionOf(int node) const;
 };
 
 /// @return the surroundings that a configuration text makes.
 TagSurroundings surroundingsOf(const std::string& configText, const Description& description);
 
 /// One tag on its own. Rules: unnamed-node, octal-number, not-a-number, short-address,
-/// foreign-address, ignored-subindex, unknown-conversion, unsuitable-conversion.
+/// foreign-address, ignored-subindex, and those of lintAccess() and lintConversions().
 Findings lintTag(const TagLine& tag, const TagSurroundings& surroundings);
+
+// Two parts of lintTag(). REQUIRES: the tag is well-formed and accepted.
+
+/// Rules: empty-tag, negative-subindex, outside-area, unusable-node, repeated-coils.
+void lintAccess(const TagLine& tag, const TagSurroundings& surroundings, Findings& out);
+
+/// Rules: unknown-conversion, impossible-conversion, partial-conversion, unsuitable-conversion.
+void lintConversions(const TagLine& tag, const TagSurroundings& surroundings, Findings& out);
 
 /// Tags against each other. Rules: overlap, shared-register. Each tag is reported once at most,
 /// against the first tag in the text that it meets.

@@ -11,6 +11,15 @@
 
 namespace cli {
 
+/// What came of a conversion that the driver applied to a value of the tag's length.
+struct ConversionFacts {
+    std::string name;
+    bool reads;   ///< It worked on the way from the device.
+    bool writes;  ///< And to the device.
+    int items;
+    int changedItems;  ///< By a read.
+};
+
 /// What the driver says of a tag that it has accepted; see ITag.
 struct TagFacts {
     int node;
@@ -20,6 +29,7 @@ struct TagFacts {
     ICU_Type itemType;
     int length;
     bool readOnly;
+    std::vector<ConversionFacts> conversions;  ///< As the URI lists them; may be missing.
 };
 
 /// A field of a URI without the blanks around it.

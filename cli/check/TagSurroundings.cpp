@@ -1,5 +1,6 @@
 // What the configuration means for its tags.
 #include "cli/ConfigText.h"
+#include "cli/check/ConfigScan.h"
 #include "cli/check/LintTags.h"
 
 namespace cli {
@@ -11,18 +12,32 @@ const ModelInfo* TagSurroundings::modelOf(int node) const {
     return found != nullptr ? found : &description.models.front();
 }
 
+const std::string& TagSurroundings::coilFunctionOf(int node) const {
+    const auto own = coilFunctions.find(node);
+    return own != coilFunctions.end() ? own->second : coilFunction;
+}
+
 TagSurroundings surroundingsOf(const std::string& configText, const Description& description) {
-    TagSurroundings surroundings{description, {}, {}, itemOf(configText, "model").value_or("")};
-    if (surroundings.model.empty()) {
-        const ParameterInfo* parameter = description.parameter("model");
-        if (parameter != nullptr) surroundings.model = parameter->preset;
-    }
+    const ScannedConfig config = scanConfig({}, configText);
+    const auto valueOf = [&config](const std::string& name) {
+        const ScannedItem* item = config.item(name);
+        return item != nullptr ? item->value : std::nullopt;
+    };
+    const auto presetOf = [&description](const char* key) {
+        const ParameterInfo* parameter = description.parameter(key);
+        return parameter != nullptr ? parameter->preset : std::string();
+    };
+    TagSurroundings around{description, {}, {}, valueOf("model").value_or(""), {}, {}};
+    if (around.model.empty()) around.model = presetOf("model");
+    around.coilFunction = valueOf("forceFunction").value_or(presetOf("forceFunction"));
     for (const int node : nodesOf(configText)) {
-        surroundings.nodes.insert(node);
-        const auto own = itemOf(configText, "Node" + std::to_string(node) + "::model");
-        surroundings.models[node] = own.value_or(surroundings.model);
+        const std::string prefix = "Node" + std::to_string(node) + "::";
+        around.nodes.insert(node);
+        around.models[node] = valueOf(prefix + "model").value_or(around.model);
+        const auto coils = valueOf(prefix + "forceFunction");
+        if (coils) around.coilFunctions[node] = *coils;
     }
-    return surroundings;
+    return around;
 }
 
 }  // namespace cli

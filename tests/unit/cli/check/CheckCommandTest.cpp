@@ -114,6 +114,58 @@ TEST_F(CheckCommand, EveryListedSilenceIsFound) {
     }
 }
 
+TEST_F(CheckCommand, WhatCanNeverWorkIsFound) {
+    struct Case {
+        const char* uri;
+        const char* rules;
+    };
+    const Case cases[] = {
+        {"1?HREG?400001?string-0", "empty-tag "},
+        {"1?HREG?400001?int-", "empty-tag "},
+        {"1?OUTP?1?boolean-0", "empty-tag "},
+        {"1?HREG?465536?int", "outside-area "},
+        {"1?HREG?400001?int-1000000000", "outside-area "},
+        {"1?IREG?365535?short-3", "outside-area "},
+        {"1?OUTP?65536?boolean-2", "outside-area "},
+        {"1?HREG?400001.2000000000?boolean", "outside-area "},
+        {"1?HREG?400001?byte-3(swap2)", "impossible-conversion "},
+        {"1?HREG?400001?short(swap4)", "impossible-conversion "},
+        {"1?HREG?400001?int(swap8)", "impossible-conversion "},
+        {"1?HREG?400001?unsignedShort(neg)", "impossible-conversion "},
+        {"1?HREG?400001?short(inv)", "impossible-conversion "},
+        {"1?HREG?400001?uint64(bcd)", "impossible-conversion "},
+        {"1?HREG?400001?short-10(neg)", "partial-conversion "},
+        {"1?HREG?400001?int64-2(neg)", "partial-conversion "},
+        {"1?HREG?400001?byte-10(neg)", ""},
+        {"1?HREG?400001?short(neg)", ""},
+        {"1?HREG?400001?int-4(bcd,swap2,swap4)", ""},
+        {"1?OUTP?1?boolean-3(inv)", ""},
+        {"1?OUTP?5.3?boolean", "ignored-subindex "},
+        {"1?OUTP?5.-3?boolean", "negative-subindex "},
+        {"0?HREG?400001?short", "unnamed-node unusable-node "},
+        {"255?HREG?400001?short", "unnamed-node unusable-node "},
+        {"257?HREG?400001?short", "unnamed-node unusable-node "},
+        {"1?NO?0?unsignedByte", ""},
+        {"1?SP_Baud?0?unsignedInt", ""},
+    };
+    for (const Case& each : cases)
+        EXPECT_EQ(each.rules, rules(kGood + "model=1", {each.uri})) << each.uri;
+    EXPECT_EQ("repeated-coils ", rules(kGood + "forceFunction=05", {"1?OUTP?1?boolean-16"}));
+    EXPECT_EQ("", rules(kGood + "forceFunction=05", {"1?OUTP?1?boolean-8"}));
+}
+
+TEST_F(CheckCommand, WhatFailsWithEveryAccessIsAnError) {
+    EXPECT_EQ(2, check(kGood, {"1?HREG?465536?int"}).code);
+    EXPECT_EQ(2, check(kGood, {"1?HREG?400001?short(swp2)"}).code);
+    EXPECT_EQ(0, check(kGood, {"1?HREG?400001?short-10(neg)"}).code);
+}
+
+TEST_F(CheckCommand, ControlCharactersOfTheFilesStayOffTheTerminal) {
+    const Outcome outcome = check(kGood + "\x1b[2J=1", {"1?HREG\x1b?400001?short"});
+    EXPECT_EQ(std::string::npos, outcome.out.find('\x1b')) << outcome.out;
+    EXPECT_NE(std::string::npos, outcome.out.find("unknown key '\\x1b[2J'")) << outcome.out;
+}
+
 TEST_F(CheckCommand, ZeroBasedModelsShareTheirFiveDigitForms) {
     EXPECT_EQ(rules(kGood + "model=2", {"1?HREG?40010?short", "1?HREG?400010?float"}),
               "short-address overlap ");

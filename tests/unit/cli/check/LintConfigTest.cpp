@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include "cli/check/LintTags.h"
 #include "tests/unit/cli/check/Samples.h"
 
 namespace cli {
@@ -35,6 +36,10 @@ TEST(LintConfig, FindsWhatTheDriverPassesOver) {
         {"CfgVer=1 NodeA::timeout=5", "ignored-node@1:10"},
         {"CfgVer=1 Node99999999999::timeout=5", "ignored-node@1:10"},
         {"CfgVer=1 Node1::uart=com1", "ignored-node@1:10"},
+        {"CfgVer=1 Node255::timeout=5", "unusable-node@1:10"},
+        {"CfgVer=1 Node0::timeout=5\nNode257::timeout=5 Node257::model=1",
+         "unusable-node@1:10 unusable-node@2:1"},
+        {"CfgVer=1 Node254::timeout=5", ""},
         {"CfgVer=1 timeout=0500", "octal-number@1:18"},
         {"CfgVer=1 timeout=0x10", ""},
         {"CfgVer=1 timeout=5s", "not-a-number@1:18"},
@@ -112,6 +117,17 @@ TEST(ConfigRefusal, MissingMarkerIsToBeAddedAtTheStart) {
                                           "Parser: unknown format");
     EXPECT_EQ(finding.place, (Place{"cfg", 1, 1}));
     EXPECT_EQ(finding.suggestion, "begin with CfgVer=1");
+}
+
+TEST(LintConfig, EveryItemOfALongTextIsLookedAtOnce) {
+    // A look at the whole text for each of its items would be forty thousand times a megabyte.
+    std::string text = "CfgVer=1\n";
+    for (int node = 1; node <= 40000; ++node)
+        text += "Node" + std::to_string(node) + "::timeout=5\n";
+    const Findings findings = lint(text);
+    ASSERT_EQ(40000U - 254U, findings.size()) << "numbers that no device has";
+    EXPECT_EQ((Place{"cfg", 40001, 1}), findings.back().place);
+    EXPECT_EQ(40000U, surroundingsOf(text, sampleDescription()).nodes.size());
 }
 
 }  // namespace

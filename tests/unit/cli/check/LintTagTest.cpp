@@ -32,7 +32,7 @@ TEST(LintTag, FindsWhatTheDriverPassesOver) {
         {"0x2?HREG?400001?short", ""},
         {"7?HREG?400001?short", "unnamed-node@1:1"},
         {"01?HREG?400001?short", "octal-number@1:1"},
-        {"one?HREG?400001?short", "unnamed-node@1:1 not-a-number@1:1"},
+        {"one?HREG?400001?short", "unnamed-node@1:1 not-a-number@1:1 unusable-node@1:1"},
         {"1?OUTP?017?boolean", "octal-number@1:8"},
         {"1?OUTP?0?boolean", ""},
         {"1?OUTP?0x10?boolean", ""},
@@ -54,6 +54,10 @@ TEST(LintTag, FindsWhatTheDriverPassesOver) {
         {"1?HREG?400001?short(swp2)", "unknown-conversion@1:15"},
         {"1?HREG?400001?short(swap2,)", "unknown-conversion@1:15"},
         {"1?HREG?400001?unsignedShort(neg)", "unsuitable-conversion@1:15"},
+        {"0?HREG?400001?short", "unnamed-node@1:1 unusable-node@1:1"},
+        {"1?OUTP?5.-1?boolean", "negative-subindex@1:8"},
+        {"1?HREG?400001.-1?boolean", "negative-subindex@1:8"},
+        {"1?HREG?400001.-1?short", "ignored-subindex@1:8"},
     };
     for (const Case& each : cases)
         EXPECT_EQ(lint(each.uri), each.places) << each.uri;

@@ -32,6 +32,8 @@ AreaInfo area(const std::string& name, const std::string& natural, std::uint32_t
     info.naturalType = natural;
     info.types = types;
     info.bitRead = natural == "boolean";
+    info.bitArrayWrite = info.bitRead && !readOnly;
+    info.readCount = info.bitRead ? 2000 : 125;
     info.readOnly = readOnly;
     info.min = min;
     info.max = max;
@@ -50,6 +52,7 @@ Description makeDescription() {
         list("bits", "8", "prop_integer", {"7", "8"}),
         list("stopbits", "1", "prop_integer", {"1", "2"}),
         list("presetFunction", "16", "prop_string", {"06", "16"}),
+        list("forceFunction", "15", "prop_string", {"05", "15"}),
     };
     ParameterInfo model = number("model", "1", true);
     model.type = "prop_modelRef";
@@ -65,7 +68,9 @@ Description makeDescription() {
         area("HREG", "unsignedShort", 0x3dff7ff, false, 400001, 465536),
         area("IREG", "unsignedShort", 0x3dff7ff, true, 300001, 365536),
         area("LONG", "unsignedInt", 0xc80c8, false, 0, 65535),
+        area("NO", "unsignedByte", 0x10, false, 0, 1),
     };
+    description.areas.back().readCount = 1;
     description.tagFields = {{"nodeid", "", ""},
                              {"memorytype", "", ""},
                              {"arrayindex.subindex", "", ""},
@@ -74,7 +79,10 @@ Description makeDescription() {
         {"1", "", {{"OUTP", 1, 65536}, {"HREG", 400001, 465536}, {"IREG", 300001, 365536}}},
         {"3", "", {{"OUTP", 1, 65536}, {"HREG", 400001, 465536}, {"LONG", 0, 65535}}},
     };
-    description.conversions = {{"swap2", "", 0x3fecbec}, {"neg", "", 0x298e18e}};
+    description.conversions = {{"swap2", "", 0x3fecbec},
+                               {"swap4", "", 0x3dc81c8},
+                               {"bcd", "", 0x7e07e},
+                               {"neg", "", 0x298e18e}};
     return description;
 }
 
@@ -95,7 +103,8 @@ TagLine acceptedTag(const std::string& uri, int line, unsigned byteOffset, int b
                          .type = type,
                          .itemType = itemType,
                          .length = length,
-                         .readOnly = readOnly};
+                         .readOnly = readOnly,
+                         .conversions = {}};
     return tag;
 }
 

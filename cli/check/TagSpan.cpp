@@ -1,0 +1,38 @@
+#include "cli/check/TagSpan.h"
+
+#include <algorithm>
+
+#include "cli/ValueTypes.h"
+
+namespace cli {
+namespace {
+
+const ValueType* typeNamed(const std::string& name) {
+    for (const ValueType& row : kValueTypes) {
+        if (row.name == name) return &row;
+    }
+    return nullptr;
+}
+
+}  // namespace
+
+bool isBitArea(const AreaInfo& area) {
+    const ValueType* natural = typeNamed(area.naturalType);
+    return natural != nullptr && natural->type == ICU_Type::boolean;
+}
+
+TagSpan tagSpan(const TagFacts& facts, const AreaInfo& area) {
+    const ICU_Type item = facts.itemType == ICU_Type::none ? facts.type : facts.itemType;
+    const ValueType* natural = typeNamed(area.naturalType);
+    const bool bitArea = isBitArea(area);
+    const long long itemBits = bitArea || natural == nullptr ? 1 : natural->bytes * 8LL;
+    const bool bits = item == ICU_Type::boolean;
+    // In a bit area the driver counts in bytes and the bits within; in registers, in registers.
+    const long long unit = bitArea ? 8 : itemBits;
+    const long long shift = bitArea || bits ? facts.bitIndex : 0;
+    const long long begin = facts.byteOffset * unit + shift;
+    const long long length = bits ? facts.length : facts.length * 8LL;
+    return {item, begin, begin + std::max(length, 0LL), itemBits};
+}
+
+}  // namespace cli
