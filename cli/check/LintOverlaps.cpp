@@ -8,45 +8,20 @@
 #include "cli/ValueTypes.h"
 #include "cli/check/FirstMeetings.h"
 #include "cli/check/LintTags.h"
+#include "cli/check/TagSpan.h"
 
 namespace cli {
 namespace {
 
-/// The bits of an area that a tag stands for, `end` excluded, and the items that hold them.
-struct Span {
+/// What a tag stands for, and the tag.
+struct Span : TagSpan {
     const TagLine* tag;
     std::size_t order;  ///< In the text.
-    ICU_Type item;      ///< Type of one value.
-    long long begin;
-    long long end;
-    long long itemBits;  ///< Of the area.
     bool readOnly;
-
-    [[nodiscard]] bool isBits() const { return item == ICU_Type::boolean; }
-    [[nodiscard]] long long firstItem() const { return begin / itemBits; }
-    [[nodiscard]] long long endItem() const { return (end + itemBits - 1) / itemBits; }
 };
 
-const ValueType* typeNamed(const std::string& name) {
-    for (const ValueType& row : kValueTypes) {
-        if (row.name == name) return &row;
-    }
-    return nullptr;
-}
-
 Span spanOf(const TagLine& tag, std::size_t order, const AreaInfo& area) {
-    const TagFacts& facts = *tag.facts;
-    const ICU_Type item = facts.itemType == ICU_Type::none ? facts.type : facts.itemType;
-    const ValueType* natural = typeNamed(area.naturalType);
-    const bool bitArea = natural != nullptr && natural->type == ICU_Type::boolean;
-    const long long itemBits = bitArea || natural == nullptr ? 1 : natural->bytes * 8LL;
-    const bool bits = item == ICU_Type::boolean;
-    // In a bit area the driver counts in bytes and the bits within; in registers, in registers.
-    const long long unit = bitArea ? 8 : itemBits;
-    const long long shift = bitArea || bits ? facts.bitIndex : 0;
-    const long long begin = facts.byteOffset * unit + shift;
-    const long long length = bits ? facts.length : facts.length * 8LL;
-    return {&tag, order, item, begin, begin + std::max(length, 0LL), itemBits, facts.readOnly};
+    return {tagSpan(*tag.facts, area), &tag, order, tag.facts->readOnly};
 }
 
 std::string describe(const Span& span) {
