@@ -43,7 +43,9 @@ void awaitBytes(int fd, std::chrono::milliseconds silence) {
         ready = ::poll(&waiting, 1, static_cast<int>(silence.count()));
     } while (ready < 0 && errno == EINTR);
     if (ready < 0) refuseByErrno();
-    if (ready == 0) throw FileError(fmt::format("nothing came for {} ms", silence.count()));
+    if (ready == 0)
+        throw FileError(
+            fmt::format("nothing came for {:g} s", std::chrono::duration<double>(silence).count()));
 }
 
 /// @return the bytes read; 0 at the end.

@@ -81,14 +81,14 @@ TEST_F(FileReader, WhatCannotBeReadSaysWhy) {
 }
 
 TEST_F(FileReader, PipeWithoutWriterIsGivenUp) {
-    EXPECT_EQ("nothing came for 1 ms", reasonOf(pipe(), kSmall));
+    EXPECT_EQ("nothing came for 0.001 s", reasonOf(pipe(), kSmall));
 }
 
 TEST_F(FileReader, PipeThatIsNeverClosedIsGivenUp) {
     const std::string path = pipe();
     const runtime::FileDescriptor both(open(path.c_str(), O_RDWR | O_CLOEXEC));
     ASSERT_EQ(3, write(both.get(), "abc", 3));
-    EXPECT_EQ("nothing came for 1 ms", reasonOf(path, kSmall));
+    EXPECT_EQ("nothing came for 0.001 s", reasonOf(path, kSmall));
 }
 
 TEST_F(FileReader, PipeIsReadToItsEnd) {
