@@ -1,6 +1,7 @@
 // The serial port service on POSIX terminals.
 #pragma once
 
+#include <atomic>
 #include <map>
 #include <memory>
 #include <mutex>
@@ -12,16 +13,20 @@ namespace runtime {
 
 class PosixSerialPort;
 
-/// What openPort() and configure() last complained about; shared by a factory and its ports, so
-/// that a port that outlives its factory's interest still has where to write. Threads: any.
+/// What openPort() and configure() last complained about, and whether a port has vanished; shared
+/// by a factory and its ports, so that a port that outlives its factory's interest still has where
+/// to write. Threads: any.
 class SerialErrors {
   public:
     void set(const std::string& text);
     std::string get() const;
+    void notePortGone() { portGone_ = true; }
+    bool portGone() const { return portGone_; }
 
   private:
     mutable std::mutex mutex_;
     std::string text_;
+    std::atomic<bool> portGone_ = false;
 };
 
 /// Opens the ports "com1" to "com16", which a map ties to device files.
@@ -63,6 +68,9 @@ class PosixSerialFactory final : public ISerialFactory {
     /// @return why the last openPort() or configure() failed, e.g.
     /// "com1: /dev/ttyUSB9: No such file or directory"; empty after one that succeeded.
     std::string lastError() const;
+    /// Whether a port vanished (end of file, I/O error, hang-up) while it was open. The interface
+    /// tells a vanished port from a silent one nowhere else.
+    bool portGone() const { return errors_->portGone(); }
 
     void* ConvertTo(const char* name) override;
     const char* GetImpName() const override { return "runtime::PosixSerialFactory"; }

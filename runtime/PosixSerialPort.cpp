@@ -11,8 +11,6 @@
 #include <cstring>
 #include <utility>
 
-#include "runtime/LineTransfer.h"
-
 namespace runtime {
 namespace {
 
@@ -24,13 +22,6 @@ FileDescriptor openTerminal(const std::string& device) {
         fd = ::open(device.c_str(), O_RDWR | O_CLOEXEC | O_NOCTTY | O_NONBLOCK);
     } while (fd < 0 && errno == EINTR);
     return FileDescriptor(fd);
-}
-
-/// The terminal's own exclusiveness does not hold root back; the file lock does. The lock comes
-/// first, so that a loser leaves the winner's terminal untouched.
-bool takeForOurselves(int fd) {
-    if (::flock(fd, LOCK_EX | LOCK_NB) != 0) return false;
-    return ::ioctl(fd, TIOCEXCL) == 0;
 }
 
 /// Pseudo terminals' own ends have the majors 136 to 143 (Linux, devices.txt).
@@ -55,7 +46,26 @@ int setTermios(int fd, const termios& wanted) {
     return result;
 }
 
+void putBackFound(const void* what) noexcept {
+    static_cast<const FoundTerminal*>(what)->putBack();
+}
+
 }  // namespace
+
+void FoundTerminal::putBack() const noexcept {
+    ::tcflush(fd, TCOFLUSH);
+    serial_rs485 now{};
+    // Some drivers move RTS whenever they are told, also when nothing would change.
+    const bool changed =
+        direction && ::ioctl(fd, TIOCGRS485, &now) == 0 && now.flags != direction->flags;
+    if (changed) {
+        serial_rs485 before = *direction;
+        ::ioctl(fd, TIOCSRS485, &before);
+    }
+    setTermios(fd, settings);
+    ::ioctl(fd, TIOCNXCL);
+    ::flock(fd, LOCK_UN);
+}
 
 Result<std::unique_ptr<PosixSerialPort>, std::string> PosixSerialPort::open(
     const PortRequest& request, std::shared_ptr<SerialErrors> errors) {
@@ -65,13 +75,19 @@ Result<std::unique_ptr<PosixSerialPort>, std::string> PosixSerialPort::open(
     FileDescriptor fd = openTerminal(request.device);
     if (!fd) return refusal(errno == EBUSY ? kInUse : std::strerror(errno));
     if (::isatty(fd.get()) == 0) return refusal("not a terminal");
-    if (!takeForOurselves(fd.get())) {
+    // The terminal's own exclusiveness does not hold root back; the file lock does. The lock comes
+    // first, so that a loser leaves the winner's terminal untouched.
+    if (::flock(fd.get(), LOCK_EX | LOCK_NB) != 0) {
         return refusal(errno == EWOULDBLOCK ? kInUse : std::strerror(errno));
     }
     termios found{};
     if (::tcgetattr(fd.get(), &found) != 0) return refusal(std::strerror(errno));
-    return std::unique_ptr<PosixSerialPort>(
+    std::unique_ptr<PosixSerialPort> port(
         new PosixSerialPort(request, std::move(errors), std::move(fd), found));
+    // Last: from here on a signal that ends the process finds the port announced, and the terminal
+    // does not stay closed to everybody.
+    if (::ioctl(port->descriptor(), TIOCEXCL) != 0) return refusal(std::strerror(errno));
+    return port;
 }
 
 PosixSerialPort::PosixSerialPort(const PortRequest& request, std::shared_ptr<SerialErrors> errors,
@@ -81,22 +97,13 @@ PosixSerialPort::PosixSerialPort(const PortRequest& request, std::shared_ptr<Ser
       errors_(std::move(errors)),
       fd_(std::move(fd)),
       line_(fd_.get()),
-      found_(found),
-      foundDirection_(directionOf(fd_.get())),
-      direction_(foundDirection_),
+      found_{fd_.get(), found, directionOf(fd_.get())},
+      putBackAtTheEnd_(putBackFound, &found_),
+      direction_(found_.direction),
       pseudo_(isPseudoTerminal(fd_.get())) {}
 
 PosixSerialPort::~PosixSerialPort() {
-    restore();
-}
-
-/// Nothing here can be reported to anybody, and a port that is gone has nothing to restore.
-void PosixSerialPort::restore() {
-    line_.discardOutput();
-    if (foundDirection_) changeDirection(*foundDirection_);
-    setTermios(fd_.get(), found_);
-    ::ioctl(fd_.get(), TIOCNXCL);
-    ::flock(fd_.get(), LOCK_UN);
+    found_.putBack();
 }
 
 int PosixSerialPort::configure(int baud, int parity, int dataBits, int stopBits, int mode) {
@@ -115,7 +122,7 @@ int PosixSerialPort::configure(int baud, int parity, int dataBits, int stopBits,
 }
 
 std::string PosixSerialPort::applyFormat() {
-    const termios wanted = rawTermios(found_, settings_);
+    const termios wanted = rawTermios(found_.settings, settings_);
     if (setTermios(fd_.get(), wanted) != 0) return std::strerror(errno);
     termios taken{};
     if (::tcgetattr(fd_.get(), &taken) != 0) return std::strerror(errno);
@@ -123,8 +130,8 @@ std::string PosixSerialPort::applyFormat() {
 }
 
 std::string PosixSerialPort::applyDirection() {
-    if (!foundDirection_) return {};
-    if (changeDirection(rs485For(*foundDirection_, settings_.mode))) return {};
+    if (!found_.direction) return {};
+    if (changeDirection(rs485For(*found_.direction, settings_.mode))) return {};
     // A port may answer the question for its direction control and yet have none.
     if (errno == ENOTTY || errno == EOPNOTSUPP || !isHalfDuplex(settings_.mode)) return {};
     return std::string("RS-485 direction control: ") + std::strerror(errno);
@@ -138,12 +145,18 @@ bool PosixSerialPort::changeDirection(serial_rs485 wanted) {
     return true;
 }
 
+/// Tells the factory of a port that has gone. @return whether all was done.
+bool PosixSerialPort::noted(Transfer end) {
+    if (end == Transfer::Gone) errors_->notePortGone();
+    return end == Transfer::Complete;
+}
+
 void PosixSerialPort::purge() {
     line_.discardInput();
 }
 
 int PosixSerialPort::receiveByte(unsigned char* byte, int timeoutMs, int /*reserved*/) {
-    return receiveOne(line_, *byte, Milliseconds{timeoutMs}) == Transfer::Complete ? 1 : 0;
+    return noted(receiveOne(line_, *byte, Milliseconds{timeoutMs})) ? 1 : 0;
 }
 
 int PosixSerialPort::send(const unsigned char* data, int length) {
@@ -152,7 +165,7 @@ int PosixSerialPort::send(const unsigned char* data, int length) {
     const auto count = static_cast<std::size_t>(length);
     const auto character = characterTime(settings_.baud, characterBits(settings_));
     const Transfer end = sendAll(line_, {data, count}, sendingTime(count, character), character);
-    return end == Transfer::Complete ? 1 : 0;
+    return noted(end) ? 1 : 0;
 }
 
 int PosixSerialPort::receiveFrame(unsigned char* data, int maxLength, int timeoutMs, int gapMs,
@@ -161,6 +174,7 @@ int PosixSerialPort::receiveFrame(unsigned char* data, int maxLength, int timeou
     const FrameEnd end = receiveRest(line_, {data, room}, Milliseconds{timeoutMs},
                                      Milliseconds{std::max(gapMs, gapFloorMs_)});
     *received = static_cast<int>(end.count);
+    noted(end.how);
     return end.count > 0 && end.how != Transfer::Gone ? 1 : 0;
 }
 

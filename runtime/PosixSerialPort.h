@@ -10,6 +10,8 @@
 
 #include "platform/ISerialFactory.h"
 #include "runtime/FileDescriptor.h"
+#include "runtime/LastAct.h"
+#include "runtime/LineTransfer.h"
 #include "runtime/PosixLine.h"
 #include "runtime/PosixSerialFactory.h"
 #include "runtime/Result.h"
@@ -24,8 +26,20 @@ struct PortRequest {
     int gapFloorMs = 0;  ///< The shortest silence that ends a frame.
 };
 
+/// What a terminal was like when it was opened.
+struct FoundTerminal {
+    int fd;
+    termios settings;
+    std::optional<serial_rs485> direction;  ///< Nothing for a port without direction control.
+
+    /// Throws away what is still to be sent, puts the settings back and gives the exclusiveness
+    /// up. Nothing of it can be reported to anybody, and a port that is gone has nothing to put
+    /// back. Async-signal-safe.
+    void putBack() const noexcept;
+};
+
 /// A terminal that this object alone has open. Its destruction puts back the settings that were
-/// found and closes it.
+/// found and closes it; so does runLastActs() when a signal ends the process.
 class PosixSerialPort final : public ISerialPort {
   public:
     /// Opens a device exclusively and notes its settings.
@@ -60,16 +74,16 @@ class PosixSerialPort final : public ISerialPort {
     std::string applyFormat();
     std::string applyDirection();
     bool changeDirection(serial_rs485 wanted);
-    void restore();
+    bool noted(Transfer end);
 
     std::string label_;
     int gapFloorMs_;
     std::shared_ptr<SerialErrors> errors_;
     FileDescriptor fd_;
     PosixLine line_;
-    termios found_;
-    std::optional<serial_rs485> foundDirection_;  ///< Nothing for a port without the ability.
-    std::optional<serial_rs485> direction_;       ///< In force now.
+    const FoundTerminal found_;
+    LastAct putBackAtTheEnd_;
+    std::optional<serial_rs485> direction_;  ///< In force now.
     bool pseudo_;
     SerialSettings settings_;
 };

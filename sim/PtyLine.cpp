@@ -2,7 +2,6 @@
 
 #include <fcntl.h>
 #include <stdlib.h>
-#include <sys/stat.h>
 #include <termios.h>
 #include <unistd.h>
 
@@ -51,11 +50,6 @@ Descriptor openDevice(const std::string& device) {
     return terminal;
 }
 
-bool isLink(const std::string& path) {
-    struct stat status {};
-    return ::lstat(path.c_str(), &status) == 0 && S_ISLNK(status.st_mode);
-}
-
 bool pointsTo(const std::string& link, const std::string& target) {
     std::array<char, 128> found{};
     const ssize_t length = ::readlink(link.c_str(), found.data(), found.size());
@@ -86,7 +80,7 @@ PtyLine::PtyLine(std::string link)
 }
 
 void PtyLine::makeLink() {
-    if (isLink(link_)) ::unlink(link_.c_str());
+    // What is there is somebody's, also a link: a killed simulator's looks like any other.
     if (::symlink(device_.c_str(), link_.c_str()) != 0) fail(link_);
 }
 

@@ -30,8 +30,8 @@ class Descriptor {
 class PtyLine {
   public:
     /// Opens the line.
-    /// @param link  Path of a symbolic link to the device; an old link there is replaced, anything
-    ///              else is refused. Empty: none.
+    /// @param link  Path of a symbolic link to the device; whatever is there already, an old link
+    ///              too, is refused and left alone. Empty: none.
     /// Errors: std::system_error; nothing stays behind.
     explicit PtyLine(std::string link = {});
     /// Hangs up.

@@ -106,10 +106,11 @@ TEST_F(PtyLineTest, LinkLeadsToTheDeviceAndGoesWithTheLine) {
     EXPECT_FALSE(fs::is_symlink(linkPath()));
 }
 
-TEST_F(PtyLineTest, AnOldLinkIsReplaced) {
+/// Somebody's name for a real port would else lead to the simulator from then on.
+TEST_F(PtyLineTest, ALinkThatItDidNotMakeIsRefusedAndKept) {
     fs::create_symlink("/nowhere", linkPath());
-    const PtyLine line(linkPath());
-    EXPECT_EQ(fs::read_symlink(linkPath()), line.device());
+    EXPECT_THROW(PtyLine{linkPath()}, std::system_error);
+    EXPECT_EQ(fs::read_symlink(linkPath()), "/nowhere");
 }
 
 TEST_F(PtyLineTest, AFileInPlaceOfTheLinkIsRefusedAndKept) {
@@ -121,6 +122,7 @@ TEST_F(PtyLineTest, AFileInPlaceOfTheLinkIsRefusedAndKept) {
 
 TEST_F(PtyLineTest, ALinkThatAnotherLineHasTakenIsLeftToIt) {
     PtyLine first(linkPath());
+    fs::remove(linkPath());
     const PtyLine second(linkPath());
     first.hangUp();
     EXPECT_EQ(fs::read_symlink(linkPath()), second.device());
