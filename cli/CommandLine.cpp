@@ -28,6 +28,7 @@ Exit codes:
   3  the serial port can't be opened, or is gone
   4  no response
   5  bad reply or exception
+  128 + n  ended by signal n: 130 Ctrl-C, 143 SIGTERM, 129 SIGHUP
 Of several failing URIs the first one's code counts.)";
 
 void addCommands(CLI::App& app, CommandContext& context) {

@@ -1,10 +1,14 @@
 #include "cli/LineEditor.h"
 
 #include <histedit.h>
+#include <termios.h>
 #include <unistd.h>
 
 #include <cstdio>
 #include <iostream>
+
+#include "cli/EndSignals.h"
+#include "runtime/LastAct.h"
 
 namespace cli {
 namespace {
@@ -22,6 +26,22 @@ class PipedLines final : public LineSource {
     [[nodiscard]] bool interactive() const override { return false; }
 };
 
+/// The terminal as a person had it before the editing of lines made it raw.
+class TypedTerminal {
+  public:
+    TypedTerminal() : known_(tcgetattr(STDIN_FILENO, &settings_) == 0) {}
+
+  private:
+    static void putBack(const void* what) noexcept {
+        const auto& self = *static_cast<const TypedTerminal*>(what);
+        if (self.known_) tcsetattr(STDIN_FILENO, TCSANOW, &self.settings_);
+    }
+
+    termios settings_{};
+    bool known_;
+    runtime::LastAct putBackAtTheEnd_{putBack, this};
+};
+
 class EditedLines final : public LineSource {
   public:
     explicit EditedLines(const char* prompt)
@@ -33,7 +53,7 @@ class EditedLines final : public LineSource {
         el_set(editor_, EL_PROMPT, promptOf);
         el_set(editor_, EL_EDITOR, "emacs");
         el_set(editor_, EL_HIST, history, history_);
-        el_set(editor_, EL_SIGNAL, 1);  // Ctrl-C must not leave the terminal raw.
+        el_set(editor_, EL_SIGNAL, 1);  // Ctrl-Z must not leave the terminal raw.
     }
     ~EditedLines() override {
         el_end(editor_);
@@ -59,11 +79,15 @@ class EditedLines final : public LineSource {
 
   private:
     static char* promptOf(EditLine* editor) {
+        // The editor catches these too, but passes them on to the whole process group, and so to a
+        // script that runs this command. It asks for the prompt when its handlers stand.
+        retakeEndSignals();
         void* prompt = nullptr;
         el_get(editor, EL_CLIENTDATA, &prompt);
         return static_cast<char*>(prompt);
     }
 
+    const TypedTerminal terminal_;  // Before the editor changes it.
     EditLine* editor_;
     History* history_;
 };

@@ -111,7 +111,7 @@ Session::Session(const CommandContext& context, const LineOptions& options)
 Session::~Session() = default;
 
 bool Session::portGone() const {
-    return parts_->portGone;
+    return parts_->portGone || parts_->serial.portGone();
 }
 
 ExitCode Session::exitCodeFor(const runtime::ChannelError& error) const {

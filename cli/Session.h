@@ -31,7 +31,7 @@ class Session {
 
     runtime::Channel& channel();
 
-    /// Tells whether a frame could not be sent or was cut short because the port vanished.
+    /// Tells whether the port vanished, or did not take a frame.
     [[nodiscard]] bool portGone() const;
     /// @return the exit code of a failed read or write: Port when the port is gone, else as the
     /// driver's error code says.

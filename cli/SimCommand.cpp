@@ -2,11 +2,14 @@
 #include <signal.h>
 
 #include <CLI/CLI.hpp>
+#include <array>
 #include <atomic>
+#include <iterator>
 #include <memory>
 #include <ostream>
 
 #include "cli/Commands.h"
+#include "cli/EndSignals.h"
 #include "cli/SimNodes.h"
 #include "sim/Simulator.h"
 
@@ -36,27 +39,31 @@ extern "C" void endServing(int) {
     if (sim::Simulator* const simulator = g_serving.load()) simulator->requestStop();
 }
 
-/// Lets SIGINT and SIGTERM end the simulator while this object lives.
+/// Lets the end signals stop the simulator while this object lives: it takes its link away, and the
+/// command has done what it was asked for.
 class StopOnSignal {
   public:
     explicit StopOnSignal(sim::Simulator& simulator) {
         g_serving.store(&simulator);
         struct sigaction action {};
         action.sa_handler = endServing;
-        sigaction(SIGINT, &action, &oldInterrupt_);
-        sigaction(SIGTERM, &action, &oldTerminate_);
+        for (std::size_t i = 0; i < old_.size(); ++i) {
+            taken_[i] = !isIgnored(kEndSignals[i]);
+            if (taken_[i]) sigaction(kEndSignals[i], &action, &old_[i]);
+        }
     }
     ~StopOnSignal() {
-        sigaction(SIGINT, &oldInterrupt_, nullptr);
-        sigaction(SIGTERM, &oldTerminate_, nullptr);
+        for (std::size_t i = 0; i < old_.size(); ++i) {
+            if (taken_[i]) sigaction(kEndSignals[i], &old_[i], nullptr);
+        }
         g_serving.store(nullptr);
     }
     StopOnSignal(const StopOnSignal&) = delete;
     StopOnSignal& operator=(const StopOnSignal&) = delete;
 
   private:
-    struct sigaction oldInterrupt_ {};
-    struct sigaction oldTerminate_ {};
+    std::array<struct sigaction, std::size(kEndSignals)> old_{};
+    std::array<bool, std::size(kEndSignals)> taken_{};
 };
 
 std::vector<sim::NodeOptions> nodesOf(const SimOptions& options) {

@@ -5,6 +5,7 @@
 #include <iostream>
 
 #include "cli/Command.h"
+#include "cli/EndSignals.h"
 
 namespace {
 
@@ -23,5 +24,6 @@ int main(int argc, char** argv) {
     occupyStandardStreams();
     // A reader that has gone is a failed write, not the end: the port is still to be put back.
     std::signal(SIGPIPE, SIG_IGN);
+    cli::endOnSignals();
     return cli::runCommandLine(argc, argv, std::cout, std::cerr);
 }

@@ -24,7 +24,15 @@ using Clock = std::chrono::steady_clock;
 constexpr std::chrono::seconds kPatience{60};
 constexpr uid_t kNobody = 65534;
 
-[[noreturn]] void exec(const std::vector<std::string>& words) {
+/// However the test program was started: a script's background jobs ignore SIGINT.
+void heedEndSignals() {
+    for (const int number : {SIGINT, SIGTERM, SIGHUP})
+        signal(number, SIG_DFL);
+}
+
+[[noreturn]] void exec(const std::vector<std::string>& words, int ignoredSignal = 0) {
+    heedEndSignals();
+    if (ignoredSignal != 0) signal(ignoredSignal, SIG_IGN);
     std::vector<char*> arguments{const_cast<char*>("mrtu")};
     for (const std::string& word : words)
         arguments.push_back(const_cast<char*>(word.c_str()));
@@ -102,6 +110,10 @@ struct Scratch {
 void prepareChild(const RunOptions& options) {
     setenv("XDG_STATE_HOME", scratchFolder().c_str(), 1);
     setenv("TZ", "UTC", 1);
+    for (const auto& [name, value] : options.environment)
+        setenv(name.c_str(), value.c_str(), 1);
+    for (const std::string& name : options.unset)
+        unsetenv(name.c_str());
     if (options.unprivileged && geteuid() == 0 &&
         (setresgid(kNobody, kNobody, kNobody) != 0 || setresuid(kNobody, kNobody, kNobody) != 0)) {
         _exit(126);
@@ -130,13 +142,13 @@ void writeFile(const std::string& path, const std::string& text) {
     std::ofstream(path, std::ios::binary) << text;
 }
 
-Outcome mrtu(const std::vector<std::string>& words, const RunOptions& options) {
+RunningCommand::RunningCommand(const std::vector<std::string>& words, const RunOptions& options) {
     scratchFolder();
     const Pipe in;
     const Pipe out;
     const Pipe err;
-    const pid_t pid = fork();
-    if (pid == 0) {
+    pid_ = fork();
+    if (pid_ == 0) {
         dup2(in.reading, 0);
         dup2(err.writing, 2);
         if (options.outClosed) {
@@ -147,21 +159,42 @@ Outcome mrtu(const std::vector<std::string>& words, const RunOptions& options) {
             dup2(out.writing, 1);
         }
         prepareChild(options);
-        exec(words);
+        exec(words, options.ignoredSignal);
     }
     close(in.reading);
     close(out.writing);
     close(err.writing);
+    in_ = in.writing;
+    out_ = out.reading;
+    err_ = err.reading;
     // Shorter than a pipe holds: no write blocks here.
-    EXPECT_EQ(write(in.writing, options.input.data(), options.input.size()),
+    EXPECT_EQ(write(in_, options.input.data(), options.input.size()),
               static_cast<ssize_t>(options.input.size()));
-    close(in.writing);
+}
+
+RunningCommand::~RunningCommand() {
+    if (pid_ <= 0) return;
+    kill(pid_, SIGKILL);
+    end();
+}
+
+void RunningCommand::send(int signal) const {
+    EXPECT_EQ(kill(pid_, signal), 0);
+}
+
+Outcome RunningCommand::end() {
+    close(in_);
     Outcome outcome;
-    collect(pid, out.reading, err.reading, outcome);
-    close(out.reading);
-    close(err.reading);
-    outcome.exitCode = exitCodeOf(pid);
+    collect(pid_, out_, err_, outcome);
+    close(out_);
+    close(err_);
+    outcome.exitCode = exitCodeOf(pid_);
+    pid_ = -1;
     return outcome;
+}
+
+Outcome mrtu(const std::vector<std::string>& words, const RunOptions& options) {
+    return RunningCommand(words, options).end();
 }
 
 RunningSim::RunningSim(const std::vector<std::string>& words) {
@@ -210,6 +243,8 @@ TerminalSession::TerminalSession(const std::vector<std::string>& words) {
         prepareChild({});
         exec(words);
     }
+    // Without a second holder of this end the kernel would forget its settings with the process.
+    watch_ = open(ptsname(terminal_), O_RDWR | O_NOCTTY | O_CLOEXEC);
 }
 
 TerminalSession::~TerminalSession() {
@@ -217,7 +252,18 @@ TerminalSession::~TerminalSession() {
         kill(pid_, SIGKILL);
         end();
     }
+    close(watch_);
     close(terminal_);
+}
+
+void TerminalSession::send(int signal) const {
+    EXPECT_EQ(kill(pid_, signal), 0);
+}
+
+termios TerminalSession::settings() const {
+    termios now{};
+    EXPECT_EQ(tcgetattr(watch_, &now), 0);
+    return now;
 }
 
 void TerminalSession::type(const std::string& keys) {
@@ -239,7 +285,12 @@ bool TerminalSession::shows(const std::string& text) {
 
 int TerminalSession::end() {
     // The kernel keeps the process in its last write until somebody reads the terminal.
-    while (drain(terminal_, screen_)) {
+    siginfo_t ended{};
+    while (waitid(P_PID, static_cast<id_t>(pid_), &ended, WEXITED | WNOHANG | WNOWAIT) == 0 &&
+           ended.si_pid == 0) {
+        pollfd shown{terminal_, POLLIN, 0};
+        constexpr int kLookAgainMs = 20;
+        if (poll(&shown, 1, kLookAgainMs) > 0 && !drain(terminal_, screen_)) break;
     }
     const int code = exitCodeOf(pid_);
     pid_ = -1;

@@ -2,8 +2,10 @@
 #pragma once
 
 #include <sys/types.h>
+#include <termios.h>
 
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace cli_test {
@@ -19,6 +21,29 @@ struct RunOptions {
     std::string outFile{};      ///< Where standard output goes instead of Outcome::out.
     bool outClosed = false;     ///< The process starts without a standard output.
     bool unprivileged = false;  ///< Root's tests run it as somebody who may do little.
+    int ignoredSignal = 0;      ///< As `nohup` does with SIGHUP; the other end signals are heeded.
+    std::vector<std::pair<std::string, std::string>> environment{};  ///< Variables to set ...
+    std::vector<std::string> unset{};                                ///< ... and to take away.
+};
+
+/// `mrtu` in the background; its standard input ends with end(). Killed by the destructor at the
+/// latest.
+class RunningCommand {
+  public:
+    explicit RunningCommand(const std::vector<std::string>& words, const RunOptions& options = {});
+    ~RunningCommand();
+    RunningCommand(const RunningCommand&) = delete;
+    RunningCommand& operator=(const RunningCommand&) = delete;
+
+    void send(int signal) const;
+    /// Waits for the end, at most a minute.
+    Outcome end();
+
+  private:
+    pid_t pid_ = -1;
+    int in_ = -1;
+    int out_ = -1;
+    int err_ = -1;
 };
 
 /// Runs `mrtu` with these words and waits for its end, at most a minute. The default storage lies
@@ -63,6 +88,9 @@ class TerminalSession {
     TerminalSession& operator=(const TerminalSession&) = delete;
 
     void type(const std::string& keys);
+    void send(int signal) const;
+    /// The terminal's settings at this moment; they outlast the process.
+    termios settings() const;
     /// Reads until the screen has shown `text` behind what was waited for before.
     /// @return false when it does not come within a minute.
     bool shows(const std::string& text);
@@ -72,6 +100,7 @@ class TerminalSession {
   private:
     pid_t pid_ = -1;
     int terminal_ = -1;
+    int watch_ = -1;
     std::string screen_;
     std::size_t seen_ = 0;
 };

@@ -60,6 +60,15 @@ TEST(Port, ThatVanishesIsNoSilentDevice) {
     EXPECT_EQ(sim.end(0), 3);
 }
 
+/// No further attempt finds the port gone when the only one waited for its reply.
+TEST(Port, ThatVanishesUnderTheOnlyAttemptIsNoSilentDevice) {
+    cli_test::RunningSim sim({"--fault", "hangup"});
+    const Outcome outcome = mrtu({"read", "--port", sim.device(), "--set", "repeat=0", kUri});
+    EXPECT_EQ(outcome.err, "mrtu: " + kUri + ": error -4: No response\nmrtu: the port is gone\n");
+    EXPECT_EQ(outcome.exitCode, 3);
+    EXPECT_EQ(sim.end(0), 3);
+}
+
 TEST(Port, WithBaudRateZeroCannotBeOpened) {
     const Outcome outcome = mrtu({"read", "--sim", "--baud", "0", kUri});
     EXPECT_EQ(outcome.err.rfind("mrtu: Can't open serial port", 0), 0U) << outcome.err;

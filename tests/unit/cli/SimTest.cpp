@@ -21,8 +21,8 @@ TEST(Sim, AnnouncesItsDeviceAndAnExampleThatWorks) {
     EXPECT_EQ(outcome.out, "17?HREG?400001?unsignedShort = 17000\n") << outcome.err;
 }
 
-TEST(Sim, EndsWithEitherSignalAndTakesItsLinkAway) {
-    for (const int signal : {SIGINT, SIGTERM}) {
+TEST(Sim, EndsWithAnEndSignalAndTakesItsLinkAway) {
+    for (const int signal : {SIGINT, SIGTERM, SIGHUP}) {
         const std::string link = cli_test::scratchFile("line");
         RunningSim sim({"--link", link});
         EXPECT_EQ(sim.device(), link);
@@ -61,6 +61,15 @@ TEST(Sim, DoesNotReplaceAFileByItsLink) {
     EXPECT_EQ(outcome.exitCode, 3);
     EXPECT_NE(outcome.err.find(file), std::string::npos) << outcome.err;
     EXPECT_EQ(cli_test::contentsOf(file), "kept");
+}
+
+TEST(Sim, DoesNotReplaceALinkThatItDidNotMake) {
+    const std::string link = cli_test::scratchFile("real_port");
+    std::filesystem::create_symlink("/dev/ttyUSB7", link);
+    const auto outcome = mrtu({"sim", "--link", link});
+    EXPECT_EQ(outcome.exitCode, 3);
+    EXPECT_NE(outcome.err.find(link + ": File exists"), std::string::npos) << outcome.err;
+    EXPECT_EQ(std::filesystem::read_symlink(link), "/dev/ttyUSB7");
 }
 
 }  // namespace
