@@ -56,6 +56,11 @@ std::optional<std::string> SqliteDatabase::answer(const char* sql) {
     return question.text(0);
 }
 
+void SqliteDatabase::rollBack() {
+    failure_ = Failure{code(), message()};
+    execute("ROLLBACK");
+}
+
 void SqliteDatabase::checkpointOnClose(bool on) {
     sqlite3_db_config(database_.get(), SQLITE_DBCONFIG_NO_CKPT_ON_CLOSE, on ? 0 : 1, nullptr);
 }

@@ -59,6 +59,11 @@ class SqliteDatabase {
     };
     // Before the statements, so that it is closed after them.
     std::unique_ptr<sqlite3, Closer> database_;
+    struct Failure {
+        int code;
+        std::string text;
+    };
+    std::optional<Failure> failure_;  ///< Of a transaction that was rolled back.
 
   public:
     /// @param uri  A "file:" URI.
@@ -71,14 +76,18 @@ class SqliteDatabase {
     std::optional<std::string> answer(const char* sql);
 
     sqlite3* get() const { return database_.get(); }
-    int code() const { return sqlite3_extended_errcode(database_.get()); }
-    std::string message() const { return sqlite3_errmsg(database_.get()); }
+    int code() const { return failure_ ? failure_->code : sqlite3_extended_errcode(get()); }
+    std::string message() const { return failure_ ? failure_->text : sqlite3_errmsg(get()); }
     bool readOnly() const { return sqlite3_db_readonly(database_.get(), "main") == 1; }
 
     /// Whether the last connection copies the write-ahead log into the database when it closes.
     void checkpointOnClose(bool on);
 
-    SqliteStatement put, take, remove, count, nameAt, allSections, allEntries;
+    /// Ends an open transaction without its changes. code() and message() stay what they were.
+    void rollBack();
+
+    SqliteStatement put, take, remove, allSections, allEntries;
+    SqliteStatement changes;  ///< A number that other connections' commits change.
 };
 
 /// @return a "file:" URI of a path, with what has a meaning in URIs escaped.

@@ -1,4 +1,4 @@
-// Opening a storage file: created when missing, and touched only when it is sound and ours.
+// Opening a storage file: touched only when it is sound and ours.
 #pragma once
 
 #include <memory>
@@ -10,9 +10,13 @@
 
 namespace runtime {
 
-/// Does what SqliteStorage::open() promises.
-/// @return the open database with its statements prepared.
-Result<std::unique_ptr<SqliteDatabase>, StorageError> openStorageDatabase(const std::string& path,
-                                                                          int busyTimeoutMs);
+struct OpenedStorage {
+    std::unique_ptr<SqliteDatabase> database;  ///< With its statements prepared.
+    std::string whyReadOnly;                   ///< Empty when it can be written.
+};
+
+/// Opens a file that is there; an empty one is furnished, one of an earlier layout brought up to
+/// date. Otherwise as SqliteStorage::open().
+Result<OpenedStorage, StorageError> openStorageDatabase(const std::string& path, int busyTimeoutMs);
 
 }  // namespace runtime

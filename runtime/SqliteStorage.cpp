@@ -1,24 +1,13 @@
 #include "runtime/SqliteStorage.h"
 
-#include <algorithm>
-#include <limits>
 #include <utility>
 
 #include "runtime/SqliteDatabase.h"
+#include "runtime/SqliteFile.h"
 #include "runtime/SqliteOpen.h"
 
 namespace runtime {
 namespace {
-
-/// The columns `type` and `value` of the present row, 0 and 1.
-StoredValue valueIn(const SqliteStatement& row) {
-    const std::string type = row.text(0);
-    if (type == "text") return row.text(1);
-    if (type == "bool") return row.number(1) != 0;
-    constexpr sqlite3_int64 kLeast = std::numeric_limits<int>::min();
-    constexpr sqlite3_int64 kMost = std::numeric_limits<int>::max();
-    return static_cast<int>(std::clamp(row.number(1), kLeast, kMost));
-}
 
 std::string place(const char* section, const char* key) {
     return std::string("'") + section + "', '" + key + "'";
@@ -27,23 +16,62 @@ std::string place(const char* section, const char* key) {
 }  // namespace
 
 Result<std::unique_ptr<SqliteStorage>, StorageError> SqliteStorage::open(const std::string& path,
-                                                                         int busyTimeoutMs) {
-    auto database = openStorageDatabase(path, busyTimeoutMs);
-    if (!database) return database.error();
-    return std::unique_ptr<SqliteStorage>(new SqliteStorage(std::move(database).value(), path));
+                                                                         int busyTimeoutMs,
+                                                                         StorageJudge judge) {
+    if (path.empty()) return StorageError{StorageFault::CannotOpen, "no storage file is named"};
+    std::unique_ptr<SqliteStorage> storage(
+        new SqliteStorage(path, busyTimeoutMs, std::move(judge)));
+    if (isMissingOrEmpty(path)) return storage;
+    if (auto fault = createMissing(path)) return *fault;  // Where it can't be, the reason is known.
+    auto opened = openStorageDatabase(path, busyTimeoutMs);
+    if (!opened) return opened.error();
+    storage->database_ = std::move(opened.value().database);
+    storage->whyReadOnly_ = opened.value().whyReadOnly;
+    return storage;
 }
 
-SqliteStorage::SqliteStorage(std::unique_ptr<SqliteDatabase> database, std::string path)
-    : database_(std::move(database)), path_(std::move(path)) {}
+SqliteStorage::SqliteStorage(std::string path, int busyTimeoutMs, StorageJudge judge)
+    : path_(std::move(path)), busyTimeoutMs_(busyTimeoutMs), judge_(std::move(judge)) {}
 
 SqliteStorage::~SqliteStorage() = default;
 
-bool SqliteStorage::readOnly() const {
+std::string SqliteStorage::whyReadOnly() const {
     const std::lock_guard guard(mutex_);
-    return database_->readOnly();
+    return whyReadOnly_;
 }
 
-/// Notes the first failure. REQUIRES: the mutex is held.
+/// REQUIRES: the mutex is held; so for all below that does not take it.
+bool SqliteStorage::openNow() {
+    auto opened = openStorageDatabase(path_, busyTimeoutMs_);
+    if (!opened) {
+        if (failure_.empty()) failure_ = opened.error().text;
+        return false;
+    }
+    database_ = std::move(opened.value().database);
+    whyReadOnly_ = opened.value().whyReadOnly;
+    return true;
+}
+
+/// Another process may have made the file in the meantime.
+bool SqliteStorage::isThere() {
+    if (database_ != nullptr) return true;
+    return !isMissingOrEmpty(path_) && openNow();
+}
+
+bool SqliteStorage::isWritable(const std::string& what) {
+    if (database_ == nullptr) {
+        if (const auto fault = createMissing(path_)) {
+            if (failure_.empty()) failure_ = fault->text;
+            return false;
+        }
+        if (!openNow()) return false;
+    }
+    if (whyReadOnly_.empty()) return true;
+    fail(what + ": attempt to write a readonly database (" + whyReadOnly_ + ")");
+    return false;
+}
+
+/// Notes the first failure.
 void SqliteStorage::fail(const std::string& what) {
     if (failure_.empty()) failure_ = path_ + ": " + what;
 }
@@ -60,7 +88,8 @@ bool SqliteStorage::complete(const char* section, const char* key) {
 
 void SqliteStorage::write(const char* section, const char* key, const StoredValue& value) {
     const std::lock_guard guard(mutex_);
-    if (!complete(section, key)) return;
+    if (!complete(section, key) || !isWritable("writing " + place(section, key))) return;
+    names_.clear();
     const SqliteUse put(database_->put);
     put->bind(1, section);
     put->bind(2, key);
@@ -92,87 +121,13 @@ void SqliteStorage::writeInt(const char* section, const char* key, int value) {
 
 void SqliteStorage::removeKey(const char* section, const char* key) {
     const std::lock_guard guard(mutex_);
-    if (!complete(section, key)) return;
+    if (!complete(section, key) || !isThere()) return;
+    if (!isWritable("removing " + place(section, key))) return;
+    names_.clear();
     const SqliteUse remove(database_->remove);
     remove->bind(1, section);
     remove->bind(2, key);
     if (remove->step() != SQLITE_DONE) failStep("removing " + place(section, key));
-}
-
-bool SqliteStorage::find(const char* section, const char* key, StoredValue& value) {
-    const std::lock_guard guard(mutex_);
-    if (!complete(section, key)) return false;
-    const SqliteUse take(database_->take);
-    take->bind(1, section);
-    take->bind(2, key);
-    const int code = take->step();
-    if (code == SQLITE_ROW) {
-        value = valueIn(database_->take);
-        return true;
-    }
-    if (code != SQLITE_DONE) failStep("reading " + place(section, key));
-    return false;
-}
-
-bool SqliteStorage::findName(const char* section, int index, std::string& name) {
-    const std::lock_guard guard(mutex_);
-    if (!complete(section, "") || index < 0) return false;
-    const SqliteUse nameAt(database_->nameAt);
-    nameAt->bind(1, section);
-    nameAt->bind(2, index);
-    const int code = nameAt->step();
-    if (code == SQLITE_ROW) {
-        name = nameAt->text(0);
-        return true;
-    }
-    if (code != SQLITE_DONE) failStep("listing '" + std::string(section) + "'");
-    return false;
-}
-
-const char* SqliteStorage::readString(const char* section, const char* key) {
-    StoredValue value;
-    return keptForThread(find(section, key, value) ? storedText(value) : std::string());
-}
-
-bool SqliteStorage::readBool(const char* section, const char* key) {
-    StoredValue value;
-    return find(section, key, value) && storedBool(value);
-}
-
-int SqliteStorage::readInt(const char* section, const char* key) {
-    StoredValue value;
-    return find(section, key, value) ? storedInt(value) : 0;
-}
-
-int SqliteStorage::hasKey(const char* section, const char* key) {
-    StoredValue value;
-    return find(section, key, value) ? 1 : 0;
-}
-
-int SqliteStorage::keyCount(const char* section) {
-    const std::lock_guard guard(mutex_);
-    if (!complete(section, "")) return 0;
-    const SqliteUse count(database_->count);
-    count->bind(1, section);
-    if (count->step() == SQLITE_ROW) return static_cast<int>(count->number(0));
-    failStep("counting '" + std::string(section) + "'");
-    return 0;
-}
-
-const char* SqliteStorage::keyName(const char* section, int index) {
-    std::string name;
-    findName(section, index, name);
-    return keptForThread(name);
-}
-
-int SqliteStorage::readStringInto(const char* section, const char* key, char* buffer, int size) {
-    StoredValue value;
-    return find(section, key, value) ? copyInto(storedText(value), buffer, size) : 0;
-}
-
-int SqliteStorage::keyNameInto(const char* section, int index, char* buffer, int size) {
-    std::string name;
-    return findName(section, index, name) ? copyInto(name, buffer, size) : 0;
 }
 
 bool SqliteStorage::failed() const {
@@ -188,30 +143,6 @@ std::string SqliteStorage::lastError() const {
 void SqliteStorage::clearFailure() {
     const std::lock_guard guard(mutex_);
     failure_.clear();
-}
-
-std::vector<std::string> SqliteStorage::sections() {
-    const std::lock_guard guard(mutex_);
-    const SqliteUse all(database_->allSections);
-    std::vector<std::string> names;
-    int code = all->step();
-    for (; code == SQLITE_ROW; code = all->step())
-        names.push_back(all->text(0));
-    if (code != SQLITE_DONE) failStep("listing the sections");
-    return names;
-}
-
-std::vector<StoredEntry> SqliteStorage::entries(const std::string& section) {
-    const std::lock_guard guard(mutex_);
-    const SqliteUse all(database_->allEntries);
-    all->bind(1, section);
-    std::vector<StoredEntry> found;
-    int code = all->step();
-    for (; code == SQLITE_ROW; code = all->step()) {
-        found.push_back({all->text(2), valueIn(database_->allEntries)});
-    }
-    if (code != SQLITE_DONE) failStep("listing '" + section + "'");
-    return found;
 }
 
 void* SqliteStorage::ConvertTo(const char* name) {

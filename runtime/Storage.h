@@ -1,6 +1,7 @@
 // What the run time's permanent storages offer beyond the driver's interface.
 #pragma once
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -13,6 +14,16 @@ struct StoredEntry {
     std::string key;
     StoredValue value;
 };
+
+/// An entry that is there and must not be used: its readers find nothing.
+struct UnusedEntry {
+    std::string key;
+    std::string why;  ///< One line for a person.
+};
+
+/// Looks at a stored value before it is used.
+/// @return why it must not be; empty when it may.
+using StorageJudge = std::function<std::string(const std::string& key, const StoredValue& value)>;
 
 /// The writes of IPermanentStorage return nothing, so that a refusal has to be asked for here.
 /// Values may be read as another type than they were written; runtime/StoredValue.h tells how.
@@ -31,6 +42,9 @@ class Storage : public IPermanentStorage2 {
     virtual std::vector<std::string> sections() = 0;
     /// @return every key of a section with its value, ordered byte by byte.
     virtual std::vector<StoredEntry> entries(const std::string& section) = 0;
+    /// @return what is kept from the readers of a section, ordered byte by byte. removeKey() takes
+    /// such entries away, too, and a write replaces them.
+    virtual std::vector<UnusedEntry> unused(const std::string& /*section*/) { return {}; }
 
   protected:
     /// Keeps a text until the calling thread's next call of this.

@@ -3,6 +3,7 @@
 #include <sys/resource.h>
 
 #include <csignal>
+#include <set>
 
 #include "tests/line/StorageFile.h"
 #include "tests/unit/runtime/StorageContract.h"
@@ -56,6 +57,7 @@ TEST_F(StorageFileTest, ShellShowsSectionKeyTypeAndValue) {
 
 TEST_F(StorageFileTest, WritesGoThroughALogThatIsSynced) {
     const auto storage = open();
+    storage->writeInt("s", "k", 1);
     EXPECT_EQ(ask("PRAGMA journal_mode"), "wal\n");
     EXPECT_FALSE(storage->readOnly());
 }
@@ -100,8 +102,33 @@ TEST_F(StorageFileTest, LeadingSlashesAreNoHostName) {
     EXPECT_EQ(open()->readInt("s", "k"), 7);
 }
 
+TEST_F(StorageFileTest, IsMadeByTheFirstWrite) {
+    path = folder + "/state/overrides.db";
+    const auto storage = open();
+    EXPECT_EQ(storage->keyCount("s"), 0);
+    EXPECT_EQ(storage->hasKey("s", "k"), 0);
+    EXPECT_TRUE(storage->sections().empty());
+    EXPECT_TRUE(storage->entries("s").empty());
+    storage->removeKey("s", "k");
+    EXPECT_FALSE(std::filesystem::exists(folder + "/state"));
+    EXPECT_FALSE(storage->failed()) << storage->lastError();
+    storage->writeInt("s", "k", 7);
+    EXPECT_EQ(storage->readInt("s", "k"), 7);
+    EXPECT_EQ(open()->readInt("s", "k"), 7);
+}
+
+TEST_F(StorageFileTest, ThatCannotBeMadeFailsAtTheFirstWrite) {
+    const auto storage = open();
+    std::filesystem::create_directory(path);
+    EXPECT_FALSE(storage->failed());
+    storage->writeInt("s", "k", 7);
+    EXPECT_EQ(storage->lastError(), path + ": not a regular file");
+}
+
 TEST_F(StorageFileTest, EmptyFileBecomesAStorage) {
     std::ofstream(path).close();
+    EXPECT_EQ(open()->keyCount("s"), 0);
+    EXPECT_EQ(std::filesystem::file_size(path), 0u);
     open()->writeInt("s", "k", 7);
     EXPECT_EQ(open()->readInt("s", "k"), 7);
 }
@@ -134,6 +161,7 @@ struct Unfit : StorageFileTest {
     void expectRefused(StorageFault fault, const std::string& text) const {
         const std::string before = contentOf(path);
         const std::string logBefore = contentOf(path + "-wal");
+        const auto filesBefore = files();
         const auto opened = SqliteStorage::open(path);
         ASSERT_FALSE(opened);
         EXPECT_EQ(opened.error().fault, fault) << opened.error().text;
@@ -141,6 +169,13 @@ struct Unfit : StorageFileTest {
         EXPECT_THAT(opened.error().text, HasSubstr(text));
         EXPECT_TRUE(contentOf(path) == before) << "the file was changed";
         EXPECT_TRUE(contentOf(path + "-wal") == logBefore) << "the log was changed";
+        EXPECT_EQ(files(), filesBefore);
+    }
+    std::set<std::string> files() const {
+        std::set<std::string> names;
+        for (const auto& entry : std::filesystem::directory_iterator(folder))
+            names.insert(entry.path().filename());
+        return names;
     }
     /// A storage of a few pages.
     void fill() const {
@@ -166,6 +201,36 @@ TEST_F(Unfit, TruncatedStorage) {
     fill();
     std::filesystem::resize_file(path, std::filesystem::file_size(path) / 2);
     expectRefused(StorageFault::Damaged, "");
+}
+
+/// SQLite opens it and reads zeroes for what is missing: a node's address became 0, broadcast.
+TEST_F(Unfit, StorageThatLacksItsLastByte) {
+    open()->writeString("MRTU", "tempNode5", "7");
+    const auto size = std::filesystem::file_size(path);
+    std::filesystem::resize_file(path, size - 1);
+    expectRefused(StorageFault::Damaged, "damaged: " + std::to_string(size - 1) + " bytes of");
+}
+
+TEST_F(Unfit, EveryTruncationOfAStorage) {
+    open()->writeString("MRTU", "tempNode5", "7");
+    const std::string whole = contentOf(path);
+    for (std::size_t size = 1; size < whole.size(); size += size < 600 ? 1 : 293) {
+        std::ofstream(path, std::ios::binary) << whole.substr(0, size);
+        const auto opened = SqliteStorage::open(path);
+        ASSERT_FALSE(opened) << size;
+        EXPECT_EQ(opened.error().fault, StorageFault::Damaged) << size;
+        EXPECT_EQ(std::filesystem::file_size(path), size);
+    }
+}
+
+TEST_F(Unfit, FileOfOneByte) {
+    std::ofstream(path) << "S";
+    expectRefused(StorageFault::Damaged, "not a database");
+}
+
+TEST_F(Unfit, DatabaseOfAnotherProgramWithAnIdentOfItsOwn) {
+    ask("PRAGMA journal_mode=WAL; PRAGMA application_id=7; CREATE TABLE bookmarks(url)");
+    expectRefused(StorageFault::Foreign, "a database of another program");
 }
 
 TEST_F(Unfit, StorageWithAnOverwrittenPage) {
@@ -210,8 +275,8 @@ TEST_F(Unfit, DatabaseOfAnotherProgramWithChangesInItsLog) {
 
 TEST_F(Unfit, StorageOfALaterVersion) {
     fill();
-    ask("PRAGMA user_version=2");
-    expectRefused(StorageFault::Newer, "layout 2 is not known");
+    ask("PRAGMA user_version=3");
+    expectRefused(StorageFault::Newer, "layout 3 is not known");
 }
 
 TEST_F(Unfit, StorageWithoutItsTable) {
@@ -261,12 +326,14 @@ TEST_F(StorageFileTest, WriteProtectedFileShowsAlsoWhatOnlyItsLogHolds) {
     EXPECT_EQ(storage->readInt("line1", "baud"), 4800);
 }
 
-TEST_F(StorageFileTest, WriteProtectedEmptyFileIsRefused) {
+TEST_F(StorageFileTest, WriteProtectedEmptyFileHoldsNothing) {
     std::ofstream(path).close();
     ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
-    const auto opened = SqliteStorage::open(path);
-    ASSERT_FALSE(opened);
-    EXPECT_THAT(opened.error().text, HasSubstr("empty and write-protected"));
+    const auto storage = open();
+    EXPECT_EQ(storage->keyCount("s"), 0);
+    EXPECT_FALSE(storage->failed());
+    storage->writeInt("s", "k", 1);
+    EXPECT_THAT(storage->lastError(), HasSubstr("empty and write-protected"));
 }
 
 /// Another user's process: no rights of root, neither on the file nor on its directory.
@@ -347,6 +414,29 @@ TEST_F(StorageFileTest, FullDiskFailsVisiblyAndLosesNothing) {
     EXPECT_EQ(storage->readString("line1", "key3"), std::string(500, 't'));
     storage->writeInt("line1", "after", 1);
     EXPECT_FALSE(storage->failed()) << storage->lastError();
+}
+
+/// There is no room for SQLite's side files, so that it could not even read.
+int readWhenFull(const std::string& path) {
+    ::signal(SIGXFSZ, SIG_IGN);
+    const rlimit limit{0, 0};
+    if (::setrlimit(RLIMIT_FSIZE, &limit) != 0) return 1;
+    auto opened = SqliteStorage::open(path);
+    if (!opened) return 2;
+    SqliteStorage& storage = *opened.value();
+    if (storage.whyReadOnly().empty()) return 3;
+    if (storage.readInt("line1", "baud") != 19200 || storage.failed()) return 4;
+    storage.writeInt("line1", "baud", 300);
+    if (storage.lastError().find(storage.whyReadOnly()) == std::string::npos) return 5;
+    return storage.readInt("line1", "baud") == 19200 ? 0 : 6;
+}
+
+TEST_F(StorageFileTest, FullDiskCanStillBeRead) {
+    open()->writeInt("line1", "baud", 19200);
+    const pid_t child = ::fork();
+    if (child == 0) ::_exit(readWhenFull(path));
+    EXPECT_EQ(endOf(child), 0);
+    EXPECT_EQ(open()->readInt("line1", "baud"), 19200);
 }
 
 }  // namespace

@@ -1,0 +1,175 @@
+// Stored values that must not be used, values of an earlier layout, and the listing of names.
+#include <gmock/gmock.h>
+
+#include "tests/line/StorageFile.h"
+
+namespace {
+
+using runtime::SqliteStorage;
+using runtime::StoredValue;
+using ::testing::ElementsAre;
+using ::testing::HasSubstr;
+
+/// Node 5's address, seen the way a driver looks for it.
+struct StoredValueTest : StorageFileTest {
+    void SetUp() override {
+        open()->writeString("MRTU", "tempNode5", "7");
+        open()->writeString("MRTU", "tempNode6", "8");
+        open()->writeBool("MRTU", "flag", true);
+    }
+
+    static std::vector<std::string> namesIn(SqliteStorage& storage, const char* section = "MRTU") {
+        std::vector<std::string> names(static_cast<std::size_t>(storage.keyCount(section)));
+        for (std::size_t index = 0; index < names.size(); ++index)
+            names[index] = storage.keyName(section, static_cast<int>(index));
+        return names;
+    }
+    /// Key and reason, one line each.
+    static std::string unusedIn(SqliteStorage& storage, const std::string& section = "MRTU") {
+        std::string text;
+        for (const runtime::UnusedEntry& entry : storage.unused(section))
+            text += entry.key + ": " + entry.why + '\n';
+        return text;
+    }
+};
+
+TEST_F(StoredValueTest, ThatWasNotAlteredIsUsed) {
+    const auto storage = open();
+    EXPECT_THAT(namesIn(*storage), ElementsAre("flag", "tempNode5", "tempNode6"));
+    EXPECT_EQ(unusedIn(*storage), "");
+}
+
+TEST_F(StoredValueTest, ThatWasAlteredIsKeptFromItsReaders) {
+    ask("UPDATE settings SET value='0' WHERE key='tempNode5'");
+    const auto storage = open();
+    EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "");
+    char buffer[8] = "before";
+    EXPECT_EQ(storage->readStringInto("MRTU", "tempNode5", buffer, 8), 0);
+    EXPECT_EQ(storage->hasKey("MRTU", "tempNode5"), 0);
+    EXPECT_THAT(namesIn(*storage), ElementsAre("flag", "tempNode6"));
+    EXPECT_EQ(storage->entries("MRTU").size(), 2U);
+    EXPECT_EQ(unusedIn(*storage), "tempNode5: altered since it was written\n");
+    EXPECT_FALSE(storage->failed()) << storage->lastError();
+}
+
+TEST_F(StoredValueTest, AnyPartOfTheRowThatWasAlteredIsNoticed) {
+    const struct {
+        const char* change;
+        const char* section;
+        const char* key;
+    } rows[] = {
+        {"UPDATE settings SET key='tempNode4' WHERE key='tempNode5'", "MRTU", "tempNode4"},
+        {"UPDATE settings SET section='line2' WHERE key='tempNode6'", "line2", "tempNode6"},
+        {"UPDATE settings SET type='int' WHERE key='flag'", "MRTU", "flag"},
+        {"UPDATE settings SET sum=sum+1 WHERE key='flag'", "MRTU", "flag"},
+    };
+    for (const auto& row : rows) {
+        ask(row.change);
+        const auto storage = open();
+        EXPECT_EQ(storage->hasKey(row.section, row.key), 0) << row.change;
+        EXPECT_THAT(unusedIn(*storage, row.section),
+                    HasSubstr(std::string(row.key) + ": altered since it was written\n"))
+            << row.change;
+    }
+}
+
+TEST_F(StoredValueTest, ThatWasAlteredIsReplacedByAWriteAndCanBeRemoved) {
+    ask("UPDATE settings SET value='0' WHERE key LIKE 'tempNode%'");
+    const auto storage = open();
+    storage->writeString("MRTU", "tempNode5", "9");
+    storage->removeKey("MRTU", "tempNode6");
+    EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "9");
+    EXPECT_EQ(unusedIn(*storage), "");
+    EXPECT_EQ(ask("SELECT key FROM settings"), "flag\ntempNode5\n");
+}
+
+TEST_F(StoredValueTest, ThatTheJudgeRefusesIsKeptFromItsReaders) {
+    const auto judge = [](const std::string& key, const StoredValue& value) -> std::string {
+        return key == "tempNode5" ? "not " + runtime::storedText(value) : "";
+    };
+    const auto opened = SqliteStorage::open(path, 100, judge);
+    ASSERT_TRUE(opened);
+    SqliteStorage& storage = *opened.value();
+    EXPECT_EQ(storage.hasKey("MRTU", "tempNode5"), 0);
+    EXPECT_THAT(namesIn(storage), ElementsAre("flag", "tempNode6"));
+    EXPECT_EQ(unusedIn(storage), "tempNode5: not 7\n");
+}
+
+TEST_F(StoredValueTest, NamesFollowTheWritesOfThisAndOtherStorages) {
+    const auto storage = open();
+    EXPECT_THAT(namesIn(*storage), ElementsAre("flag", "tempNode5", "tempNode6"));
+    storage->removeKey("MRTU", "flag");
+    EXPECT_THAT(namesIn(*storage), ElementsAre("tempNode5", "tempNode6"));
+    const auto other = open();
+    other->writeString("MRTU", "tempNode1", "2");
+    other->writeInt("line2", "baud", 9600);
+    EXPECT_THAT(namesIn(*storage), ElementsAre("tempNode1", "tempNode5", "tempNode6"));
+    EXPECT_THAT(namesIn(*storage, "line2"), ElementsAre("baud"));
+    EXPECT_STREQ(storage->keyName("MRTU", 3), "");
+}
+
+TEST_F(StoredValueTest, NamesOfTwoSectionsMayBeListedTurnByTurn) {
+    const auto storage = open();
+    storage->writeInt("line2", "a", 1);
+    storage->writeInt("line2", "b", 2);
+    EXPECT_STREQ(storage->keyName("MRTU", 1), "tempNode5");
+    EXPECT_STREQ(storage->keyName("line2", 1), "b");
+    EXPECT_STREQ(storage->keyName("MRTU", 2), "tempNode6");
+}
+
+/// A storage as versions before the check sums wrote it.
+struct EarlierStorageTest : StoredValueTest {
+    void SetUp() override {
+        ask("PRAGMA journal_mode=WAL;"
+            "CREATE TABLE settings(section TEXT NOT NULL, key TEXT NOT NULL,"
+            " type TEXT NOT NULL CHECK(type IN ('text','bool','int')),"
+            " value NOT NULL CHECK(typeof(value) = CASE type WHEN 'text' THEN 'text' ELSE 'integer'"
+            " END), PRIMARY KEY(section, key)) WITHOUT ROWID;"
+            "PRAGMA application_id=1836217461; PRAGMA user_version=1;"
+            "INSERT INTO settings VALUES('MRTU','tempNode5','text','7'),('MRTU','baud','int',300)");
+    }
+};
+
+TEST_F(EarlierStorageTest, IsBroughtUpToDateWithItsValues) {
+    {
+        const auto storage = open();
+        ASSERT_NE(storage, nullptr);
+        EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "7");
+        EXPECT_EQ(storage->readInt("MRTU", "baud"), 300);
+    }
+    EXPECT_EQ(ask("PRAGMA user_version"), "2\n");
+    ask("UPDATE settings SET value='8' WHERE key='tempNode5'");
+    EXPECT_EQ(unusedIn(*open()), "tempNode5: altered since it was written\n");
+    EXPECT_EQ(ask("PRAGMA integrity_check"), "ok\n");
+}
+
+TEST_F(EarlierStorageTest, ThatMayOnlyBeReadIsReadAsItIs) {
+    ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
+    const std::string before = contentOf(path);
+    {
+        const auto storage = open();
+        ASSERT_NE(storage, nullptr);
+        EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "7");
+        EXPECT_EQ(unusedIn(*storage), "");
+        storage->writeString("MRTU", "tempNode5", "8");
+        EXPECT_TRUE(storage->failed());
+        EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "7");
+    }
+    EXPECT_TRUE(contentOf(path) == before);
+}
+
+TEST_F(EarlierStorageTest, IsBroughtUpToDateByOneOfTwoProcesses) {
+    pid_t children[2];
+    for (pid_t& child : children) {
+        child = ::fork();
+        if (child == 0) {
+            const auto opened = SqliteStorage::open(path);
+            ::_exit(opened && opened.value()->readInt("MRTU", "baud") == 300 ? 0 : 1);
+        }
+    }
+    for (const pid_t child : children)
+        EXPECT_EQ(endOf(child), 0);
+    EXPECT_EQ(unusedIn(*open()), "");
+}
+
+}  // namespace
