@@ -71,7 +71,7 @@ void list(CommandContext& context, const OverrideOptions& options) {
 
 void set(CommandContext& context, const OverrideOptions& options) {
     const OverrideChanges changes = parseChanges(options.words);
-    Session session(context, options.line);
+    Session session(context, options.line, StorageNeed::Keep);
     session.start();
     Overrides overrides(session);
     Printer printer(context.out, overrides);
@@ -96,7 +96,7 @@ void set(CommandContext& context, const OverrideOptions& options) {
 /// storage, so that settings with which no port opens can still be cleared.
 void clear(CommandContext& context, const OverrideOptions& options) {
     const OverrideRemovals removals = parseRemovals(options.words);
-    Session session(context, options.line);
+    Session session(context, options.line, StorageNeed::Keep);
     if (session.storage() == nullptr) {
         throw CommandError(ExitCode::Usage, "there is no storage to clear anything in");
     }

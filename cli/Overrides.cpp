@@ -135,6 +135,9 @@ void Overrides::forgetAll() {
     for (const runtime::StoredEntry& entry : session_.storage()->entries(section())) {
         removeKey(entry.key);
     }
+    for (const runtime::UnusedEntry& entry : session_.storage()->unused(section())) {
+        removeKey(entry.key);
+    }
 }
 
 bool Overrides::hasKey(const std::string& key) {

@@ -11,7 +11,6 @@
 #include "runtime/HostServices.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
-#include "runtime/SqliteStorage.h"
 #include "runtime/TracingSerialFactory.h"
 
 namespace cli {
@@ -24,18 +23,6 @@ template <class Value, class Error>
 Value valueOr(runtime::Result<Value, Error> result, ExitCode code) {
     if (!result) throw CommandError(code, result.error().text);
     return std::move(result).value();
-}
-
-std::unique_ptr<runtime::Storage> openStorage(const LineOptions& options) {
-    const bool none = options.storage.empty() ? options.sim : options.storage == "none";
-    if (none) return nullptr;
-    const std::string path =
-        options.storage.empty() ? runtime::defaultStoragePath() : options.storage;
-    if (path.empty()) {
-        throw CommandError(ExitCode::Other,
-                           "no place for overrides: HOME is not set; --storage FILE or none");
-    }
-    return valueOr(runtime::SqliteStorage::open(path), ExitCode::Other);
 }
 
 std::unique_ptr<sim::Simulator> makeSimulator(const LineOptions& options,
@@ -67,11 +54,12 @@ runtime::ProtocolObject makeProtocol(const std::string& plugin, IInterfaceFactor
 
 /// In the order of their making; the driver, last, goes first.
 struct Session::Parts {
-    Parts(const CommandContext& context, const LineOptions& options)
-        : configText(configTextOf(options)),
+    Parts(CommandContext& of, const LineOptions& options, StorageNeed need)
+        : context(of),
+          configText(configTextOf(options)),
           ports(portsOf(options, configText)),
           plugin(pluginFile(context)),
-          storage(openStorage(options)),
+          storage(openOverrides(context, options, need)),
           simulator(makeSimulator(options, configText)),
           tracing(serial, watcher(portGone, options.trace ? &context.err : nullptr)),
           host(multiTask, tracing, storage.get()),
@@ -87,6 +75,7 @@ struct Session::Parts {
         }
     }
 
+    CommandContext& context;
     std::string configText;
     std::vector<PortMapping> ports;
     std::string plugin;
@@ -100,8 +89,8 @@ struct Session::Parts {
     runtime::Channel channel;
 };
 
-Session::Session(const CommandContext& context, const LineOptions& options)
-    : parts_(std::make_unique<Parts>(context, options)) {
+Session::Session(CommandContext& context, const LineOptions& options, StorageNeed need)
+    : parts_(std::make_unique<Parts>(context, options, need)) {
     if (!options.ident.empty()) parts_->channel.setIdent(options.ident);
     if (const auto done = parts_->channel.configure(parts_->configText); !done) {
         throw CommandError(ExitCode::Usage, "configuration: " + done.error().text);
@@ -131,11 +120,16 @@ void Session::start() {
         parts_->mapPort(
             {itemOf(parts_->configText, "uart").value_or("com1"), parts_->simulator->path()});
     }
+    if (parts_->storage) {
+        reportUnused(parts_->context, *parts_->storage, parts_->channel.protocol().GetIdent());
+    }
     if (const auto done = parts_->channel.start(); !done) {
         const std::string reason = parts_->serial.lastError();
         throw CommandError(ExitCode::Port,
                            reason.empty() ? done.error().text : done.error().text + ": " + reason);
     }
+    // Without its overrides a request might reach another device than it is meant for.
+    checkStorage();
 }
 
 bool Session::hasLine() const {

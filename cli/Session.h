@@ -5,6 +5,7 @@
 #include <string>
 
 #include "cli/LineOptions.h"
+#include "cli/OverrideStorage.h"
 #include "runtime/Channel.h"
 #include "runtime/Storage.h"
 
@@ -16,14 +17,16 @@ class Session {
   public:
     /// @param context  Outlives the session; --trace writes on its `err`.
     /// Errors: CommandError, Usage for the configuration, Other for plug-in and storage.
-    Session(const CommandContext& context, const LineOptions& options);
+    Session(CommandContext& context, const LineOptions& options,
+            StorageNeed need = StorageNeed::Use);
     ~Session();
     Session(const Session&) = delete;
     Session& operator=(const Session&) = delete;
 
-    /// Opens the line (and runs the simulator where --sim asks for it).
-    /// Errors: CommandError, Usage when the command line names no line, else Port with the driver's
-    /// text and the run time's reason.
+    /// Opens the line (and runs the simulator where --sim asks for it). Complains about stored
+    /// overrides that are not used.
+    /// Errors: CommandError, Usage when the command line names no line, Port with the driver's text
+    /// and the run time's reason, Other when the overrides can't be read.
     void start();
 
     /// Tells whether the command line names a line at all.
@@ -37,7 +40,7 @@ class Session {
     /// driver's error code says.
     [[nodiscard]] ExitCode exitCodeFor(const runtime::ChannelError& error) const;
 
-    /// @return null with --storage none.
+    /// @return null when overrides are not kept, see openOverrides().
     runtime::Storage* storage();
     /// Errors: CommandError (Other) when the storage has refused anything so far.
     void checkStorage();

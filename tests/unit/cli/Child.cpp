@@ -5,6 +5,7 @@
 #include <poll.h>
 #include <pty.h>
 #include <signal.h>
+#include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -114,6 +115,11 @@ void prepareChild(const RunOptions& options) {
         setenv(name.c_str(), value.c_str(), 1);
     for (const std::string& name : options.unset)
         unsetenv(name.c_str());
+    if (options.diskFull) {
+        constexpr rlimit kNothing{0, 0};
+        signal(SIGXFSZ, SIG_IGN);
+        setrlimit(RLIMIT_FSIZE, &kNothing);
+    }
     if (options.unprivileged && geteuid() == 0 &&
         (setresgid(kNobody, kNobody, kNobody) != 0 || setresuid(kNobody, kNobody, kNobody) != 0)) {
         _exit(126);

@@ -21,6 +21,7 @@ struct RunOptions {
     std::string outFile{};      ///< Where standard output goes instead of Outcome::out.
     bool outClosed = false;     ///< The process starts without a standard output.
     bool unprivileged = false;  ///< Root's tests run it as somebody who may do little.
+    bool diskFull = false;      ///< No file can grow.
     int ignoredSignal = 0;      ///< As `nohup` does with SIGHUP; the other end signals are heeded.
     std::vector<std::pair<std::string, std::string>> environment{};  ///< Variables to set ...
     std::vector<std::string> unset{};                                ///< ... and to take away.

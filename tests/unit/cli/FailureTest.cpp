@@ -98,32 +98,6 @@ TEST(PlugIn, HasOnlyItsOwnProtocols) {
     EXPECT_EQ(outcome.exitCode, 1);
 }
 
-TEST(Storage, ThatIsDamagedIsNamedAndLeftAlone) {
-    const std::string file = scratchFile("damaged.db");
-    const std::string garbage(4096, 'x');
-    cli_test::writeFile(file, garbage);
-    for (const char* const command : {"read", "override"}) {
-        std::vector<std::string> words{command};
-        if (command == std::string("override")) {
-            words.insert(words.end(), {"set", "node", "5=7"});
-        } else {
-            words.push_back(kUri);
-        }
-        words.insert(words.end(), {"--sim", "--storage", file});
-        const Outcome outcome = mrtu(words);
-        EXPECT_EQ(outcome.exitCode, 1) << command;
-        EXPECT_EQ(outcome.out, "") << command;
-        EXPECT_NE(outcome.err.find(file), std::string::npos) << outcome.err;
-        EXPECT_EQ(contentsOf(file), garbage) << command;
-    }
-}
-
-TEST(Storage, ThatCannotBeMadeIsNamed) {
-    const Outcome outcome = mrtu({"read", "--sim", "--storage", "/dev/null/x.db", kUri});
-    EXPECT_NE(outcome.err.find("/dev/null"), std::string::npos) << outcome.err;
-    EXPECT_EQ(outcome.exitCode, 1);
-}
-
 TEST(Output, ThatCannotBeWrittenIsAFailure) {
     const Outcome full = mrtu({"read", "--sim", kUri}, {.outFile = "/dev/full"});
     EXPECT_EQ(full.err, "mrtu: the output can't be written\n");
