@@ -66,7 +66,16 @@ void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& con
     command.add_flag("--sim", options.sim, "Talk to a simulated line instead of a port")
         ->excludes("--port")
         ->group("Line");
-    command.add_flag("--trace", options.trace, "Show every frame on standard error")->group("Line");
+    command
+        .add_flag("--trace", options.trace,
+                  "Show every frame on standard error, ASCII ones as characters")
+        ->group("Line");
+    command.add_flag("--trace-hex", options.traceHex, "--trace with ASCII frames as bytes, too")
+        ->group("Line");
+    command
+        .add_flag("--trace-meaning", options.traceMeaning,
+                  "--trace with what each frame means, e.g. 'read 1 holding register at 9'")
+        ->group("Line");
     command
         .add_option(
             "--min-gap", options.minGapMs,

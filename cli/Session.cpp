@@ -25,21 +25,28 @@ Value valueOr(runtime::Result<Value, Error> result, ExitCode code) {
     return std::move(result).value();
 }
 
+bool isAscii(const std::string& configText) {
+    return itemOf(configText, "txMode") == "ASCII";
+}
+
 std::unique_ptr<sim::Simulator> makeSimulator(const LineOptions& options,
                                               const std::string& configText) {
     if (!options.sim) return nullptr;
-    const bool ascii = itemOf(configText, "txMode") == "ASCII";
     sim::SimulatorOptions simOptions;
-    simOptions.mode = ascii ? sim::Mode::ascii : sim::Mode::rtu;
+    simOptions.mode = isAscii(configText) ? sim::Mode::ascii : sim::Mode::rtu;
     simOptions.nodes = simNodesFor(configText);
     return std::make_unique<sim::Simulator>(std::move(simOptions));
 }
 
-/// Notes a vanished port and, with --trace, shows the frames.
-runtime::TracingSerialFactory::Callback watcher(bool& portGone, std::ostream* trace) {
-    return [&portGone, trace](const runtime::TraceEvent& event) {
+/// Notes a vanished port and, where it is wanted, shows the frames.
+runtime::TracingSerialFactory::Callback watcher(bool& portGone, std::ostream& err,
+                                                const LineOptions& options, bool ascii) {
+    const auto text = std::make_shared<TraceText>(
+        TraceStyle{.ascii = ascii, .hex = options.traceHex, .meaning = options.traceMeaning});
+    const bool shown = options.trace || options.traceHex || options.traceMeaning;
+    return [&portGone, &err, text, shown](const runtime::TraceEvent& event) {
         if (!event.complete) portGone = true;
-        if (trace != nullptr) *trace << traceText(event) << '\n';
+        if (shown) err << text->lineOf(event) << '\n';
     };
 }
 
@@ -61,7 +68,7 @@ struct Session::Parts {
           plugin(pluginFile(context)),
           storage(openOverrides(context, options, need)),
           simulator(makeSimulator(options, configText)),
-          tracing(serial, watcher(portGone, options.trace ? &context.err : nullptr)),
+          tracing(serial, watcher(portGone, context.err, options, isAscii(configText))),
           host(multiTask, tracing, storage.get()),
           channel(makeProtocol(plugin, host, options.protocol)) {
         serial.setGapFloor(options.minGapMs);

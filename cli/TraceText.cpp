@@ -4,7 +4,29 @@
 
 #include <ctime>
 
+#include "cli/TextEscapes.h"
+
 namespace cli {
+namespace {
+
+std::string timeOfDay(std::chrono::system_clock::time_point moment) {
+    using std::chrono::milliseconds;
+    const auto sinceEpoch = moment.time_since_epoch();
+    const auto ms = std::chrono::duration_cast<milliseconds>(sinceEpoch).count() % 1000;
+    const std::time_t seconds = std::chrono::system_clock::to_time_t(moment);
+    std::tm local{};
+    localtime_r(&seconds, &local);
+    return fmt::format("{:02}:{:02}:{:02}.{:03}", local.tm_hour, local.tm_min, local.tm_sec, ms);
+}
+
+/// Without the line end that every whole frame has.
+ByteView withoutLineEnd(ByteView bytes) {
+    const std::size_t size = bytes.size();
+    const bool ends = size >= 2 && bytes[size - 2] == '\r' && bytes[size - 1] == '\n';
+    return ends ? bytes.first(size - 2) : bytes;
+}
+
+}  // namespace
 
 std::string hexText(ByteView bytes) {
     std::string text;
@@ -15,17 +37,23 @@ std::string hexText(ByteView bytes) {
     return text;
 }
 
-std::string traceText(const runtime::TraceEvent& event) {
-    using std::chrono::milliseconds;
-    const auto sinceEpoch = event.realTime.time_since_epoch();
-    const auto ms = std::chrono::duration_cast<milliseconds>(sinceEpoch).count() % 1000;
-    const std::time_t seconds = std::chrono::system_clock::to_time_t(event.realTime);
-    std::tm local{};
-    localtime_r(&seconds, &local);
+std::string TraceText::lineOf(const runtime::TraceEvent& event) {
     const bool sent = event.direction == runtime::TraceDirection::Sent;
-    return fmt::format("{:02}:{:02}:{:02}.{:03} {} {} {}{}", local.tm_hour, local.tm_min,
-                       local.tm_sec, ms, event.port, sent ? '>' : '<', hexText(event.bytes),
-                       event.complete ? "" : " (cut)");
+    return fmt::format("{} {} {} {}{}", timeOfDay(event.realTime), event.port, sent ? '>' : '<',
+                       frameOf(event.bytes), event.complete ? meaningOf(event) : " (cut)");
+}
+
+std::string TraceText::frameOf(ByteView bytes) const {
+    const bool characters = style_.ascii && !style_.hex;
+    return characters ? escapeText(withoutLineEnd(bytes)) : hexText(bytes);
+}
+
+std::string TraceText::meaningOf(const runtime::TraceEvent& event) {
+    if (!style_.meaning) return {};
+    const FrameMeaning fresh(style_.ascii ? sim::Mode::ascii : sim::Mode::rtu);
+    FrameMeaning& port = ports_.try_emplace(event.port, fresh).first->second;
+    const bool sent = event.direction == runtime::TraceDirection::Sent;
+    return " | " + (sent ? port.ofRequest(event.bytes) : port.ofReply(event.bytes));
 }
 
 }  // namespace cli

@@ -1,9 +1,11 @@
 // Frames on the line as text. Pure.
 #pragma once
 
+#include <map>
 #include <string>
 
 #include "cli/Bytes.h"
+#include "cli/FrameMeaning.h"
 #include "runtime/TracingSerialFactory.h"
 
 namespace cli {
@@ -11,8 +13,30 @@ namespace cli {
 /// @return the bytes as two upper-case hexadecimal digits each, separated by blanks.
 std::string hexText(ByteView bytes);
 
-/// @return one line without its end: local time of day, port, ">" (sent) or "<" (received), bytes.
-/// `14:03:07.123 com1 > 01 03 00 00 00 01 84 0A`; a frame that was cut short ends in " (cut)".
-std::string traceText(const runtime::TraceEvent& event);
+/// How frames are shown.
+struct TraceStyle {
+    bool ascii = false;    ///< The line's frames are ASCII ones, shown as their characters ...
+    bool hex = false;      ///< ... unless their bytes are wanted.
+    bool meaning = false;  ///< Says also what a frame means.
+};
+
+/// Shows frames in the order of their passing.
+class TraceText {
+  public:
+    explicit TraceText(TraceStyle style) : style_(style) {}
+
+    /// @return one line without its end: local time of day, port, ">" (sent) or "<" (received), the
+    /// frame. `14:03:07.123 com1 > 01 03 00 00 00 01 84 0A`; a frame that was cut short ends in
+    /// " (cut)", any other with its meaning where that is wanted:
+    /// ` | node 1: read 1 holding register at 0`.
+    std::string lineOf(const runtime::TraceEvent& event);
+
+  private:
+    std::string frameOf(ByteView bytes) const;
+    std::string meaningOf(const runtime::TraceEvent& event);
+
+    TraceStyle style_;
+    std::map<std::string, FrameMeaning> ports_;
+};
 
 }  // namespace cli

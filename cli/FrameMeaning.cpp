@@ -1,0 +1,210 @@
+#include "cli/FrameMeaning.h"
+
+#include <fmt/format.h>
+
+#include <algorithm>
+#include <array>
+#include <string_view>
+
+#include "sim/Framing.h"
+
+namespace cli {
+namespace {
+
+using sim::ByteView;
+
+constexpr std::uint8_t kExceptionFlag = 0x80;
+/// More values make no line that anybody reads.
+constexpr std::size_t kShownValues = 16;
+constexpr const char* kDamaged = "damaged";
+
+/// How a function's request and reply are laid out behind the function.
+enum class Form : std::uint8_t {
+    ReadBits,    ///< Address, count; reply: byte count, bits.
+    ReadWords,   ///< Address, count; reply: byte count, registers.
+    WriteBit,    ///< Address, FF00 or 0000; reply: the same.
+    WriteWord,   ///< Address, value; reply: the same.
+    WriteBits,   ///< Address, count, byte count, bits; reply: address, count.
+    WriteWords,  ///< Address, count, byte count, registers; reply: address, count.
+};
+
+struct FunctionRow {
+    std::uint8_t function;
+    Form form;
+    std::string_view item;
+};
+
+/// Source: Modbus Application Protocol V1.1b3, 6.1 to 6.6, 6.11, 6.12.
+constexpr std::array kFunctions{
+    FunctionRow{1, Form::ReadBits, "coil"},
+    FunctionRow{2, Form::ReadBits, "discrete input"},
+    FunctionRow{3, Form::ReadWords, "holding register"},
+    FunctionRow{4, Form::ReadWords, "input register"},
+    FunctionRow{5, Form::WriteBit, "coil"},
+    FunctionRow{6, Form::WriteWord, "holding register"},
+    FunctionRow{15, Form::WriteBits, "coil"},
+    FunctionRow{16, Form::WriteWords, "holding register"},
+};
+
+struct ExceptionRow {
+    std::uint8_t code;
+    std::string_view text;
+};
+
+/// Source: Modbus Application Protocol V1.1b3, 7.
+constexpr std::array kExceptions{
+    ExceptionRow{1, "illegal function"},
+    ExceptionRow{2, "illegal data address"},
+    ExceptionRow{3, "illegal data value"},
+    ExceptionRow{4, "server device failure"},
+    ExceptionRow{5, "acknowledge"},
+    ExceptionRow{6, "server device busy"},
+    ExceptionRow{8, "memory parity error"},
+    ExceptionRow{10, "gateway path unavailable"},
+    ExceptionRow{11, "gateway target device failed to respond"},
+};
+
+/// Registers of 32 bits share the functions of those of 16; the bytes for each item tell them
+/// apart.
+constexpr std::size_t kShort = 2;
+constexpr std::size_t kLong = 4;
+
+const FunctionRow* rowOf(std::uint8_t function) {
+    const auto* const row =
+        std::find_if(kFunctions.begin(), kFunctions.end(),
+                     [function](const FunctionRow& each) { return each.function == function; });
+    return row == kFunctions.end() ? nullptr : row;
+}
+
+/// High byte first. REQUIRES: at most four bytes.
+std::uint32_t numberOf(ByteView bytes) {
+    std::uint32_t number = 0;
+    for (const std::uint8_t byte : bytes)
+        number = number << 8 | byte;
+    return number;
+}
+
+std::string whose(std::uint8_t node) {
+    return node == 0 ? "all nodes: " : fmt::format("node {}: ", node);
+}
+
+std::string some(std::size_t count, std::string_view item) {
+    return fmt::format("{} {}{}", count, item, count == 1 ? "" : "s");
+}
+
+/// @param value  Gives the value with an index as a number.
+template <class ValueAt>
+std::string listOf(std::size_t count, ValueAt value) {
+    std::string text;
+    for (std::size_t i = 0; i < std::min(count, kShownValues); ++i)
+        text += fmt::format("{}{}", i == 0 ? "" : " ", value(i));
+    return count > kShownValues ? text + " ..." : text;
+}
+
+/// The first item is the lowest bit of the first byte.
+std::string bitList(ByteView bytes, std::size_t count) {
+    return listOf(std::min(count, bytes.size() * 8),
+                  [&](std::size_t i) { return bytes[i / 8] >> i % 8 & 1; });
+}
+
+std::string wordList(ByteView bytes, std::size_t width) {
+    return listOf(bytes.size() / width,
+                  [&](std::size_t i) { return numberOf(bytes.subspan(i * width, width)); });
+}
+
+std::size_t widthOf(ByteView values, std::size_t count) {
+    return count != 0 && values.size() == kLong * count ? kLong : kShort;
+}
+
+std::string_view itemOf(const FunctionRow& row, std::size_t width) {
+    return width == kLong ? "32-bit register" : row.item;
+}
+
+std::string bitWord(std::uint32_t value) {
+    if (value == 0xFF00) return "on";
+    return value == 0 ? "off" : fmt::format("0x{:04X}", value);
+}
+
+std::string unknown(std::uint8_t function, ByteView data) {
+    return fmt::format("function {}, {}", function, some(data.size(), "byte"));
+}
+
+/// @param values  Behind the byte count.
+std::string writeText(const FunctionRow& row, std::size_t address, std::size_t count,
+                      ByteView values) {
+    const bool bits = row.form == Form::WriteBits;
+    const std::size_t width = bits ? 0 : widthOf(values, count);
+    return fmt::format("write {} at {}: {}", some(count, itemOf(row, width)), address,
+                       bits ? bitList(values, count) : wordList(values, width));
+}
+
+/// @param data  What stands behind the function.
+std::string requestText(std::uint8_t function, ByteView data) {
+    constexpr std::size_t kAddressAndCount = 2 + 2;
+    const FunctionRow* const row = rowOf(function);
+    if (row == nullptr || data.size() < kAddressAndCount) return unknown(function, data);
+    const std::uint32_t address = numberOf(data.first(2));
+    const ByteView behind = data.subspan(2);
+    switch (row->form) {
+        case Form::ReadBits:
+        case Form::ReadWords:
+            return fmt::format("read {} at {}", some(numberOf(behind.first(2)), row->item),
+                               address);
+        case Form::WriteBit:
+            return fmt::format("write {} at {}: {}", row->item, address,
+                               bitWord(numberOf(behind.first(2))));
+        case Form::WriteWord:
+            return fmt::format("write {} at {}: {}", itemOf(*row, behind.size()), address,
+                               numberOf(behind.first(std::min(behind.size(), kLong))));
+        case Form::WriteBits:
+        case Form::WriteWords:
+            break;
+    }
+    if (data.size() == kAddressAndCount) return unknown(function, data);
+    return writeText(*row, address, numberOf(behind.first(2)), data.subspan(kAddressAndCount + 1));
+}
+
+std::string exceptionText(ByteView data) {
+    if (data.empty()) return "exception without a code";
+    for (const auto& [code, text] : kExceptions) {
+        if (code == data[0]) return fmt::format("exception {}, {}", code, text);
+    }
+    return fmt::format("exception {}", data[0]);
+}
+
+/// @param count  Items that were asked for; 0 when that is not known.
+std::string replyText(std::uint8_t function, ByteView data, std::size_t count) {
+    if ((function & kExceptionFlag) != 0) return exceptionText(data);
+    const FunctionRow* const row = rowOf(function);
+    if (row == nullptr || data.empty()) return unknown(function, data);
+    const ByteView values = data.subspan(1);
+    if (row->form == Form::ReadBits) return bitList(values, count != 0 ? count : ~std::size_t{0});
+    if (row->form == Form::ReadWords) return wordList(values, widthOf(values, count));
+    return "written";
+}
+
+}  // namespace
+
+std::string FrameMeaning::ofRequest(ByteView frame) {
+    last_.reset();
+    const auto [raw, message] = sim::decodeFrame(mode_, frame);
+    if (message.empty()) return kDamaged;
+    const ByteView data = ByteView(message).subspan(2);
+    const FunctionRow* const row = rowOf(message[1]);
+    const bool reads = row != nullptr && data.size() == 4 &&
+                       (row->form == Form::ReadBits || row->form == Form::ReadWords);
+    last_ = Request{message[0], message[1], reads ? numberOf(data.subspan(2)) : 0};
+    return whose(message[0]) + requestText(message[1], data);
+}
+
+std::string FrameMeaning::ofReply(ByteView frame) const {
+    const auto [raw, message] = sim::decodeFrame(mode_, frame);
+    if (message.empty()) return kDamaged;
+    const auto function = static_cast<std::uint8_t>(message[1] & ~kExceptionFlag);
+    const bool answers = last_ && last_->node == message[0] && last_->function == function;
+    return whose(message[0]) +
+           replyText(message[1], ByteView(message).subspan(2), answers ? last_->count : 0) +
+           (answers ? "" : " (not what was asked for)");
+}
+
+}  // namespace cli
