@@ -47,13 +47,13 @@ class StopOnSignal {
         g_serving.store(&simulator);
         struct sigaction action {};
         action.sa_handler = endServing;
-        for (std::size_t i = 0; i < old_.size(); ++i) {
+        for (std::size_t i = 0; i < std::size(kEndSignals); ++i) {
             taken_[i] = !isIgnored(kEndSignals[i]);
             if (taken_[i]) sigaction(kEndSignals[i], &action, &old_[i]);
         }
     }
     ~StopOnSignal() {
-        for (std::size_t i = 0; i < old_.size(); ++i) {
+        for (std::size_t i = 0; i < std::size(kEndSignals); ++i) {
             if (taken_[i]) sigaction(kEndSignals[i], &old_[i], nullptr);
         }
         g_serving.store(nullptr);

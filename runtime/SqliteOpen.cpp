@@ -131,15 +131,16 @@ Result<OpenedStorage, StorageError> openStorageDatabase(const std::string& path,
                                                         int busyTimeoutMs) {
     StandingFile standing;
     if (Fault fault = lookAtFile(path, standing)) return *fault;
-    OpenedStorage opened{std::make_unique<SqliteDatabase>(),
-                         standing.writable ? "" : "write-protected"};
-    const Fault fault = openStanding(path, standing, busyTimeoutMs, *opened.database);
-    if (!fault) return opened;
-    if (!mayStillBeRead(*fault, standing, *opened.database)) return *fault;
-    opened = {std::make_unique<SqliteDatabase>(), fault->text.substr(path.size() + 2)};
+    auto database = std::make_unique<SqliteDatabase>();
+    const Fault fault = openStanding(path, standing, busyTimeoutMs, *database);
+    if (!fault) {
+        return OpenedStorage{std::move(database), standing.writable ? "" : "write-protected"};
+    }
+    if (!mayStillBeRead(*fault, standing, *database)) return *fault;
     standing.writable = false;
-    if (openStanding(path, standing, busyTimeoutMs, *opened.database)) return *fault;
-    return opened;
+    auto readable = std::make_unique<SqliteDatabase>();
+    if (openStanding(path, standing, busyTimeoutMs, *readable)) return *fault;
+    return OpenedStorage{std::move(readable), fault->text.substr(path.size() + 2)};
 }
 
 }  // namespace runtime
