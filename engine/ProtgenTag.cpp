@@ -68,7 +68,7 @@ void ProtgenTag::setDataType(ICU_Type type, ICU_Type itemType, int length,
     type_ = type;
     itemType_ = itemType;
     length_ = length;
-    conversions_ = std::move(conversions);
+    setConversions(std::move(conversions));
 }
 
 bool ProtgenTag::inBitMemory() const {

@@ -7,16 +7,13 @@
 #include <charconv>
 #include <cstring>
 #include <new>
+#include <string_view>
 
 #include "framework/DataTypes.h"
 #include "framework/HostServicePointers.h"
 #include "framework/TagBase.h"
 
 namespace {
-
-/// Room for every usual error text, so that a failure does not move the text that another thread
-/// may be looking at.
-constexpr std::size_t kErrorTextRoom = 256;
 
 constexpr int kProtocolBaseVersion = 100;
 
@@ -74,9 +71,7 @@ const char* nextField(const char* field) {
 
 }  // namespace
 
-ProtocolBase::ProtocolBase() {
-    lastErrorText_.reserve(kErrorTextRoom);
-}
+ProtocolBase::ProtocolBase() = default;
 
 ProtocolBase::~ProtocolBase() {
     DeleteTags();
@@ -134,42 +129,30 @@ bool ProtocolBase::IsConverted() const {
 }
 
 const char* ProtocolBase::GetIdent() const {
-    return ident_.empty() ? GetName() : ident_.c_str();
+    const char* ident = ident_.get();
+    return *ident != '\0' ? ident : GetName();
 }
 
 void ProtocolBase::SetIdent(const char* ident) {
-    try {
-        ident_ = orEmpty(ident);
-    } catch (const std::bad_alloc&) {
-        SetError(-1, "Out of memory");
-    }
+    if (!ident_.set(orEmpty(ident))) SetError(-1, "Out of memory");
 }
 
 int ProtocolBase::GetLastError() const {
-    return lastError_;
+    return error_.last().code;
 }
 
 const char* ProtocolBase::GetLastErrorString() const {
-    return lastErrorText_.c_str();
+    return error_.last().text;
 }
 
-void ProtocolBase::SetError(int code, const char* text) {
-    lastError_ = code;
-    try {
-        lastErrorText_ = orEmpty(text);
-    } catch (const std::bad_alloc&) {
-        lastErrorText_.assign(text, lastErrorText_.capacity());  // what fits is better than nothing
-    }
+void ProtocolBase::SetError(int code, const char* text) noexcept {
+    error_.set(code, orEmpty(text));
 }
 
-void ProtocolBase::SetTagError(const TagBase* tag) {
-    try {
-        const std::string text =
-            std::string("Tag URI error: ") + orEmpty(tag->GetVarName()) + " - " + tag->GetError();
-        SetError(-1, text.c_str());
-    } catch (const std::bad_alloc&) {
-        SetError(-1, "Out of memory");
-    }
+void ProtocolBase::SetTagError(const TagBase* tag) noexcept {
+    const std::string_view parts[] = {"Tag URI error: ", orEmpty(tag->GetVarName()), " - ",
+                                      tag->GetError()};
+    if (!error_.setQuoting(-1, parts)) SetError(-1, "Out of memory");
 }
 
 int ProtocolBase::GetInfo(char* buffer, int size) const {

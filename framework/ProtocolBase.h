@@ -4,6 +4,8 @@
 #include <string>
 #include <vector>
 
+#include "framework/ErrorState.h"
+#include "framework/KeptText.h"
 #include "framework/TagList.h"
 #include "platform/IProtocol.h"
 
@@ -122,10 +124,12 @@ class ProtocolBase : public IProtocol7 {
     virtual const char* const* tagUriNames() const;
 
   protected:
-    /// Stores the error that GetLastError() and GetLastErrorString() report.
-    void SetError(int code, const char* text);
-    /// Reports the tag's own error text together with its URI.
-    void SetTagError(const TagBase* tag);
+    /// Stores the error that GetLastError() and GetLastErrorString() report, code and text
+    /// together; see ErrorState. Null is an empty text. Needs no memory for texts of up to 256
+    /// characters; longer ones are cut when there is none. Never throws. Threads: any.
+    void SetError(int code, const char* text) noexcept;
+    /// Reports the tag's own error text together with its URI, or "Out of memory". Never throws.
+    void SetTagError(const TagBase* tag) noexcept;
     /// Destroys every tag that this object owns.
     void DeleteTags();
     /// @return whether the tag is an array that has item `index`; sets the error when not.
@@ -140,9 +144,8 @@ class ProtocolBase : public IProtocol7 {
     const char* writeHex(const ITag* tag, const std::string& hex);
 
     TagList tags_;
-    int lastError_ = 1;
-    std::string lastErrorText_;
-    std::string ident_;
+    ErrorState error_;
+    KeptText ident_;
 };
 
 /// @return milliseconds since the Unix epoch.

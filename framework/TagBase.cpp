@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <utility>
 
 #include "framework/BitUtils.h"
 #include "framework/Conversions.h"
@@ -38,8 +39,9 @@ bool TagBase::Convert(const unsigned char* src, unsigned char* dst, bool toDevic
 bool TagBase::toDeviceForm(const unsigned char* src, unsigned char* dst,
                            unsigned char* work) const {
     std::copy_n(src, atLeastZero(GetVarLength()), work);
-    for (const std::string& name : conversions_) {
-        if (!applyOne(work, name, true)) return false;
+    const int count = static_cast<int>(conversions_.size());
+    for (int number = 0; number < count; ++number) {
+        if (!applyOne(work, number, true)) return false;
     }
 
     if (ProtUtilsN::IsBitType(this)) {
@@ -58,17 +60,31 @@ bool TagBase::toRunTimeForm(const unsigned char* src, unsigned char* dst,
         std::copy_n(src, atLeastZero(PackedLen()), work);
     }
 
-    for (auto name = conversions_.rbegin(); name != conversions_.rend(); ++name) {
-        if (!applyOne(work, *name, false)) return false;
+    for (int left = static_cast<int>(conversions_.size()); left > 0; --left) {
+        if (!applyOne(work, left - 1, false)) return false;
     }
     std::copy_n(work, atLeastZero(GetVarLength()), dst);
     return true;
 }
 
-bool TagBase::applyOne(unsigned char* work, const std::string& name, bool toDevice) const {
-    if (DoConversion(work, name.c_str(), toDevice)) return true;
-    SetError(("Conversion error at: " + name).c_str());
+bool TagBase::applyOne(unsigned char* work, int number, bool toDevice) const {
+    const auto index = static_cast<std::size_t>(number);
+    if (DoConversion(work, conversions_[index].c_str(), toDevice)) return true;
+    error_.show(conversionErrors_[index].c_str());
     return false;
+}
+
+void TagBase::setConversions(std::vector<std::string> names) {
+    std::vector<std::string> errors;
+    errors.reserve(names.size());
+    for (const std::string& name : names)
+        errors.push_back("Conversion error at: " + name);
+    conversions_ = std::move(names);
+    conversionErrors_ = std::move(errors);
+}
+
+void TagBase::SetError(const char* text) const {
+    if (!error_.set(text != nullptr ? text : "")) error_.show("Out of memory");
 }
 
 bool TagBase::DoConversion(unsigned char* buf, const char* name, bool toDevice) const {

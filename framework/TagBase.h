@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "framework/KeptText.h"
 #include "platform/ITag.h"
 
 /// The earlier operations of ITag (offsets, type, lengths) are left to the derived class.
@@ -17,20 +18,26 @@ class TagBase : public ITag {
     bool Convert(const unsigned char* src, unsigned char* dst, bool toDevice) const override;
     bool DoConversion(unsigned char* buf, const char* name, bool toDevice) const override;
 
-    /// The tag's own error text; it may be set on a constant tag.
-    void SetError(const char* text) const { error_ = text; }
-    const char* GetError() const { return error_.c_str(); }
+    /// The tag's own error text; it may be set on a constant tag, by several threads at once.
+    /// "Out of memory" takes the place of a new text that finds none. Never throws.
+    void SetError(const char* text) const;
+    /// @return the last text; readable and unchanged as long as the tag lives.
+    const char* GetError() const { return error_.get(); }
 
     /// The conversion names in the order of the URI.
     const std::vector<std::string>& conversions() const { return conversions_; }
 
   protected:
-    std::vector<std::string> conversions_;
+    /// REQUIRES: the tag is being made, nobody converts with it yet.
+    void setConversions(std::vector<std::string> names);
 
   private:
     bool toDeviceForm(const unsigned char* src, unsigned char* dst, unsigned char* work) const;
     bool toRunTimeForm(const unsigned char* src, unsigned char* dst, unsigned char* work) const;
-    bool applyOne(unsigned char* work, const std::string& name, bool toDevice) const;
+    bool applyOne(unsigned char* work, int number, bool toDevice) const;
 
-    mutable std::string error_;
+    std::vector<std::string> conversions_;
+    mutable KeptText error_;
+    // What to say when a conversion fails, one text each: a read that fails takes no memory.
+    std::vector<std::string> conversionErrors_;
 };

@@ -76,7 +76,9 @@ class IProtocol : public IInterface {
     /// available or not started, -4 no response, -6 bad reply or exception, -9 conversion,
     /// -10 node disabled or broadcast read.
     virtual int GetLastError() const = 0;
-    /// @return the text of the last failure; valid until the next one.
+    /// @return the text of the last failure, "" before the first one. It stays readable as long as
+    /// the protocol lives. The usual texts never change; one that quotes what was asked for, such
+    /// as a tag's URI, may be replaced after eight more different failures of that kind.
     virtual const char* GetLastErrorString() const = 0;
     virtual int GetProtocolVersion() const = 0;
     virtual int GetProtocolType() const = 0;

@@ -12,13 +12,29 @@ constexpr int kNoLimit = std::numeric_limits<int>::max();
 // Requests that are still granted.
 thread_local int granted = kNoLimit;
 
-void* take(std::size_t size) {
-    if (granted <= 0) return nullptr;
+bool grant() {
+    if (granted <= 0) return false;
     if (granted != kNoLimit) --granted;
-    return std::malloc(size == 0 ? 1 : size);
+    return true;
 }
 
 }  // namespace
+
+// The linker turns the program's own calls of malloc() into calls of the first one (--wrap).
+// NOLINTBEGIN(bugprone-reserved-identifier)
+extern "C" void* __real_malloc(std::size_t size);
+extern "C" void* __wrap_malloc(std::size_t size) {
+    return grant() ? __real_malloc(size) : nullptr;
+}
+
+namespace {
+
+void* take(std::size_t size) {
+    return grant() ? __real_malloc(size == 0 ? 1 : size) : nullptr;
+}
+
+}  // namespace
+// NOLINTEND(bugprone-reserved-identifier)
 
 void* operator new(std::size_t size) {
     if (void* memory = take(size)) return memory;

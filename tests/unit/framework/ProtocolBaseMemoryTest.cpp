@@ -131,8 +131,18 @@ TEST_F(ProtocolBaseMemory, IdentStaysWithoutMemory) {
     expectOutOfMemory();
 }
 
-TEST_F(ProtocolBaseMemory, TagErrorIsReplacedByTheShortage) {
+TEST_F(ProtocolBaseMemory, CommonTagErrorsNeedNoMemory) {
     const TestTag tag("a URI that is longer than a short string", bytesShape(1));
+    {
+        const MemoryShortage shortage;
+        protocol_.SetTagError(&tag);
+    }
+    EXPECT_STREQ(protocol_.GetLastErrorString(),
+                 "Tag URI error: a URI that is longer than a short string - ");
+}
+
+TEST_F(ProtocolBaseMemory, LongTagErrorIsReplacedByTheShortage) {
+    const TestTag tag(std::string(300, 'u'), bytesShape(1));
     {
         const MemoryShortage shortage;
         protocol_.SetTagError(&tag);

@@ -25,7 +25,7 @@ class TestTag final : public TagBase {
   public:
     TestTag(std::string uri, const TagShape& shape, int* destroyed = nullptr)
         : uri_(std::move(uri)), shape_(shape), destroyed_(destroyed) {
-        conversions_ = shape.conversions;
+        setConversions(shape.conversions);
     }
     TestTag(const TestTag&) = default;
     ~TestTag() override {

@@ -12,7 +12,9 @@ class ValueTag : public TagBase {
     /// @param dataType  As in a tag URI, with its conversions.
     explicit ValueTag(const std::string& dataType, int byteOffset = 0, int bitIndex = 0)
         : name_(dataType), byteOffset_(byteOffset), bitIndex_(bitIndex) {
-        ProtUtilsN::GetICOMType(dataType, type_, itemType_, length_, conversions_);
+        std::vector<std::string> conversions;
+        ProtUtilsN::GetICOMType(dataType, type_, itemType_, length_, conversions);
+        setConversions(conversions);
     }
 
     void setType(ICU_Type type, ICU_Type itemType, int length) {
