@@ -1,12 +1,17 @@
-# mrtu_test(NAME [DESKTOP] SOURCES file... [LIBS target...])
+# mrtu_test(NAME [DESKTOP] [THREADS] SOURCES file... [LIBS target...])
 # One GoogleTest program, each of its tests a test of CTest.
 #
 # Every test has one of two labels. `portable` tests run on every architecture; `desktop` tests need
 # libraries or programs that a cross compiler does not bring, and are left out without MRTU_TOOLS.
 # A folder of desktop tests sets MRTU_TEST_LABEL instead of marking each program.
+#
+# Programs whose subject is what several threads do at once have the label `threads` besides; the
+# target mrtu_threaded_tests builds them all, for the thread sanitizer.
 set(MRTU_TEST_LABEL portable)
 
 if(MRTU_TESTS)
+  add_custom_target(mrtu_threaded_tests)
+
   # The library is built from Debian's source package: with the flags, the sanitizers and the
   # architecture of this build.
   if(EXISTS /usr/src/googletest/CMakeLists.txt)
@@ -30,7 +35,7 @@ if(MRTU_TESTS)
 endif()
 
 function(mrtu_test name)
-  cmake_parse_arguments(PARSE_ARGV 1 arg "DESKTOP" "" "SOURCES;LIBS")
+  cmake_parse_arguments(PARSE_ARGV 1 arg "DESKTOP;THREADS" "" "SOURCES;LIBS")
   set(label ${MRTU_TEST_LABEL})
   if(arg_DESKTOP)
     set(label desktop)
@@ -41,5 +46,9 @@ function(mrtu_test name)
   add_executable(${name} ${arg_SOURCES})
   target_link_libraries(${name} PRIVATE mrtu_flags ${arg_LIBS} GTest::gmock_main)
   target_precompile_headers(${name} REUSE_FROM mrtu_test_headers)
-  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST PROPERTIES TIMEOUT 300 LABELS ${label})
+  if(arg_THREADS)
+    string(APPEND label "\\;threads")
+    add_dependencies(mrtu_threaded_tests ${name})
+  endif()
+  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST PROPERTIES TIMEOUT 300 LABELS "${label}")
 endfunction()

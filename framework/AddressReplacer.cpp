@@ -60,28 +60,70 @@ class StoredText {
 
 }  // namespace
 
+/// REQUIRES: the mutex is held.
 template <class Address>
-void AddressReplacer<Address>::record(Address address, Address replacement) {
-    const auto known = std::find_if(replacements_.begin(), replacements_.end(),
-                                    [address](const Pair& pair) { return pair.first == address; });
-    if (known != replacements_.end()) {
-        known->second = replacement;
-    } else {
-        replacements_.emplace_back(address, replacement);
-    }
+typename AddressReplacer<Address>::Entry& AddressReplacer<Address>::entryOf(Address address) {
+    const auto known = std::find_if(entries_.begin(), entries_.end(),
+                                    [address](const Entry& it) { return it.address == address; });
+    if (known != entries_.end()) return *known;
+    return entries_.emplace_back(Entry{address, address, 0});
+}
+
+/// @return the number of this write.
+template <class Address>
+std::uint64_t AddressReplacer<Address>::writeEntry(Address address, Address replacement) {
+    const std::lock_guard lock(mutex_);
+    Entry& entry = entryOf(address);
+    entry.replacement = replacement;
+    entry.write = ++writes_;
+    return entry.write;
+}
+
+template <class Address>
+std::uint64_t AddressReplacer<Address>::lastWrite() const {
+    const std::lock_guard lock(mutex_);
+    return writes_;
+}
+
+/// A value written since then is newer than what the storage held.
+template <class Address>
+void AddressReplacer<Address>::restoreEntry(Address address, Address replacement,
+                                            std::uint64_t lastWriteBefore) {
+    const std::lock_guard lock(mutex_);
+    Entry& entry = entryOf(address);
+    if (entry.write <= lastWriteBefore) entry.replacement = replacement;
+}
+
+/// Compares what has just reached the storage with the memory. A restore may have put the old value
+/// back into the memory; a later write may have reached the storage first.
+/// @return true when both agree now; else the value that belongs into the storage, and its number.
+template <class Address>
+bool AddressReplacer<Address>::settle(Address address, Address& replacement, std::uint64_t& write) {
+    const std::lock_guard lock(mutex_);
+    Entry& entry = entryOf(address);
+    const bool isLast = entry.write == write;
+    if (isLast) entry.replacement = replacement;
+    replacement = entry.replacement;
+    write = entry.write;
+    return isLast;
 }
 
 template <class Address>
 void AddressReplacer<Address>::setValue(Address address, Address replacement, const char* section) {
-    record(address, replacement);
+    const std::string key = getPrefix() + toString(address);
+    std::string text = toString(replacement);
+    std::uint64_t write = writeEntry(address, replacement);
     IPermanentStorage* store = storage();
     if (section == nullptr || store == nullptr) return;
 
-    const std::string key = getPrefix() + toString(address);
-    if (replacement == address) {
-        store->removeKey(section, key.c_str());
-    } else {
-        store->writeString(section, key.c_str(), toString(replacement).c_str());
+    for (;;) {
+        if (replacement == address) {
+            store->removeKey(section, key.c_str());
+        } else {
+            store->writeString(section, key.c_str(), text.c_str());
+        }
+        if (settle(address, replacement, write)) return;
+        text = toString(replacement);
     }
 }
 
@@ -90,6 +132,7 @@ void AddressReplacer<Address>::restore(const char* section) {
     IPermanentStorage* store = storage();
     if (section == nullptr || store == nullptr) return;
 
+    const std::uint64_t lastWriteBefore = lastWrite();
     const std::string prefix = getPrefix();
     const int count = store->keyCount(section);
     for (int index = 0; index < count; ++index) {
@@ -97,16 +140,29 @@ void AddressReplacer<Address>::restore(const char* section) {
         const StoredText stored(store, section);
         const std::string key = stored.key(index);
         if (!key.starts_with(prefix)) continue;
-        record(fromString(key.substr(prefix.size())), fromString(stored.value(key)));
+        const Address address = fromString(key.substr(prefix.size()));
+        restoreEntry(address, fromString(stored.value(key)), lastWriteBefore);
     }
 }
 
 template <class Address>
 Address AddressReplacer<Address>::replacementOf(Address address) const {
-    for (const Pair& pair : replacements_) {
-        if (pair.first == address) return pair.second;
+    const std::lock_guard lock(mutex_);
+    for (const Entry& entry : entries_) {
+        if (entry.address == address) return entry.replacement;
     }
     return address;
+}
+
+template <class Address>
+std::vector<typename AddressReplacer<Address>::Pair> AddressReplacer<Address>::replacements()
+    const {
+    const std::lock_guard lock(mutex_);
+    std::vector<Pair> pairs;
+    pairs.reserve(entries_.size());
+    for (const Entry& entry : entries_)
+        pairs.emplace_back(entry.address, entry.replacement);
+    return pairs;
 }
 
 template class AddressReplacer<int>;

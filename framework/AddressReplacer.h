@@ -1,12 +1,16 @@
 // Run-time overrides of node addresses, one storage key for each changed node.
 #pragma once
 
+#include <cstdint>
+#include <mutex>
 #include <string>
 #include <utility>
 #include <vector>
 
 /// Pairs of a configured address and its replacement, at most one for each configured address, in
-/// order of insertion. Threads: as the other replacers.
+/// order of insertion.
+/// Threads: as the other replacers. Of a setValue() and a restore() at the same time the former
+/// wins; of two setValue() for one address the same one wins in memory and in the storage.
 template <class Address>
 class AddressReplacer {
   public:
@@ -31,16 +35,29 @@ class AddressReplacer {
     /// @return the replacement, or `address` itself when none is recorded.
     Address replacementOf(Address address) const;
 
-    const std::vector<Pair>& replacements() const { return replacements_; }
+    /// @return the pairs as they stand at this moment.
+    std::vector<Pair> replacements() const;
 
   protected:
     // Not virtual: nobody deletes through this base, and the table begins with getPrefix().
     ~AddressReplacer() = default;
 
   private:
-    void record(Address address, Address replacement);
+    struct Entry {
+        Address address;
+        Address replacement;
+        std::uint64_t write;  ///< Number of the setValue() that it comes from; 0: restored.
+    };
 
-    std::vector<Pair> replacements_;
+    Entry& entryOf(Address address);
+    std::uint64_t writeEntry(Address address, Address replacement);
+    std::uint64_t lastWrite() const;
+    void restoreEntry(Address address, Address replacement, std::uint64_t lastWriteBefore);
+    bool settle(Address address, Address& replacement, std::uint64_t& write);
+
+    mutable std::mutex mutex_;
+    std::vector<Entry> entries_;
+    std::uint64_t writes_ = 0;
 };
 
 extern template class AddressReplacer<int>;

@@ -3,6 +3,7 @@
 
 #include <charconv>
 #include <cstring>
+#include <utility>
 
 #include "framework/HostServicePointers.h"
 #include "platform/IPermanentStorage.h"
@@ -63,6 +64,20 @@ void takeStored(const std::string& section, const std::string& key,
     }
 }
 
+/// Writes the value by its type; other types are skipped.
+void putStored(const std::string& section, const std::string& key,
+               const ParameterReplacer::Variant& value) {
+    IPermanentStorage* store = storage();
+    if (store == nullptr) return;
+    const char* place = section.c_str();
+    const char* name = key.c_str();
+    if (value.type == ParameterReplacer::integer) store->writeInt(place, name, value.intValue);
+    if (value.type == ParameterReplacer::boolean) store->writeBool(place, name, value.boolValue);
+    if (value.type == ParameterReplacer::text) {
+        store->writeString(place, name, value.stringValue.c_str());
+    }
+}
+
 std::string stagingKey(const std::string& name, int group) {
     return group == -1 ? name : name + std::to_string(group);
 }
@@ -78,16 +93,32 @@ std::string ParameterReplacer::makeFullName(std::string_view name, int node) {
     return full;
 }
 
-const ParameterReplacer::Variant& ParameterReplacer::lookUp(std::string_view name, int node,
-                                                            const Variant& fallback) {
-    const FullName full(name, node);
-    const auto cached = values_.find(full.view());
-    if (cached != values_.end()) return cached->second;
+void ParameterReplacer::setSection(const char* section) {
+    std::string named = section;
+    const std::lock_guard lock(mutex_);
+    section_ = std::move(named);
+}
 
+std::string ParameterReplacer::section() const {
+    const std::lock_guard lock(mutex_);
+    return section_;
+}
+
+ParameterReplacer::Number ParameterReplacer::lookUp(std::string_view name, int node,
+                                                    const Variant& fallback) {
+    const FullName full(name, node);
+    {
+        const std::lock_guard lock(mutex_);
+        const auto cached = values_.find(full.view());
+        if (cached != values_.end()) return {cached->second.boolValue, cached->second.intValue};
+    }
     const std::string key(full.view());
     Variant value = fallback;
-    takeStored(section_, key, value);
-    return values_.insert_or_assign(key, value).first->second;
+    takeStored(section(), key, value);
+
+    const std::lock_guard lock(mutex_);
+    const Variant& inForce = values_.try_emplace(key, value).first->second;
+    return {inForce.boolValue, inForce.intValue};
 }
 
 void ParameterReplacer::get(std::string_view name, int node, int fallback, int& out) {
@@ -105,17 +136,41 @@ void ParameterReplacer::get(std::string_view name, int node, bool fallback, bool
 }
 
 void ParameterReplacer::set(const std::string& fullName, const Variant& value) {
-    values_.insert_or_assign(fullName, value);
+    adopt({{fullName, value}});
+}
+
+/// Takes no memory, so that it never stops half way.
+void ParameterReplacer::adopt(Values values) {
+    const std::lock_guard lock(mutex_);
+    while (!values.empty()) {
+        auto placed = values_.insert(values.extract(values.begin()));
+        if (!placed.inserted) placed.position->second = std::move(placed.node.mapped());
+    }
 }
 
 void ParameterReplacer::persist(const std::string& fullName, const Variant& value) const {
-    IPermanentStorage* store = storage();
-    if (store == nullptr) return;
-    const char* section = section_.c_str();
-    const char* key = fullName.c_str();
-    if (value.type == integer) store->writeInt(section, key, value.intValue);
-    if (value.type == text) store->writeString(section, key, value.stringValue.c_str());
-    if (value.type == boolean) store->writeBool(section, key, value.boolValue);
+    putStored(section(), fullName, value);
+}
+
+/// Another thread's later value may have reached the storage first.
+/// @return true when memory and storage agree; else `value` is the one that belongs into the
+/// storage.
+bool ParameterReplacer::settle(const std::string& fullName, Variant& value) const {
+    const std::lock_guard lock(mutex_);
+    const auto inForce = values_.find(fullName);
+    if (inForce == values_.end() || inForce->second == value) return true;
+    value = inForce->second;
+    return false;
+}
+
+void ParameterReplacer::store(Values values) {
+    const std::string named = section();
+    adopt(values);
+    for (auto& [name, value] : values) {
+        do {
+            putStored(named, name, value);
+        } while (!settle(name, value));
+    }
 }
 
 void GroupParameterReplacer::set(const std::string& name, int group, int value) {
@@ -124,12 +179,21 @@ void GroupParameterReplacer::set(const std::string& name, int group, int value) 
     staged.name = name;
     staged.intValue = value;
     staged.group = group;
-    values_.insert_or_assign(stagingKey(name, group), staged);
+    const std::string key = stagingKey(name, group);
+    const std::lock_guard lock(mutex_);
+    values_.insert_or_assign(key, staged);
 }
 
 bool GroupParameterReplacer::get(const std::string& name, int group, int& out) const {
-    const auto staged = values_.find(stagingKey(name, group));
+    const std::string key = stagingKey(name, group);
+    const std::lock_guard lock(mutex_);
+    const auto staged = values_.find(key);
     if (staged == values_.end()) return false;
     out = staged->second.intValue;
     return true;
+}
+
+std::map<std::string, GroupParameterReplacer::Variant> GroupParameterReplacer::staged() const {
+    const std::lock_guard lock(mutex_);
+    return values_;
 }

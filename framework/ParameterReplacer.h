@@ -1,10 +1,12 @@
 // Run-time overrides of configured parameters, kept in the host's permanent storage.
 //
-// Where the host gave no storage the overrides live in memory only. Threads: no locks of their own;
-// whoever changes an override sees to it that nobody looks it up at that moment.
+// Where the host gave no storage the overrides live in memory only. Threads: any operation of one
+// replacer beside any other. The locks inside are leaf locks: the storage is never asked while one
+// is held.
 #pragma once
 
 #include <map>
+#include <mutex>
 #include <string>
 #include <string_view>
 
@@ -19,16 +21,20 @@ class ParameterReplacer {
         bool boolValue = false;
         int intValue = 0;
         std::string stringValue;
+
+        bool operator==(const Variant&) const = default;
     };
+    using Values = std::map<std::string, Variant, std::less<>>;
 
     /// @return `name` for node -1, else "node" + node + "_" + name.
     static std::string makeFullName(std::string_view name, int node);
 
     /// Names the storage section. Cached values stay.
-    void setSection(const char* section) { section_ = section; }
-    const std::string& section() const { return section_; }
+    void setSection(const char* section);
+    std::string section() const;
 
-    /// Stores the parameter's value in `out`. Allocates only at the first look-up of a key.
+    /// Stores the parameter's value in `out`. Allocates, and asks the storage, only at the first
+    /// look-up of a key. A set() that comes while the storage is being asked wins.
     void get(std::string_view name, int node, int fallback, int& out);
     void get(std::string_view name, int node, bool fallback, bool& out);
 
@@ -39,11 +45,23 @@ class ParameterReplacer {
     /// missing storage are skipped.
     void persist(const std::string& fullName, const Variant& value) const;
 
-  private:
-    const Variant& lookUp(std::string_view name, int node, const Variant& fallback);
+    /// set() and persist() of all of them, all or, without memory, none. When several threads store
+    /// the same parameter, the same one wins in memory and in the storage.
+    void store(Values values);
 
+  private:
+    struct Number {
+        bool boolValue;
+        int intValue;
+    };
+
+    Number lookUp(std::string_view name, int node, const Variant& fallback);
+    void adopt(Values values);
+    bool settle(const std::string& fullName, Variant& value) const;
+
+    mutable std::mutex mutex_;
     std::string section_;
-    std::map<std::string, Variant, std::less<>> values_;
+    Values values_;
 };
 
 /// A staging area: parameters are written one by one and applied together later. Never persisted
@@ -65,9 +83,10 @@ class GroupParameterReplacer {
     /// @return false, with `out` untouched, when nothing is staged.
     bool get(const std::string& name, int group, int& out) const;
 
-    /// The staged entries in key order.
-    const std::map<std::string, Variant>& staged() const { return values_; }
+    /// @return the entries that are staged at this moment, in key order.
+    std::map<std::string, Variant> staged() const;
 
   private:
+    mutable std::mutex mutex_;
     std::map<std::string, Variant> values_;
 };

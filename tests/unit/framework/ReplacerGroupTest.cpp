@@ -51,7 +51,7 @@ TEST(ReplacerGroup, EntryKeepsThePlainNameAndTheGroup) {
     GroupParameterReplacer staging;
     staging.set("stop", 12, 2);
     staging.set("mode", -1, 1);
-    const GroupParameterReplacer::Variant& grouped = staging.staged().at("stop12");
+    const GroupParameterReplacer::Variant grouped = staging.staged().at("stop12");
     EXPECT_EQ(grouped.type, ParameterReplacer::integer);
     EXPECT_EQ(grouped.name, "stop");
     EXPECT_FALSE(grouped.boolValue);
