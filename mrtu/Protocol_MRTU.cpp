@@ -71,11 +71,24 @@ int Protocol_MRTU::Config(const char* text) {
     if (!params_.parse(text)) return fail({-1, params_.getLastError()});
     // What follows takes no memory, so that a shortage cannot leave it half done.
     configured_ = true;
+    const std::lock_guard lock(lineMutex_);
     const _MRTU::Fault fault = takeOver(*params_.getCommonParams(), line_);
     return fault ? fail(fault) : 1;
 }
 
+_MRTU::SerialSettings Protocol_MRTU::lineSettings() const {
+    const std::lock_guard lock(lineMutex_);
+    return line_;
+}
+
+int Protocol_MRTU::lineSetting(int _MRTU::SerialSettings::*setting) const {
+    const std::lock_guard lock(lineMutex_);
+    return line_.*setting;
+}
+
 int Protocol_MRTU::Start() {
+    if (started_) return 1;
+    const std::lock_guard turn(portTurn_);
     if (started_) return 1;
     // Before a configuration there is no port, and the first look-up of an override would keep the
     // settings that are not there yet.
@@ -88,28 +101,38 @@ int Protocol_MRTU::Start() {
     return 1;
 }
 
+/// The first look-ups may ask the host's storage and so stand outside the lock; within it the
+/// values are known.
 void Protocol_MRTU::applySerialOverrides() {
+    _MRTU::SerialSettings configured = lineSettings();
+    takeSerialOverrides(configured);
+    const std::lock_guard lock(lineMutex_);
+    takeSerialOverrides(line_);
+}
+
+void Protocol_MRTU::takeSerialOverrides(_MRTU::SerialSettings& line) {
     constexpr int kNoNode = -1;
-    overrides_.get("baud", kNoNode, line_.baud, line_.baud);
-    overrides_.get("parity", kNoNode, line_.parity, line_.parity);
-    overrides_.get("stop", kNoNode, line_.stopBits, line_.stopBits);
-    overrides_.get("mode", kNoNode, line_.mode, line_.mode);
-    line_.gapMs = _MRTU::interCharacterGap(line_.baud);
+    overrides_.get("baud", kNoNode, line.baud, line.baud);
+    overrides_.get("parity", kNoNode, line.parity, line.parity);
+    overrides_.get("stop", kNoNode, line.stopBits, line.stopBits);
+    overrides_.get("mode", kNoNode, line.mode, line.mode);
+    line.gapMs = _MRTU::interCharacterGap(line.baud);
 }
 
 bool Protocol_MRTU::openPort() {
     // No line runs at 0 baud, and a host's port may divide by it.
-    if (line_.baud == 0 || serialFactory_ == nullptr || lock_ == nullptr) return false;
+    const int baud = lineSetting(&_MRTU::SerialSettings::baud);
+    if (baud == 0 || serialFactory_ == nullptr || lock_ == nullptr) return false;
     port_ = serialFactory_->openPort(params_.getCommonParams()->uart.c_str());
     if (port_ == nullptr) return false;
-    if (configurePort()) return true;
+    if (configure(*port_)) return true;
     releasePort();
     return false;
 }
 
-bool Protocol_MRTU::configurePort() {
-    return port_->configure(line_.baud, line_.parity, line_.dataBits, line_.stopBits, line_.mode) !=
-           0;
+bool Protocol_MRTU::configure(ISerialPort& port) const {
+    const _MRTU::SerialSettings line = lineSettings();
+    return port.configure(line.baud, line.parity, line.dataBits, line.stopBits, line.mode) != 0;
 }
 
 void Protocol_MRTU::releasePort() {
@@ -120,6 +143,8 @@ void Protocol_MRTU::releasePort() {
 int Protocol_MRTU::Stop() {
     if (!started_) return 1;
     const LineLock lock(*this);
+    const std::lock_guard turn(portTurn_);
+    if (!started_) return 1;
     if (port_ != nullptr) releasePort();
     started_ = false;
     return 1;
@@ -146,10 +171,11 @@ const char* const* Protocol_MRTU::tagUriNames() const {
 }
 
 int Protocol_MRTU::vcsGetComParams(char* text, int size) const {
-    const std::string report = params_.getCommonParams()->uart + ',' + std::to_string(line_.baud) +
-                               ',' + _MRTU::parityWord(line_.parity) + ',' +
-                               std::to_string(line_.dataBits) + ',' +
-                               std::to_string(line_.stopBits) + ',' + _MRTU::modeWord(line_.mode);
+    const _MRTU::SerialSettings line = lineSettings();
+    const std::string report = params_.getCommonParams()->uart + ',' + std::to_string(line.baud) +
+                               ',' + _MRTU::parityWord(line.parity) + ',' +
+                               std::to_string(line.dataBits) + ',' + std::to_string(line.stopBits) +
+                               ',' + _MRTU::modeWord(line.mode);
     ProtUtilsN::CopyBounded(text, report.c_str(), size);
     return 1;
 }

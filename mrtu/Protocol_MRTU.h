@@ -3,6 +3,7 @@
 
 #include <atomic>
 #include <cstdint>
+#include <mutex>
 #include <string>
 #include <vector>
 
@@ -19,9 +20,15 @@
 class Tag_MRTU;
 
 /// One serial line with its slaves.
-/// Threads: re-entrant. One lock serialises every complete exchange on the line; Stop() takes it
-/// too. Configuration, start, tag creation, console and the driver's own memory areas rely on the
-/// host's ordering.
+/// Threads: reads, writes, the driver's own areas, the console's "setid" and "getid", Start(),
+/// Stop(), the reports and the error state may come at the same time. Configuration, the creation
+/// and the freeing of tags rely on the host's ordering.
+/// Locks, in the order in which they are taken:
+/// 1. the transaction lock, the host's: every complete exchange on the line; Stop() takes it too;
+/// 2. the port's turn: whoever opens, sets up or releases the port does so alone. No transaction
+///    and none of the driver's areas but "SP_Done" waits for it;
+/// 3. leaf locks around the line's settings, inside the replacers and the error state. They are
+///    held for a few moves of memory, never over a call of the host's.
 class Protocol_MRTU : public ProtgenProtocol {
   public:
     /// REQUIRES: the module object holds the host's services.
@@ -65,10 +72,14 @@ class Protocol_MRTU : public ProtgenProtocol {
     int fail(const _MRTU::Fault& fault);
 
     // The line, held between Start() and Stop()
+    _MRTU::SerialSettings lineSettings() const;
+    int lineSetting(int _MRTU::SerialSettings::*setting) const;
     void applySerialOverrides();
+    void takeSerialOverrides(_MRTU::SerialSettings& line);
+    // REQUIRE: the caller has the port's turn.
     bool openPort();
     void releasePort();
-    bool configurePort();
+    bool configure(ISerialPort& port) const;
 
     // One exchange with a slave. REQUIRES: the line lock is held, except for pauseBefore().
     void pauseBefore(const Tag_MRTU& tag) const;
@@ -92,6 +103,7 @@ class Protocol_MRTU : public ProtgenProtocol {
     bool stage(const char* name, int value, bool allowed);
     void applyStaged();
     int serialValue(const char* name, int current);
+    void takeStaged();
 
     // Console commands
     int commandHelp(const char* command, char* answer, int size);
@@ -102,7 +114,10 @@ class Protocol_MRTU : public ProtgenProtocol {
     _MRTU::ParamManager params_;
     bool configured_ = false;  ///< A text was accepted, if only up to its parity or mode.
     MemoryManager memoryManager_;
+    mutable std::mutex lineMutex_;  // guards line_, a leaf but for the replacers' locks
     _MRTU::SerialSettings line_;
+    std::mutex portTurn_;
+    // Changed by Start() while it is not started, and by Stop(), which holds the transaction lock.
     ISerialPort* port_ = nullptr;
     ISerialFactory* serialFactory_;
     AddressReplacerID nodeOverrides_;

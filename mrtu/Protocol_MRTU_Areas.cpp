@@ -1,10 +1,13 @@
 // The driver's own memory areas: overrides of node address, Modicon mode and line settings. They
-// never reach the line and are served without the line lock; the host orders such accesses.
+// never reach the line and are served without the transaction lock.
+#include <utility>
+
 #include "framework/TextUtils.h"
 #include "mrtu/Protocol_MRTU.h"
 #include "mrtu/Tag_MRTU.h"
 
 using _MRTU::DriverArea;
+using _MRTU::SerialSettings;
 
 namespace {
 
@@ -39,16 +42,16 @@ void Protocol_MRTU::readDriverArea(const Tag_MRTU& tag, unsigned char* data) {
             data[0] = modiconMode(tag) ? 1 : 0;
             break;
         case DriverArea::baud:
-            storeInt(data, serialValue("baud", line_.baud));
+            storeInt(data, serialValue("baud", lineSetting(&SerialSettings::baud)));
             break;
         case DriverArea::parity:
-            data[0] = lowByte(serialValue("parity", line_.parity));
+            data[0] = lowByte(serialValue("parity", lineSetting(&SerialSettings::parity)));
             break;
         case DriverArea::stopBits:
-            data[0] = lowByte(serialValue("stop", line_.stopBits));
+            data[0] = lowByte(serialValue("stop", lineSetting(&SerialSettings::stopBits)));
             break;
         case DriverArea::lineMode:
-            data[0] = lowByte(serialValue("mode", line_.mode));
+            data[0] = lowByte(serialValue("mode", lineSetting(&SerialSettings::mode)));
             break;
         case DriverArea::apply:
             data[0] = 0;
@@ -87,9 +90,7 @@ void Protocol_MRTU::setModiconMode(int node, bool on) {
     ParameterReplacer::Variant value;
     value.type = ParameterReplacer::boolean;
     value.boolValue = on;
-    const std::string key = ParameterReplacer::makeFullName("ModiconMode", node);
-    overrides_.set(key, value);
-    overrides_.persist(key, value);
+    overrides_.store({{ParameterReplacer::makeFullName("ModiconMode", node), value}});
 }
 
 bool Protocol_MRTU::stage(const char* name, int value, bool allowed) {
@@ -101,19 +102,27 @@ bool Protocol_MRTU::stage(const char* name, int value, bool allowed) {
 /// Commits what is staged and sets the open port to the settings in force. The staged values stay
 /// and keep shadowing the committed ones.
 void Protocol_MRTU::applyStaged() {
+    ParameterReplacer::Values committed;
     for (const auto& [key, staged] : stagedOverrides_.staged()) {
         if (staged.group != -1) continue;
-        const ParameterReplacer::Variant value{staged.type, staged.boolValue, staged.intValue,
-                                               staged.stringValue};
-        overrides_.set(staged.name, value);
-        overrides_.persist(staged.name, value);
+        committed[staged.name] = {staged.type, staged.boolValue, staged.intValue,
+                                  staged.stringValue};
     }
+    overrides_.store(std::move(committed));
+    takeStaged();
+
+    const std::lock_guard turn(portTurn_);
+    if (port_ != nullptr) configure(*port_);
+}
+
+/// Start() has looked every one of the parameters up, so the host is not asked under the lock.
+void Protocol_MRTU::takeStaged() {
+    const std::lock_guard lock(lineMutex_);
     line_.baud = serialValue("baud", line_.baud);
     line_.parity = serialValue("parity", line_.parity);
     line_.stopBits = serialValue("stop", line_.stopBits);
     line_.mode = serialValue("mode", line_.mode);
     line_.gapMs = _MRTU::interCharacterGap(line_.baud);
-    if (port_ != nullptr) configurePort();
 }
 
 int Protocol_MRTU::serialValue(const char* name, int current) {

@@ -110,8 +110,8 @@ int Protocol_MRTU::receiveReply(const _MRTU::NodeParams& node, bool ascii, Reply
     if (port_->receiveByte(raw.data(), node.timeout, 0) == 0) return 0;
 
     int rest = 0;
-    const int ok =
-        port_->receiveFrame(raw.data() + 1, kMaxRest, node.timeout, line_.gapMs, &rest, 0);
+    const int gapMs = lineSetting(&_MRTU::SerialSettings::gapMs);
+    const int ok = port_->receiveFrame(raw.data() + 1, kMaxRest, node.timeout, gapMs, &rest, 0);
     rest = std::clamp(rest, 0, kMaxRest);
     if (ok != 0) {
         const _MRTU::ByteView received(raw.data(), static_cast<std::size_t>(1 + rest));

@@ -56,8 +56,9 @@ bool Protocol_MRTU::doReadBits(const ProtgenTag* tag, int index, unsigned char* 
 
 /// One read request. `data` is stored only after every check has passed.
 Fault Protocol_MRTU::readItems(const Tag_MRTU& tag, int index, unsigned char* data, int count) {
-    // A Stop() may have come while this thread waited for the line.
-    if (port_ == nullptr) return _MRTU::kNotStarted;
+    // A Stop() may have come while this thread waited for the line, and a Start() that has not yet
+    // opened or set up the port.
+    if (!started_) return _MRTU::kNotStarted;
 
     const std::uint16_t address = lineAddress(tag, index);
     const std::uint8_t node = lineNode(tag);

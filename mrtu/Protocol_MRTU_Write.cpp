@@ -93,8 +93,9 @@ int Protocol_MRTU::writeItems(const Tag_MRTU* tag, int index, const unsigned cha
 
 Fault Protocol_MRTU::writeRequest(const Tag_MRTU& tag, int index, const unsigned char* data,
                                   int count) {
-    // A Stop() may have come while this thread waited for the line.
-    if (port_ == nullptr) return _MRTU::kNotStarted;
+    // A Stop() may have come while this thread waited for the line, and a Start() that has not yet
+    // opened or set up the port.
+    if (!started_) return _MRTU::kNotStarted;
 
     const std::uint16_t address = lineAddress(tag, index);
     const std::uint8_t node = lineNode(tag);

@@ -74,9 +74,12 @@ void FakeMultiTask::deleteLock(ILock* lock) {
 void FakeMultiTask::sleep(int ms) {
     const bool lockHeld = heldByThisThread();
     EXPECT_GT(ms, 0) << "sleep()";
-    const std::lock_guard guard(mutex_);
-    sleeps_.push_back({ms, lockHeld});
-    nowMs_ += ms;
+    {
+        const std::lock_guard guard(mutex_);
+        sleeps_.push_back({ms, lockHeld});
+        nowMs_ += ms;
+    }
+    if (sleepWatcher_) sleepWatcher_();
 }
 
 std::vector<FakeMultiTask::Sleep> FakeMultiTask::sleeps() const {

@@ -3,6 +3,7 @@
 
 #include <atomic>
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <mutex>
 #include <thread>
@@ -32,6 +33,9 @@ class FakeMultiTask final : public IMultiTask2 {
     void deleteLock(ILock* lock) override;
     void sleep(int ms) override;
 
+    /// Called at the end of every sleep().
+    void onSleep(std::function<void()> watcher) { sleepWatcher_ = std::move(watcher); }
+
     std::int64_t nowMs() const { return nowMs_; }
     void advance(std::int64_t ms) { nowMs_ += ms; }
 
@@ -48,6 +52,7 @@ class FakeMultiTask final : public IMultiTask2 {
     mutable std::mutex mutex_;
     std::vector<std::unique_ptr<FakeLock>> locks_;
     std::vector<Sleep> sleeps_;
+    std::function<void()> sleepWatcher_;
     std::atomic<std::int64_t> nowMs_ = 0;
     std::atomic<int> timesLocked_ = 0;
 };

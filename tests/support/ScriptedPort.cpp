@@ -42,6 +42,10 @@ void ScriptedPort::forget() {
 
 int ScriptedPort::configure(int baud, int parity, int dataBits, int stopBits, int mode) {
     EXPECT_TRUE(open_) << "configure() of a released port";
+    if (configureWatcher_) {
+        configureWatcher_();
+        EXPECT_TRUE(open_) << "a port was released in the middle of configure()";
+    }
     const std::lock_guard guard(mutex_);
     settings_.push_back({baud, parity, dataBits, stopBits, mode});
     return refuseSettings_ ? 0 : 1;

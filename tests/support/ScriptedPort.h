@@ -64,6 +64,8 @@ class ScriptedPort final : public ISerialPort {
     void refuseSettings(bool refuse = true) { refuseSettings_ = refuse; }
     /// Called at every send(), before the reply is there.
     void onSend(std::function<void(const Bytes&)> watcher) { watcher_ = std::move(watcher); }
+    /// Called in the middle of every configure().
+    void onConfigure(std::function<void()> watcher) { configureWatcher_ = std::move(watcher); }
 
     // What happened.
     std::vector<Bytes> sent() const { return sent_; }
@@ -107,6 +109,7 @@ class ScriptedPort final : public ISerialPort {
     std::deque<Entry> script_;
     Slave slave_;
     std::function<void(const Bytes&)> watcher_;
+    std::function<void()> configureWatcher_;
     std::deque<std::uint8_t> input_;
     Bytes lateInput_;
     std::optional<std::uint8_t> noise_;

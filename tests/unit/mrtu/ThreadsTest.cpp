@@ -1,6 +1,7 @@
 // Several threads on one line.
 #include <atomic>
 #include <future>
+#include <latch>
 #include <thread>
 
 #include "tests/unit/mrtu/DriverTest.h"
@@ -87,6 +88,72 @@ TEST_F(ThreadsTest, TransactionBehindAStopFindsTheLineClosed) {
     reader.join();
     EXPECT_EQ(1, host.serialFactory.released());
     EXPECT_FALSE(host.multiTask.anyLockHeld());
+}
+
+/// A thread passes the first look at the state, pauses, and takes the line only when the driver was
+/// stopped and is about to start again: the port is open by then, but nobody has set it up.
+TEST_F(ThreadsTest, TransactionThatWaitedThroughAStopKeepsOffAPortThatIsBeingStarted) {
+    start("repeat=0 delay=1");
+    port.answerWith(answer);
+    const Tag_MRTU* word = tag("1?HREG?400001?short");
+    std::latch paused(1);
+    std::latch startedAgain(1);
+    std::latch finished(1);
+    host.multiTask.onSleep([&] {
+        paused.count_down();
+        startedAgain.wait();
+    });
+    bool done = true;
+    std::thread reader([&] {
+        unsigned char data[2] = {};
+        done = driver->doReadBlock(word, 5, data, 1);
+        finished.count_down();
+    });
+    paused.wait();
+    driver->Stop();
+    port.onConfigure([&] {
+        startedAgain.count_down();
+        finished.wait();
+    });
+    EXPECT_NE(0, driver->Start());
+    reader.join();
+    EXPECT_FALSE(done);
+    EXPECT_EQ("", sent());
+    expectError(-3, "Protocol not started");
+}
+
+TEST_F(ThreadsTest, StopWaitsForThePortToBeSetUpBySpDone) {
+    start();
+    const Tag_MRTU* apply = tag("1?SP_Done?0?boolean");
+    std::latch stopping(1);
+    std::thread stopper;
+    port.onConfigure([&] {
+        stopper = std::thread([&] {
+            stopping.count_down();
+            driver->Stop();
+        });
+        stopping.wait();
+        EXPECT_EQ(0, host.serialFactory.released());
+    });
+    const unsigned char any = 1;
+    EXPECT_NE(0, driver->doWrite(apply, 0, &any, 1));
+    stopper.join();
+    EXPECT_EQ(1, host.serialFactory.released());
+}
+
+/// Two threads start at once: the port is opened by one of them.
+TEST_F(ThreadsTest, TwoStartsOpenThePortOnce) {
+    configure();
+    std::latch bothThere(2);
+    const auto startOnce = [&] {
+        bothThere.arrive_and_wait();
+        EXPECT_NE(0, driver->Start());
+    };
+    std::thread first(startOnce);
+    std::thread second(startOnce);
+    first.join();
+    second.join();
+    EXPECT_EQ(1U, host.serialFactory.opened().size());
 }
 
 /// A write of one bit is a read and a write of its register; were they not one step, a thread would
