@@ -4,8 +4,11 @@
 #include "engine/Footprint.h"
 #include "engine/ImageBuffer.h"
 #include "engine/ProtgenProtocol.h"
+#include "engine/WriteTurn.h"
 #include "framework/BitUtils.h"
 #include "framework/DataTypes.h"
+
+using engine::WriteTurn;
 
 namespace {
 
@@ -81,7 +84,11 @@ int ProtgenProtocol::readArrayItem(const ITag* tag, int index, unsigned char* va
 
 int ProtgenProtocol::writeArrayItem(const ITag* tag, int index, const unsigned char* value) {
     const ProtgenTag& target = *static_cast<const ProtgenTag*>(tag);
-    if (!itemsAreAddressed(target, true)) return ProtocolBase::writeArrayItem(tag, index, value);
+    if (target.memoryType() == nullptr) return ProtocolBase::writeArrayItem(tag, index, value);
+    if (!itemsAreAddressed(target, true)) {
+        const WriteTurn turn(writeTurns_, target, WriteTurn::change);
+        return ProtocolBase::writeArrayItem(tag, index, value);
+    }
     if (!arrayItemInRange(tag, index)) return 0;
     if (refuseWrite(target, engine::itemsOfTag(target))) return 0;
 
@@ -90,7 +97,7 @@ int ProtgenProtocol::writeArrayItem(const ITag* tag, int index, const unsigned c
     const engine::Footprint& place = image.place();
     const bool readFirst = place.partial || image.hasPartners();
 
-    const std::lock_guard<std::mutex> lock(writeMutex_);
+    const WriteTurn turn(writeTurns_, target, readFirst ? WriteTurn::change : WriteTurn::free);
     if (readFirst && !readItems(target, place.address, image.items(), place.count)) return 0;
     if (image.hasPartners() && !image.toRunTime()) return fail(-9, "read conversion error");
     std::memcpy(image.value(), value, static_cast<std::size_t>(image.length()));

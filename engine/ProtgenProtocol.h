@@ -3,16 +3,16 @@
 #pragma once
 
 #include <cstdint>
-#include <mutex>
 
 #include "engine/ProtgenTag.h"
+#include "engine/WriteTurns.h"
 #include "framework/ProtocolBase.h"
 
 /// Any data type that a memory accepts works at any length: the engine reads and writes whole
 /// items of the memory. A write that covers only part of an item reads it first, changes the tag's
-/// bits and writes it back; all writes of one object exclude each other meanwhile, so that two
-/// threads writing different bits of one register lose no update. When such a read fails nothing is
-/// written.
+/// bits and writes it back. Meanwhile it keeps other writers out of that memory of that configured
+/// node, so that two threads writing different bits of one register lose no update, and no whole
+/// write is undone; other writes wait for nobody at all. When such a read fails nothing is written.
 /// Addresses in front of, or behind the memory type's index range, lengths below 1 and writes to a
 /// read-only memory are refused with -1 before anything is sent. What a failed read would have
 /// stored is not stored, whichever of its requests failed; a failed write leaves the blocks in
@@ -75,6 +75,5 @@ class ProtgenProtocol : public ProtocolBase {
     bool refuse(const char* fault);
     int fail(int code, const char* text);
 
-    // Held by every write from its first read to its last request.
-    std::mutex writeMutex_;
+    engine::WriteTurns writeTurns_;
 };

@@ -5,6 +5,9 @@
 #include "engine/Footprint.h"
 #include "engine/ImageBuffer.h"
 #include "engine/ProtgenProtocol.h"
+#include "engine/WriteTurn.h"
+
+using engine::WriteTurn;
 
 int ProtgenProtocol::Write(const ITag* tag, const unsigned char* value) {
     const ProtgenTag& target = *static_cast<const ProtgenTag*>(tag);
@@ -14,7 +17,7 @@ int ProtgenProtocol::Write(const ITag* tag, const unsigned char* value) {
     if (image.data() == nullptr) return fail(-1, "Out of memory");
     unsigned char* items = image.data() + place.firstByte();
 
-    const std::lock_guard<std::mutex> lock(writeMutex_);
+    const WriteTurn turn(writeTurns_, target, place.partial ? WriteTurn::change : WriteTurn::free);
     const bool readFirst = place.partial && engine::declaredBlock(target, true) != 0;
     if (readFirst && !readItems(target, place.address, items, place.count)) return 0;
     if (!target.ConvertVariable(value, image.data(), true)) {
@@ -30,12 +33,11 @@ int ProtgenProtocol::WriteBlock(const ITag* tag, const unsigned char* data, int 
     const int itemLength = target.memoryItemLength();
     const int items = length / itemLength + (length % itemLength > 0 ? 1 : 0);
     if (refuseWrite(target, items)) return 0;
-    const bool whole = length % itemLength == 0;
-    ImageBuffer image(whole ? 0 : items * itemLength);
+    if (length % itemLength == 0) return writeItems(target, target.offset(), data, items) ? 1 : 0;
+    ImageBuffer image(items * itemLength);
     if (image.data() == nullptr) return fail(-1, "Out of memory");
 
-    const std::lock_guard<std::mutex> lock(writeMutex_);
-    if (whole) return writeItems(target, target.offset(), data, items) ? 1 : 0;
+    const WriteTurn turn(writeTurns_, target, WriteTurn::change);
     const bool readFirst = engine::declaredBlock(target, true) != 0;
     if (readFirst && !readItems(target, target.offset(), image.data(), items)) return 0;
     std::memcpy(image.data(), data, static_cast<std::size_t>(length));
@@ -51,7 +53,6 @@ int ProtgenProtocol::WriteBitBlock(const ITag* tag, const unsigned char* data, i
 int ProtgenProtocol::writeBits(const ProtgenTag& tag, const unsigned char* data,
                                std::int64_t count) {
     if (refuseWrite(tag, count)) return 0;
-    const std::lock_guard<std::mutex> lock(writeMutex_);
     return writeItems(tag, tag.offset(), data, static_cast<int>(count)) ? 1 : 0;
 }
 
@@ -60,6 +61,7 @@ bool ProtgenProtocol::writeItems(const ProtgenTag& tag, int address, const unsig
     for (const Blocks::Block block : Blocks(count, requestLimit(tag, count, true))) {
         const int index = address + block.first;
         const int byte = engine::byteOfItem(tag, address, block.first);
+        const WriteTurn turn(writeTurns_, tag, WriteTurn::request);
         const int done = tag.inBitMemory() ? doWriteBits(&tag, index, data + byte, block.count)
                                            : doWrite(&tag, index, data + byte, block.count);
         if (done == 0) return false;
