@@ -3,10 +3,15 @@
 
 #include "platform/IInterface.h"
 
-/// An open serial port. One thread at a time; the driver's transaction lock sees to that.
+/// An open serial port.
+/// Threads: purge(), receiveByte(), send() and receiveFrame() come one at a time; the driver's
+/// transaction lock sees to that. configure() may come from another thread beside any one of them,
+/// also between a request and its reply, but never beside another configure(). The release comes
+/// when all of them have returned.
 class ISerialPort {
   public:
-    /// Applies the line settings.
+    /// Applies the line settings to what is sent and received from now on. A frame that is being
+    /// sent leaves whole, with the settings that it began with; what is being received may be lost.
     /// @param baud      Bits per second, e.g. 9600.
     /// @param parity    0 none, 1 even, 2 odd, 3 mark, 4 space.
     /// @param dataBits  7 or 8.

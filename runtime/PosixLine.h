@@ -1,12 +1,15 @@
 // A serial line behind a file descriptor: the one place that reads, writes and polls.
 #pragma once
 
+#include <atomic>
+
 #include "runtime/Line.h"
 
 namespace runtime {
 
 /// A line that was once seen to be gone stays gone: every later call says so without a system
 /// call. End of file, an I/O error, and hang-up, error or bad descriptor from poll() mean gone.
+/// Threads: discardInput() and discardOutput() may come beside any other operation.
 class PosixLine final : public Line {
   public:
     /// @param fd  A terminal opened with O_NONBLOCK whose empty reads say EAGAIN (VMIN 1). Stays
@@ -30,7 +33,7 @@ class PosixLine final : public Line {
     Moved moved(long result);
 
     int fd_;
-    bool gone_ = false;
+    std::atomic<bool> gone_ = false;
 };
 
 }  // namespace runtime

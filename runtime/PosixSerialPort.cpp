@@ -107,6 +107,7 @@ PosixSerialPort::~PosixSerialPort() {
 }
 
 int PosixSerialPort::configure(int baud, int parity, int dataBits, int stopBits, int mode) {
+    const std::lock_guard guard(sendMutex_);
     settings_ = {baud, parity, dataBits, stopBits, mode};
     std::string fault = settingsFault(settings_);
     if (fault.empty()) fault = applyFormat();
@@ -160,6 +161,7 @@ int PosixSerialPort::receiveByte(unsigned char* byte, int timeoutMs, int /*reser
 }
 
 int PosixSerialPort::send(const unsigned char* data, int length) {
+    const std::lock_guard guard(sendMutex_);
     // Without a rate there is no time that sending may take.
     if (length < 0 || !speedOf(settings_.baud)) return 0;
     const auto count = static_cast<std::size_t>(length);

@@ -5,6 +5,7 @@
 #include <termios.h>
 
 #include <memory>
+#include <mutex>
 #include <optional>
 #include <string>
 
@@ -55,7 +56,8 @@ class PosixSerialPort final : public ISerialPort {
 
     /// Also checks that the terminal took the settings over, and starts with empty queues. In the
     /// RS-485 modes the kernel switches the direction where the port has that ability; elsewhere
-    /// the port is used as it is, since adapters commonly switch by themselves.
+    /// the port is used as it is, since adapters commonly switch by themselves. Waits for a send()
+    /// of another thread, never for one that receives.
     int configure(int baud, int parity, int dataBits, int stopBits, int mode) override;
     void purge() override;
     int receiveByte(unsigned char* byte, int timeoutMs, int reserved) override;
@@ -85,7 +87,8 @@ class PosixSerialPort final : public ISerialPort {
     LastAct putBackAtTheEnd_;
     std::optional<serial_rs485> direction_;  ///< In force now.
     bool pseudo_;
-    SerialSettings settings_;
+    std::mutex sendMutex_;     // Held while a frame is sent, and while the settings change.
+    SerialSettings settings_;  // Guarded by sendMutex_.
 };
 
 }  // namespace runtime
