@@ -5,8 +5,8 @@
 # libraries or programs that a cross compiler does not bring, and are left out without MRTU_TOOLS.
 # A folder of desktop tests sets MRTU_TEST_LABEL instead of marking each program.
 #
-# Programs whose subject is what several threads do at once have the label `threads` besides; the
-# target mrtu_threaded_tests builds them all, for the thread sanitizer.
+# The label of a program whose subject is what several threads do at once ends in "-threads"
+# (ctest -L 'threads$'); the target mrtu_threaded_tests builds these, for the thread sanitizer.
 set(MRTU_TEST_LABEL portable)
 
 if(MRTU_TESTS)
@@ -47,7 +47,7 @@ function(mrtu_test name)
   target_link_libraries(${name} PRIVATE mrtu_flags ${arg_LIBS} GTest::gmock_main)
   target_precompile_headers(${name} REUSE_FROM mrtu_test_headers)
   if(arg_THREADS)
-    string(APPEND label "\\;threads")
+    string(APPEND label "-threads")
     add_dependencies(mrtu_threaded_tests ${name})
   endif()
   gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST PROPERTIES TIMEOUT 300 LABELS "${label}")
