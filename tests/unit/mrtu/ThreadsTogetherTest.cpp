@@ -181,7 +181,7 @@ TEST_F(ThreadsTogetherTest, ReadsWritesAreasConsoleStartAndStop) {
     repeat([=, this](int round) {
         writeArea(baud, round % 2 == 0 ? 19200 : 9600);
         writeArea(parity, round % 3);
-        readArea(baud, {9600, 19200});
+        readArea(baud, {9600, 19200, 38400});
         writeArea(apply, 1);
     });
     repeat([=, this](int round) {
