@@ -40,9 +40,13 @@ function(mrtu_shared_library target exports)
   set_target_properties(${target} PROPERTIES
     INSTALL_RPATH "$ORIGIN" BUILD_WITH_INSTALL_RPATH ON
     LINK_DEPENDS "${exports}")
+  # Each calls its own copy of the framework's functions, whoever stands first in the look-up order:
+  # an exception must not pass from one library into the other. Data stay shared.
+  target_link_options(${target} PRIVATE "-Wl,-Bsymbolic-functions")
   target_link_options(${target} PRIVATE "-Wl,--version-script=${exports}" "-Wl,--gc-sections")
   if(MRTU_STATIC_RUNTIME)
     target_link_options(${target} PRIVATE -static-libstdc++ -static-libgcc -Wl,--exclude-libs,ALL)
-    target_sources(${target} PRIVATE "${CMAKE_SOURCE_DIR}/cmake/StaticRuntime.cpp")
+    target_sources(${target} PRIVATE
+      "${CMAKE_SOURCE_DIR}/cmake/StaticRuntime.cpp" "${CMAKE_SOURCE_DIR}/cmake/ThrownHere.cpp")
   endif()
 endfunction()
