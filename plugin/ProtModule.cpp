@@ -63,6 +63,10 @@ int ProtModule::Init(IInterfaceFactory* host) {
         ++initCount_;
         return 1;
     }
+    if (host == nullptr) {
+        lastError_ = "Interface factory not given";
+        return 0;
+    }
     for (const Service& service : services) {
         service.pointer = host->CreateInterface(service.name);
         if (service.pointer != nullptr || service.missing == nullptr) continue;

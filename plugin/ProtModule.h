@@ -2,8 +2,6 @@
 #pragma once
 
 #include <cstdint>
-#include <string>
-
 #include "platform/IProtModule.h"
 
 /// Counts its users: the services are taken by the first Init() and handed back by the last
@@ -20,10 +18,10 @@ class ProtModule final : public IProtModule {
     int GetImpVersion() const override { return 100; }
     int Init(IInterfaceFactory* host) override;
     void Close() override;
-    const char* GetLastError() const override { return lastError_.c_str(); }
+    const char* GetLastError() const override { return lastError_; }
 
   private:
-    std::string lastError_;
+    const char* lastError_ = "";  ///< A fixed text: a failure needs no memory.
     IInterfaceFactory* host_ = nullptr;
     std::uint32_t initCount_ = 0;
 };
