@@ -85,15 +85,6 @@ std::uint64_t AddressReplacer<Address>::lastWrite() const {
     return writes_;
 }
 
-/// A value written since then is newer than what the storage held.
-template <class Address>
-void AddressReplacer<Address>::restoreEntry(Address address, Address replacement,
-                                            std::uint64_t lastWriteBefore) {
-    const std::lock_guard lock(mutex_);
-    Entry& entry = entryOf(address);
-    if (entry.write <= lastWriteBefore) entry.replacement = replacement;
-}
-
 /// Compares what has just reached the storage with the memory. A restore may have put the old value
 /// back into the memory; a later write may have reached the storage first.
 /// @return true when both agree now; else the value that belongs into the storage, and its number.
@@ -128,20 +119,34 @@ void AddressReplacer<Address>::setValue(Address address, Address replacement, co
 }
 
 template <class Address>
-void AddressReplacer<Address>::restore(const char* section) {
+typename AddressReplacer<Address>::Stored AddressReplacer<Address>::stored(
+    const char* section) const {
+    Stored found;
     IPermanentStorage* store = storage();
-    if (section == nullptr || store == nullptr) return;
+    if (section == nullptr || store == nullptr) return found;
 
-    const std::uint64_t lastWriteBefore = lastWrite();
+    found.lastWriteBefore = lastWrite();
     const std::string prefix = getPrefix();
     const int count = store->keyCount(section);
     for (int index = 0; index < count; ++index) {
         // The extension is asked for anew with every key: the host may exchange it meanwhile.
-        const StoredText stored(store, section);
-        const std::string key = stored.key(index);
+        const StoredText text(store, section);
+        const std::string key = text.key(index);
         if (!key.starts_with(prefix)) continue;
         const Address address = fromString(key.substr(prefix.size()));
-        restoreEntry(address, fromString(stored.value(key)), lastWriteBefore);
+        found.pairs.emplace_back(address, fromString(text.value(key)));
+    }
+    return found;
+}
+
+template <class Address>
+void AddressReplacer<Address>::adopt(const Stored& stored) {
+    const std::lock_guard lock(mutex_);
+    entries_.reserve(entries_.size() + stored.pairs.size());  // nothing below takes memory
+    for (const Pair& pair : stored.pairs) {
+        Entry& entry = entryOf(pair.first);
+        // A value written since then is newer than what the storage held.
+        if (entry.write <= stored.lastWriteBefore) entry.replacement = pair.second;
     }
 }
 

@@ -29,8 +29,17 @@ class AddressReplacer {
     /// itself removes the storage key; the pair stays listed.
     void setValue(Address address, Address replacement, const char* section);
 
-    /// Records every override that the section holds; nothing is written back.
-    void restore(const char* section);
+    /// What a storage section held, and when it was asked.
+    struct Stored {
+        std::vector<Pair> pairs;
+        std::uint64_t lastWriteBefore = 0;
+    };
+    /// @return every override that the section holds; nothing is recorded yet.
+    Stored stored(const char* section) const;
+    /// Records them, all or, without memory, none; nothing is written back.
+    void adopt(const Stored& stored);
+    /// Both of it.
+    void restore(const char* section) { adopt(stored(section)); }
 
     /// @return the replacement, or `address` itself when none is recorded.
     Address replacementOf(Address address) const;
@@ -52,7 +61,6 @@ class AddressReplacer {
     Entry& entryOf(Address address);
     std::uint64_t writeEntry(Address address, Address replacement);
     std::uint64_t lastWrite() const;
-    void restoreEntry(Address address, Address replacement, std::uint64_t lastWriteBefore);
     bool settle(Address address, Address& replacement, std::uint64_t& write);
 
     mutable std::mutex mutex_;

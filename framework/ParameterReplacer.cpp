@@ -104,6 +104,30 @@ std::string ParameterReplacer::section() const {
     return section_;
 }
 
+bool ParameterReplacer::isCached(std::string_view fullName) const {
+    const std::lock_guard lock(mutex_);
+    return values_.contains(fullName);
+}
+
+ParameterReplacer::Opened ParameterReplacer::open(const char* section,
+                                                  std::initializer_list<Default> wanted) const {
+    Opened opened{section, {}};
+    for (const Default& each : wanted) {
+        if (isCached(each.name)) continue;
+        const auto place = opened.values.try_emplace(each.name).first;
+        place->second.type = integer;
+        place->second.intValue = each.value;
+        takeStored(opened.section, place->first, place->second);
+    }
+    return opened;
+}
+
+void ParameterReplacer::adopt(Opened opened) noexcept {
+    const std::lock_guard lock(mutex_);
+    section_.swap(opened.section);
+    values_.merge(opened.values);
+}
+
 ParameterReplacer::Number ParameterReplacer::lookUp(std::string_view name, int node,
                                                     const Variant& fallback) {
     const FullName full(name, node);
@@ -136,11 +160,11 @@ void ParameterReplacer::get(std::string_view name, int node, bool fallback, bool
 }
 
 void ParameterReplacer::set(const std::string& fullName, const Variant& value) {
-    adopt({{fullName, value}});
+    overwrite({{fullName, value}});
 }
 
 /// Takes no memory, so that it never stops half way.
-void ParameterReplacer::adopt(Values values) {
+void ParameterReplacer::overwrite(Values values) {
     const std::lock_guard lock(mutex_);
     while (!values.empty()) {
         auto placed = values_.insert(values.extract(values.begin()));
@@ -165,7 +189,7 @@ bool ParameterReplacer::settle(const std::string& fullName, Variant& value) cons
 
 void ParameterReplacer::store(Values values) {
     const std::string named = section();
-    adopt(values);
+    overwrite(values);
     for (auto& [name, value] : values) {
         do {
             putStored(named, name, value);

@@ -5,6 +5,7 @@
 // is held.
 #pragma once
 
+#include <initializer_list>
 #include <map>
 #include <mutex>
 #include <string>
@@ -33,6 +34,21 @@ class ParameterReplacer {
     void setSection(const char* section);
     std::string section() const;
 
+    /// A section with its integers, fetched and not yet in force.
+    struct Opened {
+        std::string section;
+        Values values;
+    };
+    struct Default {
+        const char* name;
+        int value;
+    };
+    /// Fetches those integers without a node that are not cached yet, in the order given; nothing
+    /// is changed.
+    Opened open(const char* section, std::initializer_list<Default> wanted) const;
+    /// Puts them in force. Takes no memory. Values that were cached meanwhile stay.
+    void adopt(Opened opened) noexcept;
+
     /// Stores the parameter's value in `out`. Allocates, and asks the storage, only at the first
     /// look-up of a key. A set() that comes while the storage is being asked wins.
     void get(std::string_view name, int node, int fallback, int& out);
@@ -56,7 +72,8 @@ class ParameterReplacer {
     };
 
     Number lookUp(std::string_view name, int node, const Variant& fallback);
-    void adopt(Values values);
+    bool isCached(std::string_view fullName) const;
+    void overwrite(Values values);
     bool settle(const std::string& fullName, Variant& value) const;
 
     mutable std::mutex mutex_;
