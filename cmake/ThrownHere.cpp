@@ -6,7 +6,7 @@
 // carries the run time inside replaces these two functions of it; the linker then leaves out the
 // run time's own.
 //
-// The entries are layed out as the C++ ABI says. Source: Itanium C++ ABI, 2.2.2; Exception Handling
+// The entries are laid out as the C++ ABI says. Source: Itanium C++ ABI, 2.2.2; Exception Handling
 // ABI for the Arm Architecture, 8.3.
 #include <cxxabi.h>
 #include <sys/syscall.h>

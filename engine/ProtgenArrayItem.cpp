@@ -77,7 +77,7 @@ int ProtgenProtocol::readArrayItem(const ITag* tag, int index, unsigned char* va
     if (!image.complete()) return fail(-1, "Out of memory");
     const engine::Footprint& place = image.place();
     if (!readItems(source, place.address, image.items(), place.count)) return 0;
-    if (!image.toRunTime()) return fail(-9, "read conversion error");
+    if (!image.toRunTime()) return conversionFailed(tag, "read conversion error");
     std::memcpy(value, image.value(), static_cast<std::size_t>(image.length()));
     return 1;
 }
@@ -99,9 +99,10 @@ int ProtgenProtocol::writeArrayItem(const ITag* tag, int index, const unsigned c
 
     const WriteTurn turn(writeTurns_, target, readFirst ? WriteTurn::change : WriteTurn::free);
     if (readFirst && !readItems(target, place.address, image.items(), place.count)) return 0;
-    if (image.hasPartners() && !image.toRunTime()) return fail(-9, "read conversion error");
+    if (image.hasPartners() && !image.toRunTime())
+        return conversionFailed(tag, "read conversion error");
     std::memcpy(image.value(), value, static_cast<std::size_t>(image.length()));
-    if (!image.toItems()) return fail(-9, "write conversion error");
+    if (!image.toItems()) return conversionFailed(tag, "write conversion error");
     return writeItems(target, place.address, image.items(), place.count) ? 1 : 0;
 }
 

@@ -25,7 +25,15 @@ std::int64_t firstBit(const ProtgenTag& tag) {
     return std::int64_t{tag.offset()} * tag.memoryItemLength() * 8 + (bits ? tag.subIndex() : 0);
 }
 
+const char* readFault(const ITag* tag) {
+    return engine::accessFault(own(tag), engine::itemsOfTag(own(tag)), false);
+}
+
 }  // namespace
+
+ProtgenProtocol::ProtgenProtocol() {
+    readCheck_ = readFault;
+}
 
 bool ProtgenProtocol::CanBeOptimized(const ITag* a, const ITag* b, bool write) const {
     const ProtgenTag& first = own(a);

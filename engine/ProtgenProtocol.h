@@ -21,6 +21,8 @@
 /// Threads: reads and writes may run concurrently when the driver's hooks may.
 class ProtgenProtocol : public ProtocolBase {
   public:
+    ProtgenProtocol();
+
     bool CanBeOptimized(const ITag* a, const ITag* b, bool write) const override;
     int Write(const ITag* tag, const unsigned char* value) override;
     int ReadBlock(const ITag* tag, unsigned char* data, int length) override;

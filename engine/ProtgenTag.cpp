@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "framework/DataTypes.h"
+#include "framework/Guarded.h"
 #include "framework/TextUtils.h"
 
 namespace {
@@ -28,8 +29,17 @@ std::string addressField(const std::string& uri, const char* const* fieldNames) 
 
 }  // namespace
 
-ProtgenTag::ProtgenTag(const char* uri, const char* const* fieldNames)
-    : uri_(uri != nullptr ? uri : "") {
+ProtgenTag::ProtgenTag(const char* uri, const char* const* fieldNames) {
+    complete_ = guarded(
+        false, [] {},
+        [&] {
+            if (uri != nullptr) uri_ = uri;
+            takeAddress(fieldNames);
+            return true;
+        });
+}
+
+void ProtgenTag::takeAddress(const char* const* fieldNames) {
     const std::string address = addressField(uri_, fieldNames);
     const std::size_t dot = address.find('.');
     offset_ = ProtUtilsN::ParseInteger(address.substr(0, dot).c_str());
@@ -38,7 +48,9 @@ ProtgenTag::ProtgenTag(const char* uri, const char* const* fieldNames)
 }
 
 ITag* ProtgenTag::Clone() const {
-    return new ProtgenTag(*this);
+    return guarded(
+        static_cast<ITag*>(nullptr), [this] { SetError("Out of memory"); },
+        [this]() -> ITag* { return new ProtgenTag(*this); });
 }
 
 unsigned int ProtgenTag::GetByteOffset() const {
@@ -63,12 +75,19 @@ bool ProtgenTag::IsReadOnly() const {
     return memoryType_ != nullptr && memoryType_->isReadOnly();
 }
 
-void ProtgenTag::setDataType(ICU_Type type, ICU_Type itemType, int length,
+bool ProtgenTag::setDataType(ICU_Type type, ICU_Type itemType, int length,
                              std::vector<std::string> conversions) {
+    const bool taken = guarded(
+        false, [] {},
+        [&] {
+            setConversions(std::move(conversions));
+            return true;
+        });
+    if (!taken) return false;
     type_ = type;
     itemType_ = itemType;
     length_ = length;
-    setConversions(std::move(conversions));
+    return true;
 }
 
 bool ProtgenTag::inBitMemory() const {

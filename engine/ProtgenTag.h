@@ -12,6 +12,8 @@
 /// address of the first item and GetBitIndex() the sub-index as written: the first bit of a boolean
 /// tag, counted from the least significant bit of the first item on. Other types begin with the
 /// first item's first byte, whatever the sub-index.
+/// The constructor throws nothing, since the driver that derives from it is another library: who
+/// makes a tag asks isComplete().
 /// Threads: the setters belong to the creation of the tag; then it does not change.
 class ProtgenTag : public TagBase {
   public:
@@ -20,6 +22,8 @@ class ProtgenTag : public TagBase {
     /// @param uri         Copied.
     /// @param fieldNames  The names of the URI's fields, ended by a null pointer.
     ProtgenTag(const char* uri, const char* const* fieldNames);
+    /// Whether there was memory for the tag; else it must not be used.
+    bool isComplete() const { return complete_; }
 
     ITag* Clone() const override;
     unsigned int GetByteOffset() const override;
@@ -38,8 +42,9 @@ class ProtgenTag : public TagBase {
     int nodeId() const { return nodeId_; }
     void setNodeId(int nodeId) { nodeId_ = nodeId; }
 
-    void setDataType(ICU_Type type, ICU_Type itemType, int length,
-                     std::vector<std::string> conversions);
+    /// @return false, with nothing set, when there was no memory for the conversions.
+    [[nodiscard]] bool setDataType(ICU_Type type, ICU_Type itemType, int length,
+                                   std::vector<std::string> conversions);
 
     /// The memory area and its model, owned by the protocol's MemoryManager; null before they are
     /// set.
@@ -57,6 +62,9 @@ class ProtgenTag : public TagBase {
     ProtgenTag(const ProtgenTag&) = default;
 
   private:
+    void takeAddress(const char* const* fieldNames);
+
+    bool complete_ = false;
     std::string uri_;
     int nodeId_ = 0;
     int offset_ = 0;

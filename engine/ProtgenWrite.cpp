@@ -21,7 +21,7 @@ int ProtgenProtocol::Write(const ITag* tag, const unsigned char* value) {
     const bool readFirst = place.partial && engine::declaredBlock(target, true) != 0;
     if (readFirst && !readItems(target, place.address, items, place.count)) return 0;
     if (!target.ConvertVariable(value, image.data(), true)) {
-        return fail(-9, "write conversion error");
+        return conversionFailed(tag, "write conversion error");
     }
     return writeItems(target, place.address, items, place.count) ? 1 : 0;
 }

@@ -12,6 +12,7 @@
 #include "framework/DataTypes.h"
 #include "framework/HostServicePointers.h"
 #include "framework/TagBase.h"
+#include "framework/TextUtils.h"
 
 namespace {
 
@@ -32,34 +33,23 @@ bool equalTexts(const char* a, const char* b) {
 /// text and swallows whatever follows.
 class InfoWriter {
   public:
-    InfoWriter(char* out, int size) : out_(out), size_(size) {}
+    InfoWriter(char* out, int size) : out_(out, size) {}
 
     InfoWriter& operator<<(const char* text) {
         if (text == nullptr) bad_ = true;
-        if (!bad_) append(text, std::strlen(text));
+        if (!bad_) out_ << text;
         return *this;
     }
 
     InfoWriter& operator<<(int number) {
-        char digits[16];
-        const std::to_chars_result end = std::to_chars(digits, digits + sizeof digits, number);
-        if (!bad_) append(digits, static_cast<std::size_t>(end.ptr - digits));
+        if (!bad_) out_ << number;
         return *this;
     }
 
-    int written() const { return written_; }
+    int written() const { return out_.written(); }
 
   private:
-    void append(const char* text, std::size_t length) {
-        if (written_ >= size_) return;
-        const std::size_t count = std::min(length, static_cast<std::size_t>(size_ - written_));
-        std::memcpy(out_ + written_, text, count);
-        written_ += static_cast<int>(count);
-    }
-
-    char* out_;
-    int size_;
-    int written_ = 0;
+    ProtUtilsN::BoundedWriter out_;
     bool bad_ = false;
 };
 
@@ -85,16 +75,15 @@ void* ProtocolBase::ConvertTo(const char* name) {
 }
 
 ITag* ProtocolBase::CreateTag(const char* uri) {
-    ITag* tag = CreateTagBase(uri);
+    ITag* const tag = CreateTagBase(uri);
     if (tag == nullptr) return nullptr;
-    try {
+    const bool listed = guardedBy(false, [&] {
         tags_.add(tag);
-    } catch (const std::bad_alloc&) {
-        delete tag;
-        SetError(-1, "Out of memory");
-        return nullptr;
-    }
-    return tag;
+        return true;
+    });
+    if (listed) return tag;
+    delete tag;
+    return nullptr;
 }
 
 void ProtocolBase::FreeTag(ITag* tag) {
@@ -149,10 +138,19 @@ void ProtocolBase::SetError(int code, const char* text) noexcept {
     error_.set(code, orEmpty(text));
 }
 
+int ProtocolBase::outOfMemory() noexcept {
+    SetError(-1, "Out of memory");
+    return 0;
+}
+
 void ProtocolBase::SetTagError(const TagBase* tag) noexcept {
+    if (tag->wasShortOfMemory()) {
+        outOfMemory();
+        return;
+    }
     const std::string_view parts[] = {"Tag URI error: ", orEmpty(tag->GetVarName()), " - ",
                                       tag->GetError()};
-    if (!error_.setQuoting(-1, parts)) SetError(-1, "Out of memory");
+    if (!error_.setQuoting(-1, parts)) outOfMemory();
 }
 
 int ProtocolBase::GetInfo(char* buffer, int size) const {

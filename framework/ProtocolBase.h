@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "framework/ErrorState.h"
+#include "framework/Guarded.h"
 #include "framework/KeptText.h"
 #include "framework/TagList.h"
 #include "platform/IProtocol.h"
@@ -14,7 +15,8 @@ class TagBase;
 /// Supplies the error state, the identity, the ownership of tags, the generic reads, the queries
 /// of tag URI fields, the console and a refusing default for every optional capability.
 /// Pure operations are left to the engine and to the driver.
-/// Threads: no locking here; see IProtocol.
+/// Nothing is thrown, neither by the constructor nor by any operation: short memory is a failure
+/// with -1 "Out of memory", and all is as before the call. Threads: no locking here; see IProtocol.
 class ProtocolBase : public IProtocol7 {
   public:
     ProtocolBase();
@@ -128,6 +130,17 @@ class ProtocolBase : public IProtocol7 {
     /// together; see ErrorState. Null is an empty text. Needs no memory for texts of up to 256
     /// characters; longer ones are cut when there is none. Never throws. Threads: any.
     void SetError(int code, const char* text) noexcept;
+    /// Reports -1 "Out of memory", without needing any. @return 0
+    int outOfMemory() noexcept;
+    /// Reports why ConvertVariable() failed: -9 `text`, or that there was no memory for it.
+    /// REQUIRES: the tag is a TagBase, as every tag that CreateTagBase() makes. @return 0
+    int conversionFailed(const ITag* tag, const char* text) noexcept;
+    /// Runs a step of an entry; when it throws, reports the shortage and returns `refused`.
+    template <class Result, class Step>
+    Result guardedBy(Result refused, Step&& step) noexcept {
+        return guarded(
+            refused, [this] { outOfMemory(); }, std::forward<Step>(step));
+    }
     /// Reports the tag's own error text together with its URI, or "Out of memory". Never throws.
     void SetTagError(const TagBase* tag) noexcept;
     /// Destroys every tag that this object owns.
@@ -135,12 +148,22 @@ class ProtocolBase : public IProtocol7 {
     /// @return whether the tag is an array that has item `index`; sets the error when not.
     bool arrayItemInRange(const ITag* tag, int index);
 
+    /// Tells why the tag cannot be read as a whole, null when it can. The engine sets it in its
+    /// constructor, so that a tag of any length is refused before memory is taken for its value;
+    /// null: every tag is tried.
+    using ReadCheck = const char* (*)(const ITag* tag);
+    ReadCheck readCheck_ = nullptr;
+
   private:
+    class ConsoleTag;
+
     int refuseEvents();
-    int runCommand(const std::vector<std::string>& words, char* answer, int size);
+    bool refuseRead(const ITag* tag);
     int commandInfo(char* answer, int size) const;
-    int commandRead(const std::string& uri, char* answer, int size);
-    int commandWrite(const std::string& uri, const std::string& hex, char* answer, int size);
+    int commandMaxTm(char* answer, int size) const;
+    int commandRead(const std::vector<std::string>& words, char* answer, int size);
+    int commandWrite(const std::vector<std::string>& words, char* answer, int size);
+    bool showValue(const ITag* tag, char* answer, int size);
     const char* writeHex(const ITag* tag, const std::string& hex);
 
     TagList tags_;

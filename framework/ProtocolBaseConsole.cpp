@@ -1,7 +1,8 @@
 // The text console: single tags and the object's state, one command line at a time.
+#include <array>
 #include <cstdio>
-#include <new>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "framework/ProtocolBase.h"
@@ -70,43 +71,48 @@ bool hasTwoDigitsPerByte(const std::string& hex, int length) {
 
 }  // namespace
 
+/// A tag of one command: taken out of the list and destroyed whatever the command's end.
+class ProtocolBase::ConsoleTag {
+  public:
+    ConsoleTag(ProtocolBase& owner, const std::string& uri)
+        : owner_(owner), tag_(owner.CreateTag(uri.c_str())) {}
+    ~ConsoleTag() { owner_.FreeTag(tag_); }
+    ConsoleTag(const ConsoleTag&) = delete;
+    ConsoleTag& operator=(const ConsoleTag&) = delete;
+
+    /// Null when it could not be made; the error is set then.
+    const ITag* get() const { return tag_; }
+
+  private:
+    ProtocolBase& owner_;
+    ITag* tag_;
+};
+
 int ProtocolBase::DoCommand(const char* command, char* answer, int size) {
     if (command == nullptr) return 0;
-    try {
-        std::vector<std::string> words;
-        ProtUtilsN::ParseSubstrings(command, words, ' ');
-        return runCommand(words, answer, size);
-    } catch (const std::bad_alloc&) {
-        SetError(-1, "Out of memory");
-        return 0;
-    }
-}
-
-int ProtocolBase::runCommand(const std::vector<std::string>& words, char* answer, int size) {
-    const std::string& word = words.front();
+    // The word is told without memory, so that what it stands for is recognised at any time.
+    std::string_view line = command;
+    bool more = false;
+    const std::string_view word = ProtUtilsN::TakePiece(line, ' ', more);
     if (word == "help") return reply(answer, kHelp, size);
     if (word == "info") return commandInfo(answer, size);
     // The copy ends at the first zero, so only the line in front of the compressed text is shown.
     if (word == "xml") return reply(answer, reinterpret_cast<const char*>(GetXml()), size);
     if (word == "lasterror") return reply(answer, GetLastErrorString(), size);
-    if (word == "read") {
-        if (words.size() == 2) return commandRead(words[1], answer, size);
-        return reply(answer, "error: missing parameter (URI string)\n", size);
-    }
-    if (word == "write") {
-        if (words.size() == 3) return commandWrite(words[1], words[2], answer, size);
-        return reply(answer, "error: missing parameters (URI string + data)\n", size);
-    }
-    if (word == "getmaxtm") {
-        char text[32];
-        std::snprintf(text, sizeof text, "maxtm = %d ms\n", GetMaxTm(nullptr));
-        return reply(answer, text, size);
-    }
+    if (word == "getmaxtm") return commandMaxTm(answer, size);
     if (word == "deletetags") {
         DeleteTags();
         return 1;
     }
-    return 0;
+    if (word != "read" && word != "write") return 0;
+
+    const bool done = guardedBy(false, [&] {
+        std::vector<std::string> words;
+        ProtUtilsN::ParseSubstrings(command, words, ' ');
+        word == "read" ? commandRead(words, answer, size) : commandWrite(words, answer, size);
+        return true;
+    });
+    return done ? 1 : reply(answer, GetLastErrorString(), size);
 }
 
 int ProtocolBase::commandInfo(char* answer, int size) const {
@@ -115,30 +121,37 @@ int ProtocolBase::commandInfo(char* answer, int size) const {
     return 1;
 }
 
-int ProtocolBase::commandRead(const std::string& uri, char* answer, int size) {
-    ITag* tag = CreateTag(uri.c_str());
-    if (tag == nullptr) return reply(answer, GetLastErrorString(), size);
+int ProtocolBase::commandMaxTm(char* answer, int size) const {
+    std::array<char, 32> text;
+    std::snprintf(text.data(), text.size(), "maxtm = %d ms\n", GetMaxTm(nullptr));
+    return reply(answer, text.data(), size);
+}
 
-    const int length = tag->GetVarLength();
-    ScratchBuffer<kLocalValueBytes> value(length);
-    if (value.data() == nullptr) SetError(-1, "Out of memory");
-    if (value.data() != nullptr && Read(tag, value.data()) != 0) {
-        showBytes(value.data(), length, answer, size);
-    } else {
-        reply(answer, GetLastErrorString(), size);
-    }
-    FreeTag(tag);
+int ProtocolBase::commandRead(const std::vector<std::string>& words, char* answer, int size) {
+    if (words.size() != 2) return reply(answer, "error: missing parameter (URI string)\n", size);
+    const ConsoleTag tag(*this, words[1]);
+    if (tag.get() == nullptr || !showValue(tag.get(), answer, size))
+        return reply(answer, GetLastErrorString(), size);
     return 1;
 }
 
-int ProtocolBase::commandWrite(const std::string& uri, const std::string& hex, char* answer,
-                               int size) {
-    ITag* tag = CreateTag(uri.c_str());
-    if (tag == nullptr) return reply(answer, GetLastErrorString(), size);
+/// @return false, with the error set, when the tag cannot be read.
+bool ProtocolBase::showValue(const ITag* tag, char* answer, int size) {
+    if (refuseRead(tag)) return false;
+    const int length = tag->GetVarLength();
+    ScratchBuffer<kLocalValueBytes> value(length);
+    if (value.data() == nullptr) return outOfMemory() != 0;
+    if (Read(tag, value.data()) == 0) return false;
+    showBytes(value.data(), length, answer, size);
+    return true;
+}
 
-    reply(answer, writeHex(tag, hex), size);
-    FreeTag(tag);
-    return 1;
+int ProtocolBase::commandWrite(const std::vector<std::string>& words, char* answer, int size) {
+    if (words.size() != 3)
+        return reply(answer, "error: missing parameters (URI string + data)\n", size);
+    const ConsoleTag tag(*this, words[1]);
+    if (tag.get() == nullptr) return reply(answer, GetLastErrorString(), size);
+    return reply(answer, writeHex(tag.get(), words[2]), size);
 }
 
 const char* ProtocolBase::writeHex(const ITag* tag, const std::string& hex) {
@@ -146,7 +159,7 @@ const char* ProtocolBase::writeHex(const ITag* tag, const std::string& hex) {
     if (!hasTwoDigitsPerByte(hex, length)) return "error: incorrect length of data to write\n";
     ScratchBuffer<kLocalValueBytes> value(length);
     if (value.data() == nullptr) {
-        SetError(-1, "Out of memory");
+        outOfMemory();
         return GetLastErrorString();
     }
     if (!decodeHex(hex, value.data())) return "error: incorrect hex data\n";

@@ -6,6 +6,7 @@
 #include "framework/DataTypes.h"
 #include "framework/ProtocolBase.h"
 #include "framework/ScratchBuffer.h"
+#include "framework/TagBase.h"
 
 namespace {
 
@@ -35,21 +36,30 @@ ItemPlace placeOf(const ITag* tag, int index) {
 
 }  // namespace
 
+bool ProtocolBase::refuseRead(const ITag* tag) {
+    const char* const fault = readCheck_ != nullptr ? readCheck_(tag) : nullptr;
+    if (fault != nullptr) SetError(-1, fault);
+    return fault != nullptr;
+}
+
 int ProtocolBase::Read(const ITag* tag, unsigned char* value) {
+    if (refuseRead(tag)) return 0;
     const int length = tag->PackedLen();
     ScratchBuffer<kLocalTagBytes> raw(length);
-    if (raw.data() == nullptr) {
-        SetError(-1, "Out of memory");
-        return 0;
-    }
+    if (raw.data() == nullptr) return outOfMemory();
     const int ok = CanReadBitBlock(tag) ? ReadBitBlock(tag, raw.data(), bitsToRead(tag, length))
                                         : ReadBlock(tag, raw.data(), length);
     if (ok == 0) return 0;
     if (!tag->ConvertVariable(raw.data(), value, false)) {
-        SetError(kConversionError, "read conversion error");
-        return 0;
+        return conversionFailed(tag, "read conversion error");
     }
     return ok;
+}
+
+int ProtocolBase::conversionFailed(const ITag* tag, const char* text) noexcept {
+    if (static_cast<const TagBase*>(tag)->wasShortOfMemory()) return outOfMemory();
+    SetError(kConversionError, text);
+    return 0;
 }
 
 int ProtocolBase::readWithTimestamp(const ITag* tag, unsigned char* value,
@@ -112,12 +122,9 @@ bool ProtocolBase::arrayItemInRange(const ITag* tag, int index) {
 }
 
 int ProtocolBase::readArrayItem(const ITag* tag, int index, unsigned char* value) {
-    if (!arrayItemInRange(tag, index)) return 0;
+    if (!arrayItemInRange(tag, index) || refuseRead(tag)) return 0;
     ScratchBuffer<kLocalArrayBytes> array(tag->GetVarLength());
-    if (array.data() == nullptr) {
-        SetError(-1, "Out of memory");
-        return 0;
-    }
+    if (array.data() == nullptr) return outOfMemory();
     const int ok = Read(tag, array.data());
     if (ok == 0) return 0;
     const ItemPlace item = placeOf(tag, index);
@@ -126,12 +133,9 @@ int ProtocolBase::readArrayItem(const ITag* tag, int index, unsigned char* value
 }
 
 int ProtocolBase::writeArrayItem(const ITag* tag, int index, const unsigned char* value) {
-    if (!arrayItemInRange(tag, index)) return 0;
+    if (!arrayItemInRange(tag, index) || refuseRead(tag)) return 0;
     ScratchBuffer<kLocalArrayBytes> array(tag->GetVarLength());
-    if (array.data() == nullptr) {
-        SetError(-1, "Out of memory");
-        return 0;
-    }
+    if (array.data() == nullptr) return outOfMemory();
     if (Read(tag, array.data()) == 0) return 0;
     const ItemPlace item = placeOf(tag, index);
     std::memcpy(array.data() + item.offset, value, item.length);

@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <cstring>
 #include <utility>
 
 #include "framework/BitUtils.h"
@@ -14,6 +15,8 @@ namespace {
 
 /// Bytes of a value that are converted without the heap.
 constexpr int kLocalValueBytes = 256;
+
+constexpr const char* kOutOfMemory = "Out of memory";
 
 std::size_t atLeastZero(int length) {
     return static_cast<std::size_t>(std::max(length, 0));
@@ -31,9 +34,24 @@ bool TagBase::ConvertVariable(const unsigned char* src, unsigned char* dst, bool
 }
 
 bool TagBase::Convert(const unsigned char* src, unsigned char* dst, bool toDevice) const {
-    ScratchBuffer<kLocalValueBytes> work(std::max(PackedLen(), GetVarLength()));
-    if (work.data() == nullptr) return false;
+    const bool bits = ProtUtilsN::IsBitType(this);
+    // Such a bit would lie in front of the caller's buffer.
+    if (bits && GetBitIndex() < 0) {
+        error_.show("Bit index is negative");
+        return false;
+    }
+    // Bits are worked on unpacked: how far from the image's start they lie does not count.
+    ScratchBuffer<kLocalValueBytes> work(bits ? GetVarLength()
+                                              : std::max(PackedLen(), GetVarLength()));
+    if (work.data() == nullptr) {
+        error_.show(kOutOfMemory);
+        return false;
+    }
     return toDevice ? toDeviceForm(src, dst, work.data()) : toRunTimeForm(src, dst, work.data());
+}
+
+bool TagBase::wasShortOfMemory() const {
+    return std::strcmp(GetError(), kOutOfMemory) == 0;
 }
 
 bool TagBase::toDeviceForm(const unsigned char* src, unsigned char* dst,
@@ -84,7 +102,7 @@ void TagBase::setConversions(std::vector<std::string> names) {
 }
 
 void TagBase::SetError(const char* text) const {
-    if (!error_.set(text != nullptr ? text : "")) error_.show("Out of memory");
+    if (!error_.set(text != nullptr ? text : "")) error_.show(kOutOfMemory);
 }
 
 bool TagBase::DoConversion(unsigned char* buf, const char* name, bool toDevice) const {

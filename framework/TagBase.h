@@ -8,6 +8,7 @@
 #include "platform/ITag.h"
 
 /// The earlier operations of ITag (offsets, type, lengths) are left to the derived class.
+/// A conversion throws nothing; one that lacks memory fails with the error text "Out of memory".
 class TagBase : public ITag {
   public:
     int PackedLen() const override;
@@ -23,12 +24,16 @@ class TagBase : public ITag {
     void SetError(const char* text) const;
     /// @return the last text; readable and unchanged as long as the tag lives.
     const char* GetError() const { return error_.get(); }
+    /// Whether the last error was a lack of memory.
+    bool wasShortOfMemory() const;
 
     /// The conversion names in the order of the URI.
     const std::vector<std::string>& conversions() const { return conversions_; }
 
   protected:
-    /// REQUIRES: the tag is being made, nobody converts with it yet.
+    /// SetError() for a text that lives as long as the tag; takes no memory.
+    void showError(const char* lasting) const { error_.show(lasting); }
+    /// REQUIRES: the tag is being made, nobody converts with it yet. Throws std::bad_alloc.
     void setConversions(std::vector<std::string> names);
 
   private:

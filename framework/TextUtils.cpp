@@ -2,6 +2,8 @@
 #include "framework/TextUtils.h"
 
 #include <algorithm>
+#include <array>
+#include <charconv>
 #include <cstdlib>
 #include <cstring>
 #include <limits>
@@ -56,14 +58,20 @@ std::string GetTrim(const std::string& text) {
     return trimmed;
 }
 
+std::string_view TakePiece(std::string_view& rest, char delimiter, bool& more) {
+    const std::size_t end = rest.find(delimiter);
+    more = end != std::string_view::npos;
+    const std::string_view piece = rest.substr(0, end);
+    rest.remove_prefix(more ? end + 1 : rest.size());
+    const std::size_t first = piece.find_first_not_of(kTrimmed);
+    if (first == std::string_view::npos) return {};
+    return piece.substr(first, piece.find_last_not_of(kTrimmed) + 1 - first);
+}
+
 void ParseSubstrings(const std::string& text, std::vector<std::string>& pieces, char delimiter) {
-    std::size_t start = 0;
-    for (;;) {
-        const std::size_t end = text.find(delimiter, start);
-        pieces.push_back(GetTrim(text.substr(start, end - start)));
-        if (end == std::string::npos) return;
-        start = end + 1;
-    }
+    std::string_view rest = text;
+    for (bool more = true; more;)
+        pieces.emplace_back(TakePiece(rest, delimiter, more));
 }
 
 bool GetConfigValue(const char* text, const char* key, std::string& value) {
@@ -91,6 +99,26 @@ std::int32_t ParseDecimal(const char* text) {
 void CopyBounded(char* out, const char* text, int size) {
     if (size < 1) return;
     std::strncpy(out, text, static_cast<std::size_t>(size));
+}
+
+BoundedWriter& BoundedWriter::operator<<(std::string_view text) {
+    if (written_ >= size_) return *this;
+    const std::size_t count = std::min(text.size(), static_cast<std::size_t>(size_ - written_));
+    std::copy_n(text.begin(), count, out_ + written_);
+    written_ += static_cast<int>(count);
+    return *this;
+}
+
+BoundedWriter& BoundedWriter::operator<<(int number) {
+    std::array<char, 16> digits;
+    char* const begin = digits.data();
+    const char* const end = std::to_chars(begin, begin + digits.size(), number).ptr;
+    return *this << std::string_view(begin, static_cast<std::size_t>(end - begin));
+}
+
+void BoundedWriter::pad() {
+    for (; written_ < size_; ++written_)
+        out_[written_] = '\0';
 }
 
 }  // namespace ProtUtilsN

@@ -3,6 +3,7 @@
 
 #include <cstdint>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace ProtUtilsN {
@@ -14,6 +15,10 @@ bool IsDecimalDigit(char c);
 /// Removes blanks and tabs (no other white space) from both ends.
 void Trim(std::string& text);
 std::string GetTrim(const std::string& text);
+
+/// Takes the first piece, trimmed, and its delimiter off the front of `rest`. Needs no memory.
+/// @param more  Receives whether there was a delimiter, and so another piece behind it.
+std::string_view TakePiece(std::string_view& rest, char delimiter, bool& more);
 
 /// Splits at every delimiter and appends each piece, trimmed, to `pieces`, which is not cleared
 /// first. Empty pieces are kept; an empty text is one empty piece.
@@ -34,6 +39,24 @@ std::int32_t ParseDecimal(const char* text);
 /// Copies `text` into `out` the way strncpy() does: at most `size` bytes, the rest filled with
 /// zeroes, unterminated when the text has `size` bytes or more. A `size` below 1 writes nothing.
 void CopyBounded(char* out, const char* text, int size);
+
+/// Writes one text behind the other into the caller's buffer until that is full; the rest is
+/// swallowed. Needs no memory.
+class BoundedWriter {
+  public:
+    BoundedWriter(char* out, int size) : out_(out), size_(size) {}
+    BoundedWriter& operator<<(std::string_view text);
+    BoundedWriter& operator<<(int number);
+
+    int written() const { return written_; }
+    /// Fills what is left with zeroes.
+    void pad();
+
+  private:
+    char* out_;
+    int size_;
+    int written_ = 0;
+};
 
 }  // namespace ProtUtilsN
 

@@ -48,12 +48,12 @@ IProtocol* CreateProtocol_MRTU() {
 Protocol_MRTU::Protocol_MRTU()
     : serialFactory_(serviceAs<ISerialFactory>(piSerialFactory, "ISerialFactory")),
       multiTask_(serviceAs<IMultiTask2>(piMultiTask, "IMultiTask2")),
-      lock_(multiTask_ != nullptr ? multiTask_->createLock(0) : nullptr) {
+      lock_(multiTask_) {
     _MRTU::registerModels(memoryManager_);
 }
 
 Protocol_MRTU::~Protocol_MRTU() {
-    if (lock_ != nullptr) multiTask_->deleteLock(lock_);
+    lock_.reset();
     if (port_ != nullptr) releasePort();
 }
 
@@ -68,12 +68,14 @@ int Protocol_MRTU::fail(const _MRTU::Fault& fault) {
 }
 
 int Protocol_MRTU::Config(const char* text) {
-    if (!params_.parse(text)) return fail({-1, params_.getLastError()});
-    // What follows takes no memory, so that a shortage cannot leave it half done.
-    configured_ = true;
-    const std::lock_guard lock(lineMutex_);
-    const _MRTU::Fault fault = takeOver(*params_.getCommonParams(), line_);
-    return fault ? fail(fault) : 1;
+    return guardedBy(0, [&] {
+        if (!params_.parse(text)) return fail({-1, params_.getLastError()});
+        // What follows takes no memory, so that a shortage cannot leave it half done.
+        configured_ = true;
+        const std::lock_guard lock(lineMutex_);
+        const _MRTU::Fault fault = takeOver(*params_.getCommonParams(), line_);
+        return fault ? fail(fault) : 1;
+    });
 }
 
 _MRTU::SerialSettings Protocol_MRTU::lineSettings() const {
@@ -87,42 +89,46 @@ int Protocol_MRTU::lineSetting(int _MRTU::SerialSettings::*setting) const {
 }
 
 int Protocol_MRTU::Start() {
+    return guardedBy(0, [this] { return start(); });
+}
+
+int Protocol_MRTU::start() {
     if (started_) return 1;
     const std::lock_guard turn(portTurn_);
     if (started_) return 1;
     // Before a configuration there is no port, and the first look-up of an override would keep the
     // settings that are not there yet.
     if (!configured_) return fail(_MRTU::kCannotOpen);
-    nodeOverrides_.restore(GetIdent());
-    overrides_.setSection(GetIdent());
+    // What needs memory comes before the first change, so that a shortage changes nothing.
+    const auto stored = nodeOverrides_.stored(GetIdent());
+    const _MRTU::SerialSettings line = lineSettings();
+    auto opened = overrides_.open(GetIdent(), {{"baud", line.baud},
+                                               {"parity", line.parity},
+                                               {"stop", line.stopBits},
+                                               {"mode", line.mode}});
+    nodeOverrides_.adopt(stored);
+    overrides_.adopt(std::move(opened));
     applySerialOverrides();
     if (!openPort()) return fail(_MRTU::kCannotOpen);
     started_ = true;
     return 1;
 }
 
-/// The first look-ups may ask the host's storage and so stand outside the lock; within it the
-/// values are known.
+/// Every one of the parameters is cached by now, so that the host is not asked under the lock.
 void Protocol_MRTU::applySerialOverrides() {
-    _MRTU::SerialSettings configured = lineSettings();
-    takeSerialOverrides(configured);
-    const std::lock_guard lock(lineMutex_);
-    takeSerialOverrides(line_);
-}
-
-void Protocol_MRTU::takeSerialOverrides(_MRTU::SerialSettings& line) {
     constexpr int kNoNode = -1;
-    overrides_.get("baud", kNoNode, line.baud, line.baud);
-    overrides_.get("parity", kNoNode, line.parity, line.parity);
-    overrides_.get("stop", kNoNode, line.stopBits, line.stopBits);
-    overrides_.get("mode", kNoNode, line.mode, line.mode);
-    line.gapMs = _MRTU::interCharacterGap(line.baud);
+    const std::lock_guard lock(lineMutex_);
+    overrides_.get("baud", kNoNode, line_.baud, line_.baud);
+    overrides_.get("parity", kNoNode, line_.parity, line_.parity);
+    overrides_.get("stop", kNoNode, line_.stopBits, line_.stopBits);
+    overrides_.get("mode", kNoNode, line_.mode, line_.mode);
+    line_.gapMs = _MRTU::interCharacterGap(line_.baud);
 }
 
 bool Protocol_MRTU::openPort() {
     // No line runs at 0 baud, and a host's port may divide by it.
     const int baud = lineSetting(&_MRTU::SerialSettings::baud);
-    if (baud == 0 || serialFactory_ == nullptr || lock_ == nullptr) return false;
+    if (baud == 0 || serialFactory_ == nullptr || !lock_) return false;
     port_ = serialFactory_->openPort(params_.getCommonParams()->uart.c_str());
     if (port_ == nullptr) return false;
     if (configure(*port_)) return true;
@@ -160,10 +166,16 @@ const unsigned char* Protocol_MRTU::GetXml() const {
 }
 
 ITag* Protocol_MRTU::CreateTagBase(const char* uri) {
-    auto tag = std::make_unique<Tag_MRTU>(uri != nullptr ? uri : "", tagUriNames());
-    if (tag->parseTagUrl(this)) return tag.release();
-    SetTagError(tag.get());
-    return nullptr;
+    return guardedBy(static_cast<ITag*>(nullptr), [&]() -> ITag* {
+        auto tag = std::make_unique<Tag_MRTU>(uri != nullptr ? uri : "", tagUriNames());
+        if (!tag->isComplete()) {
+            outOfMemory();
+            return nullptr;
+        }
+        if (tag->parseTagUrl(this)) return tag.release();
+        SetTagError(tag.get());
+        return nullptr;
+    });
 }
 
 const char* const* Protocol_MRTU::tagUriNames() const {
@@ -172,11 +184,11 @@ const char* const* Protocol_MRTU::tagUriNames() const {
 
 int Protocol_MRTU::vcsGetComParams(char* text, int size) const {
     const _MRTU::SerialSettings line = lineSettings();
-    const std::string report = params_.getCommonParams()->uart + ',' + std::to_string(line.baud) +
-                               ',' + _MRTU::parityWord(line.parity) + ',' +
-                               std::to_string(line.dataBits) + ',' + std::to_string(line.stopBits) +
-                               ',' + _MRTU::modeWord(line.mode);
-    ProtUtilsN::CopyBounded(text, report.c_str(), size);
+    ProtUtilsN::BoundedWriter report(text, size);
+    report << params_.getCommonParams()->uart << "," << line.baud << ","
+           << _MRTU::parityWord(line.parity) << "," << line.dataBits << "," << line.stopBits << ","
+           << _MRTU::modeWord(line.mode);
+    report.pad();
     return 1;
 }
 

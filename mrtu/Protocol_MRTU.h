@@ -11,6 +11,7 @@
 #include "framework/AddressReplacer.h"
 #include "framework/MemoryManager.h"
 #include "framework/ParameterReplacer.h"
+#include "mrtu/OwnedLock.h"
 #include "mrtu/Params.h"
 #include "mrtu/Reply.h"
 #include "mrtu/SerialSettings.h"
@@ -72,10 +73,10 @@ class Protocol_MRTU : public ProtgenProtocol {
     int fail(const _MRTU::Fault& fault);
 
     // The line, held between Start() and Stop()
+    int start();
     _MRTU::SerialSettings lineSettings() const;
     int lineSetting(int _MRTU::SerialSettings::*setting) const;
     void applySerialOverrides();
-    void takeSerialOverrides(_MRTU::SerialSettings& line);
     // REQUIRE: the caller has the port's turn.
     bool openPort();
     void releasePort();
@@ -93,6 +94,7 @@ class Protocol_MRTU : public ProtgenProtocol {
 
     // Reads and writes of device areas
     _MRTU::Fault readItems(const Tag_MRTU& tag, int index, unsigned char* data, int count);
+    int write(const Tag_MRTU& own, int index, const unsigned char* data, int count);
     int writeItems(const Tag_MRTU* tag, int index, const unsigned char* data, int count);
     _MRTU::Fault writeRequest(const Tag_MRTU& tag, int index, const unsigned char* data, int count);
 
@@ -107,8 +109,9 @@ class Protocol_MRTU : public ProtgenProtocol {
 
     // Console commands
     int commandHelp(const char* command, char* answer, int size);
-    void commandSetId(const std::vector<std::string>& words, char* answer, int size);
-    void commandGetId(char* answer, int size) const;
+    void commandSetId(const char* command, char* answer, int size);
+    void commandGetId(char* answer, int size);
+    void listIds(char* answer, int size) const;
 
     std::atomic<bool> started_ = false;
     _MRTU::ParamManager params_;
@@ -124,7 +127,7 @@ class Protocol_MRTU : public ProtgenProtocol {
     ParameterReplacer overrides_;
     GroupParameterReplacer stagedOverrides_;
     IMultiTask2* multiTask_;
-    ILock* lock_;
+    OwnedLock lock_;
 };
 
 /// @return a new protocol object, owned by the caller.

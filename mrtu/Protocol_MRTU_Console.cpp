@@ -1,6 +1,11 @@
 // The driver's console commands.
 #include <algorithm>
+#include <array>
+#include <cstdio>
 #include <cstring>
+#include <string>
+#include <string_view>
+#include <vector>
 
 #include "framework/TextUtils.h"
 #include "mrtu/Protocol_MRTU.h"
@@ -17,18 +22,34 @@ int textLength(const char* text, int size) {
     return size > 0 ? static_cast<int>(strnlen(text, static_cast<std::size_t>(size))) : 0;
 }
 
+/// A line about a node and its replacement, composed without the heap.
+class Line {
+  public:
+    Line(int node, const char* between, int replacement)
+        : length_(std::snprintf(text_.data(), text_.size(), "id %d%s%d\n", node, between,
+                                replacement)) {}
+
+    const char* text() const { return text_.data(); }
+    int length() const { return length_; }
+
+  private:
+    std::array<char, 64> text_;
+    int length_;
+};
+
 }  // namespace
 
 int Protocol_MRTU::DoCommand(const char* command, char* answer, int size) {
     if (command == nullptr) return 0;
-    std::vector<std::string> words;
-    ProtUtilsN::ParseSubstrings(command, words, ' ');
-    if (words[0] == "help") return commandHelp(command, answer, size);
-    if (words[0] == "setid") {
-        commandSetId(words, answer, size);
+    std::string_view line = command;
+    bool more = false;
+    const std::string_view word = ProtUtilsN::TakePiece(line, ' ', more);
+    if (word == "help") return commandHelp(command, answer, size);
+    if (word == "setid") {
+        commandSetId(command, answer, size);
         return 1;
     }
-    if (words[0] == "getid") {
+    if (word == "getid") {
         commandGetId(answer, size);
         return 1;
     }
@@ -42,26 +63,40 @@ int Protocol_MRTU::commandHelp(const char* command, char* answer, int size) {
     return 1;
 }
 
-void Protocol_MRTU::commandSetId(const std::vector<std::string>& words, char* answer, int size) {
-    if (words.size() != 3) return CopyBounded(answer, "invalid format\n", size);
-    const int node = ProtUtilsN::ParseInteger(words[1].c_str());
-    const int wanted = ProtUtilsN::ParseInteger(words[2].c_str());
-    const int replacement = wanted != 0 ? wanted : node;
-    nodeOverrides_.setValue(node, replacement, GetIdent());
-    const std::string text =
-        "id " + std::to_string(node) + " set to " + std::to_string(replacement) + '\n';
-    CopyBounded(answer, text.c_str(), size);
+void Protocol_MRTU::commandSetId(const char* command, char* answer, int size) {
+    const bool done = guardedBy(false, [&] {
+        std::vector<std::string> words;
+        ProtUtilsN::ParseSubstrings(command, words, ' ');
+        if (words.size() != 3) {
+            CopyBounded(answer, "invalid format\n", size);
+            return true;
+        }
+        const int node = ProtUtilsN::ParseInteger(words[1].c_str());
+        const int wanted = ProtUtilsN::ParseInteger(words[2].c_str());
+        const int replacement = wanted != 0 ? wanted : node;
+        nodeOverrides_.setValue(node, replacement, GetIdent());
+        const Line text(node, " set to ", replacement);
+        CopyBounded(answer, text.text(), size);
+        return true;
+    });
+    if (!done) CopyBounded(answer, GetLastErrorString(), size);
 }
 
-void Protocol_MRTU::commandGetId(char* answer, int size) const {
+void Protocol_MRTU::commandGetId(char* answer, int size) {
+    const bool done = guardedBy(false, [&] {
+        listIds(answer, size);
+        return true;
+    });
+    if (!done) CopyBounded(answer, GetLastErrorString(), size);
+}
+
+void Protocol_MRTU::listIds(char* answer, int size) const {
     CopyBounded(answer, "no node configurated\n", size);
     for (const auto& [node, replacement] : nodeOverrides_.replacements()) {
-        const std::string line =
-            "id " + std::to_string(node) + " -> " + std::to_string(replacement) + '\n';
-        const int length = static_cast<int>(line.size());
-        if (length > size) return;
-        answer = std::copy(line.begin(), line.end(), answer);
-        size -= length;
+        const Line line(node, " -> ", replacement);
+        if (line.length() > size) return;
+        answer = std::copy_n(line.text(), line.length(), answer);
+        size -= line.length();
         // A line that fills the answer to its last byte goes without a terminating zero.
         if (size > 0) *answer = '\0';
     }

@@ -40,14 +40,16 @@ int Protocol_MRTU::getMaxItemCount(const ProtgenTag* tag, bool write) const {
 bool Protocol_MRTU::doReadBlock(const ProtgenTag* tag, int index, unsigned char* data, int count) {
     if (!started_) return fail(_MRTU::kNotStarted) != 0;
     const Tag_MRTU& own = *static_cast<const Tag_MRTU*>(tag);
-    if (own.driverArea() != _MRTU::DriverArea::none) {
-        readDriverArea(own, data);
+    return guardedBy(false, [&] {
+        if (own.driverArea() != _MRTU::DriverArea::none) {
+            readDriverArea(own, data);
+            return true;
+        }
+        pauseBefore(own);
+        const LineLock lock(*this);
+        if (const Fault fault = readItems(own, index, data, count)) return fail(fault) != 0;
         return true;
-    }
-    pauseBefore(own);
-    const LineLock lock(*this);
-    if (const Fault fault = readItems(own, index, data, count)) return fail(fault) != 0;
-    return true;
+    });
 }
 
 bool Protocol_MRTU::doReadBits(const ProtgenTag* tag, int index, unsigned char* data, int count) {

@@ -63,8 +63,12 @@ bool putItems(Message& request, const unsigned char* data, int count, int itemLe
 }  // namespace
 
 int Protocol_MRTU::doWrite(const ProtgenTag* tag, int index, const unsigned char* data, int count) {
+    return guardedBy(0,
+                     [&] { return write(*static_cast<const Tag_MRTU*>(tag), index, data, count); });
+}
+
+int Protocol_MRTU::write(const Tag_MRTU& own, int index, const unsigned char* data, int count) {
     if (!started_) return fail(_MRTU::kNotStarted);
-    const Tag_MRTU& own = *static_cast<const Tag_MRTU*>(tag);
     if (own.driverArea() != _MRTU::DriverArea::none) return writeDriverArea(own, data) ? 1 : 0;
     if (!isSingle(own.writeFunction())) return writeItems(&own, index, data, count);
 

@@ -2,10 +2,12 @@
 
 #include <array>
 #include <limits>
+#include <new>
 #include <string>
 #include <vector>
 
 #include "framework/DataTypes.h"
+#include "framework/Guarded.h"
 #include "framework/TextUtils.h"
 #include "mrtu/Protocol_MRTU.h"
 
@@ -31,11 +33,18 @@ bool isZeroBased(const Model& model) {
 Tag_MRTU::Tag_MRTU(const char* uri, const char* const* fieldNames) : ProtgenTag(uri, fieldNames) {}
 
 ITag* Tag_MRTU::Clone() const {
-    return new Tag_MRTU(*this);
+    return guarded(
+        static_cast<ITag*>(nullptr), [this] { SetError("Out of memory"); },
+        [this]() -> ITag* { return new Tag_MRTU(*this); });
 }
 
-bool Tag_MRTU::refuse(const std::string& message) {
-    SetError(message.c_str());
+bool Tag_MRTU::refuse(const char* message) {
+    showError(message);
+    return false;
+}
+
+bool Tag_MRTU::refuseType(const std::string& text) {
+    SetError((text + ": data type unknown").c_str());
     return false;
 }
 
@@ -89,8 +98,10 @@ bool Tag_MRTU::resolveType(const std::string& text) {
     int length = 0;
     std::vector<std::string> conversions;
     if (!ProtUtilsN::GetICOMType(text, type, itemType, length, conversions))
-        return refuse(text + ": data type unknown");
-    setDataType(type, itemType, length, std::move(conversions));
+        return refuseType(text);
+    // The type was looked up in this library, the tag is the engine's: it tells instead of
+    // throwing.
+    if (!setDataType(type, itemType, length, std::move(conversions))) throw std::bad_alloc();
     return true;
 }
 

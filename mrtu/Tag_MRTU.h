@@ -45,7 +45,8 @@ class Tag_MRTU final : public ProtgenTag {
   private:
     Tag_MRTU(const Tag_MRTU&) = default;
 
-    bool refuse(const std::string& message);
+    bool refuse(const char* message);
+    bool refuseType(const std::string& text);
     bool resolveArea(const Protocol_MRTU& protocol, const std::string& node,
                      const std::string& area);
     bool resolveType(const std::string& text);

@@ -7,8 +7,8 @@
 class IProtModule : public IInterface {
   public:
     /// Takes the host's services out of `host`. Calls are counted: only the first takes them.
-    /// @return 1 on success; 0 when a required service is missing (GetLastError() says which) and
-    /// everything taken so far has been handed back.
+    /// @return 1 on success; 0 when `host` is null or a required service is missing (GetLastError()
+    /// says which) and everything taken so far has been handed back.
     virtual int Init(IInterfaceFactory* host) = 0;
     /// Undoes one successful Init(); the last one hands the services back.
     virtual void Close() = 0;

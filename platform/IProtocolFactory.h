@@ -12,7 +12,8 @@ class IProtocolFactory : public IInterface {
     }
 
     /// @return a new protocol object for the protocol called `name`, owned by the caller until
-    /// DeleteProtocol(), or null when this plug-in has no such protocol.
+    /// DeleteProtocol(), or null when this plug-in has no such protocol or there is no memory for
+    /// it; nothing is left behind then.
     /// REQUIRES: IProtModule::Init() succeeded.
     virtual IProtocol* CreateProtocol(const char* name) = 0;
     /// Destroys a protocol object with the tags it still owns. Null is ignored.

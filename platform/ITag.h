@@ -11,7 +11,7 @@ class ITag {
   public:
     virtual ~ITag() = default;
 
-    /// @return a copy that the caller owns.
+    /// @return a copy that the caller owns, or null when there is no memory for one.
     virtual ITag* Clone() const = 0;
     /// @return the item address of the tag's first item; for bit memories that of its byte.
     virtual unsigned int GetByteOffset() const = 0;

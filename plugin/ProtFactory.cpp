@@ -1,5 +1,6 @@
 #include "plugin/ProtFactory.h"
 
+#include "framework/Guarded.h"
 #include "mrtu/Protocol_MRTU.h"
 #include "plugin/ProtModule.h"
 
@@ -32,7 +33,9 @@ void* ProtocolFactory::ConvertTo(const char* name) {
 }
 
 IProtocol* ProtocolFactory::CreateProtocol(const char* name) {
-    return CompareInterface(name, "MRTU") ? CreateProtocol_MRTU() : nullptr;
+    if (!CompareInterface(name, "MRTU")) return nullptr;
+    return guarded(
+        static_cast<IProtocol*>(nullptr), [] {}, CreateProtocol_MRTU);
 }
 
 void ProtocolFactory::DeleteProtocol(IProtocol* protocol) {

@@ -89,7 +89,7 @@ ITag* FakeDriver::CreateTagBase(const char* uri) {
     const char* model = tag->nodeId() == 9 ? "B" : "A";
     tag->setModel(manager_.getModel(model));
     tag->setMemoryType(manager_.getMemoryType(model, fields[1]));
-    tag->setDataType(type, itemType, length, conversions);
+    if (!tag->setDataType(type, itemType, length, conversions)) return nullptr;
     return tag.release();
 }
 
