@@ -7,7 +7,7 @@
 #include <charconv>
 #include <set>
 
-#include "cli/check/NearestName.h"
+#include "cli/NearestName.h"
 #include "cli/check/NodeNumber.h"
 #include "cli/check/NumberText.h"
 

@@ -3,9 +3,9 @@
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 
+#include "cli/NearestName.h"
 #include "cli/ValueTypes.h"
 #include "cli/check/LintTags.h"
-#include "cli/check/NearestName.h"
 
 namespace cli {
 namespace {

@@ -5,9 +5,9 @@
 #include <algorithm>
 #include <optional>
 
+#include "cli/NearestName.h"
 #include "cli/ValueTypes.h"
 #include "cli/check/LintTags.h"
-#include "cli/check/NearestName.h"
 #include "cli/check/NumberText.h"
 #include "cli/describe/DescriptionTables.h"
 

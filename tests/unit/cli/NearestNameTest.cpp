@@ -1,4 +1,4 @@
-#include "cli/check/NearestName.h"
+#include "cli/NearestName.h"
 
 #include <gtest/gtest.h>
 
