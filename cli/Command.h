@@ -9,12 +9,13 @@
 #include <iosfwd>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "cli/ExitCode.h"
 
 namespace CLI {
 class App;
-}
+}  // namespace CLI
 
 namespace cli {
 
@@ -26,6 +27,8 @@ struct CommandContext {
     ExitCode exitCode = ExitCode::Done;
     /// What --plugin said; empty for the default places. Ask pluginFile() instead.
     std::string pluginOption;
+    /// What complain() has said so far.
+    std::vector<std::string> complaints{};
 };
 
 /// Declares `--plugin FILE` on a sub-command that loads the driver.
@@ -42,7 +45,9 @@ void complain(CommandContext& context, const std::string& text);
 /// @return the parser of the whole command line. Its callbacks use `context`: it must outlive it.
 std::unique_ptr<CLI::App> makeCommandLine(CommandContext& context);
 
-/// Runs a whole command line, also `--help` and `--version`.
+/// Runs a whole command line, also `--help` and `--version`. With `--json` among the words, `out`
+/// gets one JSON document in every case: what the command printed, or, when it ended before,
+/// {"exitCode": 2, "errors": ["..."]} with the complaints.
 /// @return what main() returns: the number of an ExitCode.
 int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::ostream& err);
 

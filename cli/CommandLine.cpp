@@ -1,10 +1,15 @@
 #include <fmt/format.h>
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <memory>
 #include <ostream>
+#include <sstream>
+#include <string_view>
 
 #include "cli/Commands.h"
+#include "cli/JsonValues.h"
+#include "cli/UsageText.h"
 
 namespace cli {
 namespace {
@@ -13,7 +18,7 @@ constexpr const char* kNoCommand = "what shall be done? mrtu --help lists the co
 
 constexpr const char* kFooter = R"(Examples:
   mrtu read --sim '1?HREG?400001?unsignedShort' '1?OUTP?1?boolean-8'
-  mrtu read --port /dev/ttyUSB0 --baud 9600 --parity even '1?HREG?400010?float(swap2)'
+  mrtu read --port /dev/ttyUSB0 --baud 9600 --parity even '1?HREG?400010?float@ABCD'
   mrtu write --port /dev/ttyUSB0 --verify '1?HREG?400001?short=-5'
   mrtu console --sim getmaxtm
   mrtu override set --port /dev/ttyUSB0 node 5=7 baud=38400
@@ -45,8 +50,12 @@ void addCommands(CLI::App& app, CommandContext& context) {
 
 /// @return the exit code of a command line that was not accepted, or was a question only.
 ExitCode answerParser(const CLI::App& app, const CLI::ParseError& error, CommandContext& context) {
-    const int code = app.exit(error, context.out, context.err);
-    return code == 0 ? ExitCode::Done : ExitCode::Usage;
+    if (error.get_exit_code() != 0) {
+        complain(context, usageText(app, error));
+        return ExitCode::Usage;
+    }
+    app.exit(error, context.out, context.err);
+    return ExitCode::Done;
 }
 
 ExitCode run(CLI::App& app, int argc, const char* const* argv, CommandContext& context) {
@@ -71,6 +80,7 @@ ExitCode run(CLI::App& app, int argc, const char* const* argv, CommandContext& c
 void complain(CommandContext& context, const std::string& text) {
     // What was said before on the other stream stays before when both go to one file.
     context.out.flush();
+    context.complaints.push_back(text);
     context.err << "mrtu: " << text << '\n';
     context.err.flush();
 }
@@ -86,10 +96,42 @@ std::unique_ptr<CLI::App> makeCommandLine(CommandContext& context) {
     return app;
 }
 
+namespace {
+
+ExitCode runCommand(int argc, const char* const* argv, CommandContext& context) {
+    const auto app = makeCommandLine(context);
+    return run(*app, argc, argv, context);
+}
+
+bool wantsJson(int argc, const char* const* argv) {
+    return std::any_of(argv, argv + argc,
+                       [](const char* word) { return std::string_view(word) == "--json"; });
+}
+
+/// The document of a command that ended before it had one of its own.
+std::string errorDocument(ExitCode code, const CommandContext& context) {
+    const Json document{{"exitCode", static_cast<int>(code)}, {"errors", context.complaints}};
+    // Complaints quote words and file names, which may hold any bytes.
+    return document.dump(-1, ' ', false, Json::error_handler_t::replace) + '\n';
+}
+
+/// Nothing reaches `out` before the command's end: half a document would be none.
+ExitCode runForJson(int argc, const char* const* argv, std::ostream& out, std::ostream& err) {
+    std::ostringstream document;
+    CommandContext context{
+        .out = document, .err = err, .exitCode = ExitCode::Done, .pluginOption = {}};
+    const ExitCode code = runCommand(argc, argv, context);
+    const std::string text = document.str();
+    out << (text.empty() ? errorDocument(code, context) : text);
+    return code;
+}
+
+}  // namespace
+
 int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::ostream& err) {
     CommandContext context{.out = out, .err = err, .exitCode = ExitCode::Done, .pluginOption = {}};
-    const auto app = makeCommandLine(context);
-    ExitCode code = run(*app, argc, argv, context);
+    ExitCode code =
+        wantsJson(argc, argv) ? runForJson(argc, argv, out, err) : runCommand(argc, argv, context);
     out.flush();
     if (!out && code == ExitCode::Done) {
         complain(context, "the output can't be written");

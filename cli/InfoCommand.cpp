@@ -6,6 +6,7 @@
 #include <ostream>
 
 #include "cli/Commands.h"
+#include "cli/Validators.h"
 #include "runtime/HostServices.h"
 #include "runtime/Module.h"
 #include "runtime/PosixMultiTask.h"
@@ -79,6 +80,7 @@ void addInfoCommand(CLI::App& app, CommandContext& context) {
     CLI::App* const command = app.add_subcommand("info", "Tell what the driver says of itself");
     command->add_option("--protocol", options->protocol, "Protocol of the plug-in")
         ->type_name("NAME")
+        ->check(notEmpty())
         ->capture_default_str();
     addPluginOption(*command, context);
     command->footer(kFooter);

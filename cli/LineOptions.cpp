@@ -6,27 +6,44 @@
 
 #include "cli/ConfigText.h"
 #include "cli/FileReader.h"
+#include "cli/OverrideWords.h"
+#include "cli/Validators.h"
 
 namespace cli {
 namespace {
+
+std::vector<std::string> baudRates() {
+    std::vector<std::string> rates;
+    for (const SettingWord& word : serialSettings().front().words)
+        rates.emplace_back(word.word);
+    return rates;
+}
+
+constexpr long kLargestNode = 254;
+constexpr long kLongestTimeoutMs = 3600000;
 
 void addShortForms(CLI::App& command, LineOptions& options) {
     struct Row {
         const char* name;
         std::string LineOptions::*member;
+        CLI::Validator accepts;
         const char* help;
     };
-    static const Row rows[] = {
-        {"--baud", &LineOptions::baud, "Same as --set baudrate=N"},
-        {"--parity", &LineOptions::parity, "Same as --set parity=none|even|odd|mark"},
-        {"--stopbits", &LineOptions::stopBits, "Same as --set stopbits=1|2"},
-        {"--node", &LineOptions::node, "Same as --set defNodeId=N"},
-        {"--model", &LineOptions::model,
+    const Row rows[] = {
+        {"--baud", &LineOptions::baud, oneOf(baudRates()), "Same as --set baudrate=N"},
+        {"--parity", &LineOptions::parity, oneOf({"none", "even", "odd", "mark"}),
+         "Same as --set parity=none|even|odd|mark"},
+        {"--stopbits", &LineOptions::stopBits, oneOf({"1", "2"}), "Same as --set stopbits=1|2"},
+        {"--node", &LineOptions::node, numberUpTo(kLargestNode), "Same as --set defNodeId=N"},
+        {"--model", &LineOptions::model, oneOf({"1", "2", "3", "4"}),
          "Same as --set model=1|2|3|4 (1-based, 0-based, Enron 1-based, Enron 0-based)"},
-        {"--timeout", &LineOptions::timeout, "Same as --set timeout=MS"},
+        {"--timeout", &LineOptions::timeout, numberUpTo(kLongestTimeoutMs),
+         "Same as --set timeout=MS"},
     };
     for (const Row& row : rows) {
-        command.add_option(row.name, options.*row.member, row.help)->group("Configuration");
+        command.add_option(row.name, options.*row.member, row.help)
+            ->transform(row.accepts)
+            ->group("Configuration");
     }
     command.add_flag("--ascii", options.ascii, "Same as --set txMode=ASCII")
         ->group("Configuration");
@@ -85,6 +102,7 @@ void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& con
         ->group("Line");
     command.add_option("--config", options.configFile, "Configuration text of the driver")
         ->type_name("FILE")
+        ->check(notEmpty())
         ->group("Configuration");
     command
         .add_option("--set", options.settings,
@@ -98,12 +116,15 @@ void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& con
         .add_option("--storage", options.storage,
                     "Where overrides are kept, or 'none'. With --sim the default is 'none'")
         ->type_name("FILE")
+        ->check(notEmpty())
         ->group("Driver");
     command.add_option("--ident", options.ident, "Whose overrides: the section of the storage")
         ->type_name("NAME")
+        ->check(notEmpty())
         ->group("Driver");
     command.add_option("--protocol", options.protocol, "Protocol of the plug-in")
         ->type_name("NAME")
+        ->check(notEmpty())
         ->capture_default_str()
         ->group("Driver");
     addPluginOption(command, context);

@@ -2,11 +2,11 @@
 
 #include <fmt/format.h>
 #include <fmt/ranges.h>
-#include <strings.h>
 
 #include <array>
 #include <charconv>
 
+#include "cli/Choices.h"
 #include "cli/ExitCode.h"
 
 namespace cli {
@@ -33,10 +33,6 @@ constexpr std::uint8_t kNodeOff = 255;
 
 [[noreturn]] void refuse(std::string_view word, std::string_view why) {
     throw CommandError(ExitCode::Usage, fmt::format("'{}': {}", word, why));
-}
-
-bool sameWord(std::string_view a, std::string_view b) {
-    return a.size() == b.size() && strncasecmp(a.data(), b.data(), a.size()) == 0;
 }
 
 int parseNumber(std::string_view whole, std::string_view digits, int largest) {

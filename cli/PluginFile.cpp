@@ -5,6 +5,7 @@
 #include <system_error>
 
 #include "cli/Command.h"
+#include "cli/Validators.h"
 
 namespace cli {
 namespace {
@@ -23,6 +24,7 @@ void addPluginOption(CLI::App& command, CommandContext& context) {
         .add_option("--plugin", context.pluginOption,
                     "The driver; default is libmrtu.so beside mrtu or in ../lib/mrtu")
         ->type_name("FILE")
+        ->check(notEmpty())
         ->group("Driver");
 }
 

@@ -11,6 +11,7 @@
 #include "cli/Commands.h"
 #include "cli/EndSignals.h"
 #include "cli/SimNodes.h"
+#include "cli/Validators.h"
 #include "sim/Simulator.h"
 
 namespace cli {
@@ -139,7 +140,9 @@ void addSimCommand(CLI::App& app, CommandContext& context) {
         ->check(CLI::Range(1, 247))
         ->allow_extra_args(false);
     command->add_flag("--plain", options->plain, "Nodes without 32-bit registers");
-    command->add_option("--link", options->link, "Symbolic link to the device")->type_name("PATH");
+    command->add_option("--link", options->link, "Symbolic link to the device")
+        ->type_name("PATH")
+        ->check(notEmpty());
     command->add_option("--fault", options->faults, "What goes wrong with the next answers")
         ->type_name("TEXT")
         ->allow_extra_args(false);

@@ -4,12 +4,19 @@
 #include <ostream>
 
 #include "cli/Commands.h"
+#include "cli/Validators.h"
 #include "cli/describe/DescriptionJson.h"
 #include "cli/describe/DescriptionTables.h"
 #include "cli/describe/OfflineDriver.h"
 
 namespace cli {
 namespace {
+
+constexpr const char* kFooter = R"(Examples:
+  mrtu describe
+  mrtu describe parameters
+  mrtu describe --json models
+  mrtu describe --xml > mrtu.xml)";
 
 struct Options {
     std::string section;
@@ -58,16 +65,18 @@ void addDescribeCommand(CLI::App& app, CommandContext& context) {
         "describe", "Show what a configuration may say and what the models offer");
     CLI::Option* section =
         command->add_option("section", options->section, "Only this part of the description")
-            ->check(CLI::IsMember({"models", "memory", "parameters", "conversions"}));
+            ->transform(oneOf({"models", "memory", "parameters", "conversions"}));
     CLI::Option* json = command->add_flag("--json", options->json, "Print JSON");
     command->add_flag("--xml", options->xml, "Print the document itself, byte for byte")
         ->excludes(json)
         ->excludes(section);
     command->add_option("--protocol", options->protocol, "The protocol's name in the plug-in")
         ->type_name("NAME")
+        ->check(notEmpty())
         ->capture_default_str()
         ->group("Driver");
     addPluginOption(*command, context);
+    command->footer(kFooter);
     command->callback([options, &context] { describe(*options, context); });
 }
 

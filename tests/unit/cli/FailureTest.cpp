@@ -70,7 +70,7 @@ TEST(Port, ThatVanishesUnderTheOnlyAttemptIsNoSilentDevice) {
 }
 
 TEST(Port, WithBaudRateZeroCannotBeOpened) {
-    const Outcome outcome = mrtu({"read", "--sim", "--baud", "0", kUri});
+    const Outcome outcome = mrtu({"read", "--sim", "--set", "baudrate=0", kUri});
     EXPECT_EQ(outcome.err.rfind("mrtu: Can't open serial port", 0), 0U) << outcome.err;
     EXPECT_EQ(outcome.exitCode, 3);
 }

@@ -1,0 +1,35 @@
+#include "cli/Choices.h"
+
+#include <fmt/format.h>
+#include <fmt/ranges.h>
+#include <strings.h>
+
+#include <charconv>
+
+#include "cli/NearestName.h"
+
+namespace cli {
+
+bool sameWord(std::string_view a, std::string_view b) {
+    return a.size() == b.size() && strncasecmp(a.data(), b.data(), a.size()) == 0;
+}
+
+std::string didYouMean(std::string_view word, const std::vector<std::string>& names) {
+    const std::string nearest = nearestName(word, names);
+    return nearest.empty() ? "" : fmt::format("; did you mean '{}'?", nearest);
+}
+
+std::string notOneOf(std::string_view word, const std::vector<std::string>& choices) {
+    return fmt::format("'{}' is not one of {}{}", word, fmt::join(choices, ", "),
+                       didYouMean(word, choices));
+}
+
+long plainNumber(std::string_view text, long largest) {
+    long number = -1;
+    const char* const end = text.data() + text.size();
+    if (text.starts_with('-')) return -1;
+    const auto [stop, error] = std::from_chars(text.data(), end, number);
+    return error == std::errc{} && stop == end && number <= largest ? number : -1;
+}
+
+}  // namespace cli
