@@ -15,13 +15,13 @@ constexpr const char* kFooter =
   node N=M              talk to slave address M where the configuration says node N; "off" disables
   modicon N=on|off      count the registers of node N from 1 (on) or from 0 (off)
   baud=, parity=, stop=, mode=   settings of the line
+Overrides belong to an ident, which all lines share that are not given one of their own by --ident.
 
 Examples:
   mrtu override list --port /dev/ttyUSB0
   mrtu override set --port /dev/ttyUSB0 node 5=7 6=off modicon 5=on
   mrtu override set --port /dev/ttyUSB0 baud=38400 parity=even stop=2 mode=RS-485
-  mrtu override clear --port /dev/ttyUSB0 node 5 6
-  mrtu override clear baud parity
+  mrtu override clear node 5 6 baud parity
   mrtu override clear all)";
 
 struct OverrideOptions {
@@ -34,16 +34,18 @@ class Printer {
     Printer(std::ostream& out, Overrides& overrides) : out_(out), overrides_(overrides) {}
 
     void node(int node) {
-        line(fmt::format("node {}", node), addressWord(overrides_.address(node)),
-             overrides_.storedAddress(node));
+        const std::uint32_t address = overrides_.address(node);
+        line(fmt::format("node {}", node), addressWord(address),
+             overrides_.storesAddress(node, address));
     }
     void modicon(int node) {
-        line(fmt::format("modicon {}", node), overrides_.modicon(node) ? "on" : "off",
-             overrides_.storedModicon(node));
+        const bool on = overrides_.modicon(node);
+        line(fmt::format("modicon {}", node), on ? "on" : "off",
+             overrides_.storesModicon(node, on));
     }
     void serial(const SerialSetting& setting) {
-        line(std::string(setting.name), wordOf(setting, overrides_.serial(setting)),
-             overrides_.stored(setting));
+        const std::uint32_t code = overrides_.serial(setting);
+        line(std::string(setting.name), wordOf(setting, code), overrides_.stores(setting, code));
     }
 
   private:
@@ -92,8 +94,7 @@ void set(CommandContext& context, const OverrideOptions& options) {
     }
 }
 
-/// Node addresses go through the driver, which needs its line; everything else only leaves the
-/// storage, so that settings with which no port opens can still be cleared.
+/// No line is opened: settings with which no port opens are to be cleared too.
 void clear(CommandContext& context, const OverrideOptions& options) {
     const OverrideRemovals removals = parseRemovals(options.words);
     Session session(context, options.line, StorageNeed::Keep);
@@ -102,14 +103,12 @@ void clear(CommandContext& context, const OverrideOptions& options) {
     }
     Overrides overrides(session);
     if (removals.all) overrides.forgetAll();
+    for (const int node : removals.nodes)
+        overrides.forgetAddress(node);
     for (const int node : removals.modicon)
         overrides.forgetModicon(node);
     for (const SerialSetting* setting : removals.serial)
         overrides.forget(*setting);
-    if (!removals.nodes.empty()) session.start();
-    for (const int node : removals.nodes) {
-        overrides.setAddress(node, static_cast<std::uint8_t>(node));
-    }
     session.checkStorage();
     context.out << "cleared\n";
 }

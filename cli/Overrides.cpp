@@ -2,17 +2,15 @@
 
 #include <fmt/format.h>
 
-#include <charconv>
 #include <sstream>
 
 #include "cli/Bytes.h"
 #include "cli/ConfigText.h"
+#include "cli/OverrideKeys.h"
 #include "cli/ValueTypes.h"
 
 namespace cli {
 namespace {
-
-constexpr std::string_view kModiconTail = "_ModiconMode";
 
 std::string nodeUri(int node) {
     return fmt::format("{}?NO?0?unsignedByte", node);
@@ -23,20 +21,6 @@ std::string modiconUri(int node) {
 // The line is everybody's: any node number reaches its settings.
 std::string serialUri(const SerialSetting& setting) {
     return fmt::format("1?{}?0?{}", setting.area, setting.type);
-}
-
-std::string modiconKey(int node) {
-    return fmt::format("node{}{}", node, kModiconTail);
-}
-
-/// @return the node of a key like node5_ModiconMode, or -1.
-int nodeOfModiconKey(std::string_view key) {
-    if (!key.starts_with("node") || !key.ends_with(kModiconTail)) return -1;
-    key.remove_prefix(4);
-    key.remove_suffix(kModiconTail.size());
-    int node = -1;
-    const auto [stop, error] = std::from_chars(key.data(), key.data() + key.size(), node);
-    return error == std::errc{} && stop == key.data() + key.size() ? node : -1;
 }
 
 /// Reads the console's lines "id 5 -> 7".
@@ -108,21 +92,28 @@ std::set<int> Overrides::nodes() {
     addConfiguredNodes(session_.channel().command("getid").value_or(""), nodes);
     if (session_.storage() == nullptr) return nodes;
     for (const runtime::StoredEntry& entry : session_.storage()->entries(section())) {
-        if (const int node = nodeOfModiconKey(entry.key); node >= 0) nodes.insert(node);
+        if (const auto node = nodeOfModiconKey(entry.key)) nodes.insert(*node);
     }
     return nodes;
 }
 
-bool Overrides::storedAddress(int node) {
-    return hasKey(fmt::format("tempNode{}", node));
+bool Overrides::storesAddress(int node, std::uint32_t address) {
+    return storesNumber(addressKey(node), static_cast<int>(address));
 }
-bool Overrides::storedModicon(int node) {
-    return hasKey(modiconKey(node));
+bool Overrides::storesModicon(int node, bool on) {
+    const std::string key = modiconKey(node);
+    return hasKey(key) && session_.storage()->readBool(section(), key.c_str()) == on;
 }
-bool Overrides::stored(const SerialSetting& setting) {
-    return hasKey(std::string(setting.name));
+bool Overrides::stores(const SerialSetting& setting, std::uint32_t code) {
+    return storesNumber(std::string(setting.name), static_cast<int>(code));
 }
 
+void Overrides::forgetAddress(int node) {
+    if (session_.storage() == nullptr) return;
+    for (const runtime::StoredEntry& entry : session_.storage()->entries(section())) {
+        if (nodeOfAddressKey(entry.key) == node) removeKey(entry.key);
+    }
+}
 void Overrides::forgetModicon(int node) {
     removeKey(modiconKey(node));
 }
@@ -143,6 +134,10 @@ void Overrides::forgetAll() {
 bool Overrides::hasKey(const std::string& key) {
     runtime::Storage* const storage = session_.storage();
     return storage != nullptr && storage->hasKey(section(), key.c_str()) != 0;
+}
+
+bool Overrides::storesNumber(const std::string& key, int number) {
+    return hasKey(key) && session_.storage()->readInt(section(), key.c_str()) == number;
 }
 
 void Overrides::removeKey(const std::string& key) {

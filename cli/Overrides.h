@@ -27,12 +27,13 @@ class Overrides {
     /// @return the nodes that the configuration names or that have an override, ascending.
     std::set<int> nodes();
 
-    /// Tells whether the storage holds a value of its own.
-    bool storedAddress(int node);
-    bool storedModicon(int node);
-    bool stored(const SerialSetting& setting);
+    /// Tells whether the storage holds just this value.
+    bool storesAddress(int node, std::uint32_t address);
+    bool storesModicon(int node, bool on);
+    bool stores(const SerialSetting& setting, std::uint32_t code);
 
     /// Takes values out of the storage; they are gone at the next start.
+    void forgetAddress(int node);
     void forgetModicon(int node);
     void forget(const SerialSetting& setting);
     void forgetAll();
@@ -41,6 +42,7 @@ class Overrides {
     std::uint32_t read(const std::string& uri);
     void write(const std::string& uri, std::uint32_t value, std::size_t bytes);
     bool hasKey(const std::string& key);
+    bool storesNumber(const std::string& key, int number);
     void removeKey(const std::string& key);
     const char* section();
 

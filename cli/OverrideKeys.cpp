@@ -1,0 +1,41 @@
+#include "cli/OverrideKeys.h"
+
+#include <fmt/format.h>
+
+#include <charconv>
+#include <cstdlib>
+
+namespace cli {
+namespace {
+
+constexpr std::string_view kAddressFront = "tempNode";
+constexpr std::string_view kModiconFront = "node";
+constexpr std::string_view kModiconTail = "_ModiconMode";
+
+}  // namespace
+
+std::string addressKey(int node) {
+    return fmt::format("{}{}", kAddressFront, node);
+}
+
+std::optional<int> nodeOfAddressKey(std::string_view key) {
+    if (!key.starts_with(kAddressFront)) return std::nullopt;
+    const std::string number(key.substr(kAddressFront.size()));
+    return static_cast<int>(std::strtol(number.c_str(), nullptr, 0));
+}
+
+std::string modiconKey(int node) {
+    return fmt::format("{}{}{}", kModiconFront, node, kModiconTail);
+}
+
+std::optional<int> nodeOfModiconKey(std::string_view key) {
+    if (!key.starts_with(kModiconFront) || !key.ends_with(kModiconTail)) return std::nullopt;
+    key.remove_prefix(kModiconFront.size());
+    key.remove_suffix(kModiconTail.size());
+    int node = 0;
+    const auto [stop, error] = std::from_chars(key.data(), key.data() + key.size(), node);
+    if (error != std::errc{} || stop != key.data() + key.size()) return std::nullopt;
+    return node;
+}
+
+}  // namespace cli
