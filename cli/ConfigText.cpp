@@ -111,9 +111,13 @@ std::vector<int> nodesOf(std::string_view text) {
     return {nodes.begin(), nodes.end()};
 }
 
+std::optional<std::string> nodeItemOf(std::string_view text, int node, std::string_view key) {
+    const auto own = itemOf(text, fmt::format("Node{}::{}", node, key));
+    return own ? own : itemOf(text, key);
+}
+
 std::string modelOf(std::string_view text, int node) {
-    if (const auto own = itemOf(text, fmt::format("Node{}::model", node))) return *own;
-    return itemOf(text, "model").value_or("1");
+    return nodeItemOf(text, node, "model").value_or("1");
 }
 
 }  // namespace cli

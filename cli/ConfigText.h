@@ -36,6 +36,9 @@ std::optional<std::string> itemOf(std::string_view text, std::string_view key);
 /// @return the node numbers that the text names, "defNodeId" included, ascending, each once.
 std::vector<int> nodesOf(std::string_view text);
 
+/// @return the value of an item that a node may have of its own, else that of all nodes.
+std::optional<std::string> nodeItemOf(std::string_view text, int node, std::string_view key);
+
 /// @return the model of a node, which may be its own or that of all nodes.
 std::string modelOf(std::string_view text, int node);
 

@@ -1,7 +1,9 @@
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <memory>
 
 #include "cli/Commands.h"
+#include "cli/OverrideNotice.h"
 #include "cli/Results.h"
 #include "cli/Session.h"
 
@@ -9,14 +11,21 @@ namespace cli {
 namespace {
 
 constexpr const char* kFooter =
-    R"(A URI is node?area?address?type, e.g. 1?HREG?400010?float or 1?OUTP?1?boolean-8; the shell needs
-quotes around it. Each URI gets a line "URI = value"; one that fails gets its error on standard
-error and does not stop the others.
+    R"(A URI is node?area?address?type, e.g. 1?HREG?400010?float@ABCD or 1?OUTP?1?boolean-8; the shell
+needs quotes around it. Each URI gets a line "URI = value"; one that fails gets its error on
+standard error and does not stop the others.
+
+Byte order, as the bytes travel; A is the most significant one, ABCD what most devices send:
+  32 bits: float@ABCD, @CDAB, @DCBA or @BADC. Without an order CDAB is meant
+  64 bits: double@ABCDEFGH, @GHEFCDAB, @HGFEDCBA, @BADCFEHG. Without one GHEFCDAB
+  texts:   string-8@AB is the usual order, the first character in the high byte. Without one BA
+The driver itself calls float@ABCD float(swap2,swap4), @DCBA (swap2), @BADC (swap4); double@ABCDEFGH
+(swap2,swap8), @HGFEDCBA (swap2), @BADCFEHG (swap8); string-8@AB string-8(swap2).
 
 Examples:
   mrtu read --sim '1?HREG?400001?unsignedShort'
-  mrtu read --sim --json '1?IREG?300001?float' '1?INP?100001?boolean-8'
-  mrtu read --port /dev/ttyUSB0 --baud 9600 --parity even --trace '1?HREG?400001?int-10'
+  mrtu read --sim --json '1?IREG?300001?float@ABCD' '1?INP?100001?boolean-8'
+  mrtu read --port /dev/ttyUSB0 --baud 9600 --parity even --trace '1?HREG?400001?int-10@ABCD'
   mrtu read --config line.cfg --port com1=/dev/ttyUSB0 --port com2=/dev/ttyUSB1 '3?OUTP?17?boolean')";
 
 struct ReadOptions {
@@ -25,29 +34,32 @@ struct ReadOptions {
     std::vector<std::string> uris;
 };
 
-using TagResult = runtime::Result<ITag*, runtime::ChannelError>;
+using TagResult = runtime::Result<ITag*, Failure>;
 
-std::vector<TagResult> createTags(runtime::Channel& channel, const std::vector<std::string>& uris) {
+std::vector<TagResult> createTags(Session& session, const std::vector<std::string>& uris) {
     std::vector<TagResult> tags;
     tags.reserve(uris.size());
     for (const std::string& uri : uris)
-        tags.push_back(channel.createTag(uri));
+        tags.push_back(session.createTag(uri));
     return tags;
 }
 
 void readOne(Session& session, const std::string& uri, const TagResult& tag, Results& results) {
-    if (!tag) return results.failure(uri, tag.error(), ExitCode::Usage);
-    const auto value = session.channel().read(*tag.value());
-    if (!value) return results.failure(uri, value.error(), session.exitCodeFor(value.error()));
+    if (!tag) return results.failure(uri, tag.error());
+    const auto value = session.read(*tag.value());
+    if (!value) return results.failure(uri, value.error());
     results.value(uri, shapeOf(*tag.value()), value.value());
 }
 
 void read(CommandContext& context, const ReadOptions& options) {
     Session session(context, options.line);
-    const std::vector<TagResult> tags = createTags(session.channel(), options.uris);
+    const std::vector<TagResult> tags = createTags(session, options.uris);
     // A line that nothing is asked on need not be there.
     const bool anyTag = std::any_of(tags.begin(), tags.end(), [](auto& tag) { return tag.ok(); });
-    if (anyTag) session.start();
+    if (anyTag) {
+        announceOverrides(context, session, options.line);
+        session.start();
+    }
     Results results(context, options.json);
     for (std::size_t i = 0; i < tags.size(); ++i) {
         readOne(session, options.uris[i], tags[i], results);

@@ -22,8 +22,15 @@ void Results::value(const std::string& uri, ValueShape shape, ByteView value) {
     }
 }
 
-void Results::failure(const std::string& uri, const runtime::ChannelError& error, ExitCode code) {
-    first_.note(code);
+void Results::broadcast(const std::string& uri, ValueShape shape, ByteView value) {
+    this->value(uri, shape, value);
+    if (json_) array_.back()["broadcast"] = true;
+    complain(context_, uri + ": a broadcast: no answer is expected");
+}
+
+void Results::failure(const std::string& uri, const Failure& failure) {
+    const runtime::ChannelError& error = failure.error;
+    first_.note(failure.code);
     // The driver's own areas refuse a value without a word.
     const std::string& text = error.text.empty() ? kNoReason : error.text;
     if (json_) {

@@ -6,8 +6,8 @@
 #include "cli/Bytes.h"
 #include "cli/Command.h"
 #include "cli/JsonValues.h"
+#include "cli/Session.h"
 #include "cli/ValueTypes.h"
-#include "runtime/Channel.h"
 
 namespace cli {
 
@@ -20,8 +20,11 @@ class Results {
 
     void value(const std::string& uri, ValueShape shape, ByteView value);
 
-    /// @param code  What the failure makes of the exit code when it is the first.
-    void failure(const std::string& uri, const runtime::ChannelError& error, ExitCode code);
+    /// A value that was sent to every node, of which none answers.
+    void broadcast(const std::string& uri, ValueShape shape, ByteView value);
+
+    /// The failure's code decides the exit code when it is the first.
+    void failure(const std::string& uri, const Failure& failure);
 
     /// Prints the array and stores the first failure's code in the context.
     void finish();

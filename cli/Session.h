@@ -4,6 +4,7 @@
 #include <memory>
 #include <string>
 
+#include "cli/Bytes.h"
 #include "cli/LineOptions.h"
 #include "cli/OverrideStorage.h"
 #include "runtime/Channel.h"
@@ -11,11 +12,18 @@
 
 namespace cli {
 
+/// Why an access failed, and what that makes of the exit code.
+struct Failure {
+    runtime::ChannelError error;
+    ExitCode code;
+};
+
 /// Loads the plug-in, opens the storage and hands the driver its configuration. The line stays
 /// closed until start().
 class Session {
   public:
-    /// @param context  Outlives the session; --trace writes on its `err`.
+    /// @param context  Outlives the session; --trace writes on its `err`, and keys of the
+    /// configuration that the driver does not know are complained of there.
     /// Errors: CommandError, Usage for the configuration, Other for plug-in and storage.
     Session(CommandContext& context, const LineOptions& options,
             StorageNeed need = StorageNeed::Use);
@@ -34,11 +42,25 @@ class Session {
 
     runtime::Channel& channel();
 
+    /// Makes a tag of a URI, which may name its byte order; it lives as long as the session.
+    /// Errors: Usage, also for conversions that can't be applied to any value of the type.
+    runtime::Result<ITag*, Failure> createTag(const std::string& uri);
+
+    /// As the channel does. What the driver refuses without asking the device is a wrong URI or
+    /// value (Usage), unless an override disabled the node.
+    runtime::Result<Bytes, Failure> read(const ITag& tag);
+    runtime::Result<runtime::Done, Failure> write(const ITag& tag, ByteView value);
+    /// Writes an array item by item. @param written  Receives the items that the device took.
+    runtime::Result<runtime::Done, Failure> writeItems(const ITag& tag, ByteView value,
+                                                       std::size_t& written);
+
+    /// @return the node that the tag's URI names; 0 from a driver without nodes.
+    [[nodiscard]] int nodeOf(const ITag& tag) const;
+    /// @return the memory area that the tag's URI names; empty from a driver without fields.
+    [[nodiscard]] std::string areaOf(const ITag& tag) const;
+
     /// Tells whether the port vanished, or did not take a frame.
     [[nodiscard]] bool portGone() const;
-    /// @return the exit code of a failed read or write: Port when the port is gone, else as the
-    /// driver's error code says.
-    [[nodiscard]] ExitCode exitCodeFor(const runtime::ChannelError& error) const;
 
     /// @return null when overrides are not kept, see openOverrides().
     runtime::Storage* storage();
@@ -49,6 +71,10 @@ class Session {
 
   private:
     struct Parts;
+    [[nodiscard]] Failure failureOf(const ITag& tag, const runtime::ChannelError& error,
+                                    bool asked) const;
+    [[nodiscard]] std::uint64_t framesSent() const;
+
     std::unique_ptr<Parts> parts_;
 };
 

@@ -5,9 +5,12 @@
 
 #include "cli/Assignment.h"
 #include "cli/Commands.h"
+#include "cli/OverrideNotice.h"
+#include "cli/Overrides.h"
 #include "cli/Results.h"
 #include "cli/Session.h"
 #include "cli/Values.h"
+#include "cli/WriteRequests.h"
 
 namespace cli {
 namespace {
@@ -20,7 +23,7 @@ are looked at first: when one is wrong, nothing is sent. Every written tag gets 
 
 Examples:
   mrtu write --sim '1?HREG?400001?short=-5' '1?OUTP?1?boolean-4=1,0,0,1'
-  mrtu write --sim --verify '1?HREG?400010?float=3.25' '1?HREG?400020?string-8="Pump 1"'
+  mrtu write --sim --verify '1?HREG?400010?float@ABCD=3.25' '1?HREG?400020?string-8@AB="Pump 1"'
   mrtu write --port /dev/ttyUSB0 --set presetFunction=06 '1?HREG?400001?unsignedShort=0xFFFF')";
 
 struct WriteOptions {
@@ -30,18 +33,34 @@ struct WriteOptions {
     std::vector<std::string> assignments;
 };
 
+constexpr std::uint8_t kBroadcast = 0;
+
 struct Job {
     std::string uri;
     const ITag* tag;
     Bytes value;
 };
 
-Job prepare(runtime::Channel& channel, const std::string& text) {
+/// @return the address that the tag's node has on the line unless an override gives it another.
+std::uint8_t addressOf(const Session& session, const ITag& tag) {
+    return static_cast<std::uint8_t>(session.nodeOf(tag));
+}
+
+void refuseUnwritable(Session& session, const ITag& tag, bool verify) {
+    if (tag.IsReadOnly()) throw CommandError(ExitCode::Usage, "can only be read");
+    if (addressOf(session, tag) != kBroadcast) return;
+    if (verify)
+        throw CommandError(ExitCode::Usage, "a broadcast can't be read back: not with --verify");
+    if (!goesInOneRequest(session, tag))
+        throw CommandError(ExitCode::Usage, "a broadcast must fit into one request");
+}
+
+Job prepare(Session& session, const std::string& text, bool verify) {
     const Assignment assignment = parseAssignment(text);
-    const auto tag = channel.createTag(assignment.uri);
-    if (!tag) throw CommandError(ExitCode::Usage, tag.error().text);
+    const auto tag = session.createTag(assignment.uri);
     try {
-        if (tag.value()->IsReadOnly()) throw CommandError(ExitCode::Usage, "can only be read");
+        if (!tag) throw CommandError(tag.error().code, tag.error().error.text);
+        refuseUnwritable(session, *tag.value(), verify);
         return {assignment.uri, tag.value(), parseValue(shapeOf(*tag.value()), assignment.value)};
     } catch (const CommandError& error) {
         throw CommandError(error.code(), assignment.uri + ": " + error.what());
@@ -49,45 +68,66 @@ Job prepare(runtime::Channel& channel, const std::string& text) {
 }
 
 /// Complains about every assignment that is wrong, then ends the command.
-std::vector<Job> prepareAll(CommandContext& context, runtime::Channel& channel,
-                            const std::vector<std::string>& assignments) {
+std::vector<Job> prepareAll(CommandContext& context, Session& session,
+                            const WriteOptions& options) {
     std::vector<Job> jobs;
-    for (const std::string& text : assignments) {
+    for (const std::string& text : options.assignments) {
         try {
-            jobs.push_back(prepare(channel, text));
+            jobs.push_back(prepare(session, text, options.verify));
         } catch (const CommandError& error) {
             complain(context, error.what());
         }
     }
-    if (jobs.size() != assignments.size()) {
+    if (jobs.size() != options.assignments.size()) {
         throw CommandError(ExitCode::Usage, "nothing was sent");
     }
     return jobs;
 }
 
 void verifyOne(Session& session, const Job& job, Results& results) {
-    const auto back = session.channel().read(*job.tag);
-    if (!back) return results.failure(job.uri, back.error(), session.exitCodeFor(back.error()));
+    const auto back = session.read(*job.tag);
+    if (!back) return results.failure(job.uri, back.error());
     const ValueShape shape = shapeOf(*job.tag);
     if (back.value() != job.value) {
         const std::string text =
             fmt::format("wrote {} but read back {}", formatValue(shape, job.value),
                         formatValue(shape, back.value()));
-        return results.failure(job.uri, {0, text}, ExitCode::Other);
+        return results.failure(job.uri, {{0, text}, ExitCode::Other});
     }
     results.value(job.uri, shape, back.value());
 }
 
+runtime::Result<runtime::Done, Failure> send(Session& session, const Job& job) {
+    if (!isArrayOfSingleCoils(session, *job.tag)) return session.write(*job.tag, job.value);
+    std::size_t written = 0;
+    auto done = session.writeItems(*job.tag, job.value, written);
+    if (done || written == 0) return done;
+    Failure failure = done.error();
+    failure.error.text += fmt::format(" (the first {} coils were written)", written);
+    return failure;
+}
+
+/// A broadcast is sent and waited for like any write, but its silence is no failure; of one that
+/// takes several requests only the first was sent.
+bool wasBroadcast(Session& session, const ITag& tag, const Failure& failure) {
+    return failure.code == ExitCode::NoResponse && goesInOneRequest(session, tag) &&
+           Overrides(session).address(session.nodeOf(tag)) == kBroadcast;
+}
+
 void writeOne(Session& session, const Job& job, bool verify, Results& results) {
-    const auto done = session.channel().write(*job.tag, job.value);
-    if (!done) return results.failure(job.uri, done.error(), session.exitCodeFor(done.error()));
+    const auto done = send(session, job);
+    const ValueShape shape = shapeOf(*job.tag);
+    if (!done && wasBroadcast(session, *job.tag, done.error()) && !verify)
+        return results.broadcast(job.uri, shape, job.value);
+    if (!done) return results.failure(job.uri, done.error());
     if (verify) return verifyOne(session, job, results);
-    results.value(job.uri, shapeOf(*job.tag), job.value);
+    results.value(job.uri, shape, job.value);
 }
 
 void write(CommandContext& context, const WriteOptions& options) {
     Session session(context, options.line);
-    const std::vector<Job> jobs = prepareAll(context, session.channel(), options.assignments);
+    const std::vector<Job> jobs = prepareAll(context, session, options);
+    announceOverrides(context, session, options.line);
     session.start();
     Results results(context, options.json);
     for (const Job& job : jobs)

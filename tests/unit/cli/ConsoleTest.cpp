@@ -23,19 +23,24 @@ TEST(Console, OneCommandIsAnsweredAsTheDriverAnswers) {
     const struct {
         std::vector<std::string> words;
         const char* answer;
+        int exitCode = 0;
     } rows[] = {
         {{"help"}, kHelp},
         {{"getmaxtm"}, "maxtm = 4000 ms\n"},
         {{"xml"}, "compressedXML=2224"},
         {{"read", "1?HREG?400001?short"}, "e803\n"},
-        {{"read"}, "error: missing parameter (URI string)\n"},
+        {{"read"}, "error: missing parameter (URI string)\n", 2},
         {{"write", "1?HREG?400001?short", "0102"}, "written ok\n"},
-        {{"write", "1?HREG?400001?short", "001"}, "error: incorrect length of data to write\n"},
-        {{"write", "1?HREG?400001?short", "0g00"}, "error: incorrect hex data\n"},
+        {{"write", "1?HREG?400001?short", "001"}, "error: incorrect length of data to write\n", 2},
+        {{"write", "1?HREG?400001?short", "0g00"}, "error: incorrect hex data\n", 2},
         {{"read", "1?HREG?400001"},
-         "Tag URI error: 1?HREG?400001 - there must be 4 tag specification fields"},
+         "Tag URI error: 1?HREG?400001 - there must be 4 tag specification fields",
+         2},
+        {{"read", "1?HREG?410001?short"}, "Exception: Illegal data address", 5},
+        {{"read", "1?HREG?400001?int@ABCD"}, "e903e803\n"},
+        {{"write", "1?HREG?400001?int@ABCD", "01000000"}, "written ok\n"},
         {{"setid", "5", "7"}, "id 5 set to 7\n"},
-        {{"setid", "5"}, "invalid format\n"},
+        {{"setid", "5"}, "invalid format\n", 2},
         {{"getid"}, "no node configurated\n"},
         {{"read 1?HREG?400001?short"}, "e803\n"},  // one word for the shell, two for the driver
     };
@@ -45,20 +50,37 @@ TEST(Console, OneCommandIsAnsweredAsTheDriverAnswers) {
         const Outcome outcome = mrtu(words);
         EXPECT_EQ(outcome.out, row.answer);
         EXPECT_EQ(outcome.err, "") << row.answer;
-        EXPECT_EQ(outcome.exitCode, 0) << row.answer;
+        EXPECT_EQ(outcome.exitCode, row.exitCode) << row.answer;
     }
+}
+
+TEST(Console, ASilentDeviceIsAFailure) {
+    const Outcome outcome = mrtu({"console", "--sim", "--timeout", "50", "--set", "repeat=0",
+                                  "read", "77?HREG?400001?short"});
+    EXPECT_EQ(outcome.out, "No response");
+    EXPECT_EQ(outcome.exitCode, 4);
+}
+
+TEST(Console, AWrongByteOrderIsAUsageError) {
+    const Outcome outcome =
+        mrtu({"console", "--sim"}, {.input = "read 1?HREG?400001?int@ABDC\ngetmaxtm\n"});
+    EXPECT_EQ(outcome.err, "mrtu: 'ABDC' is no byte order of int: ABCD, CDAB, DCBA, BADC\n");
+    EXPECT_EQ(outcome.out, "maxtm = 4000 ms\n");
+    EXPECT_EQ(outcome.exitCode, 2);
 }
 
 TEST(Console, AnUnknownCommandIsAUsageError) {
     const Outcome outcome = mrtu({"console", "--sim", "HELP"});
     EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.err, "mrtu: unknown command 'HELP'\n");
+    EXPECT_EQ(outcome.err, "mrtu: unknown command 'HELP'; did you mean 'help'?\n");
     EXPECT_EQ(outcome.exitCode, 2);
 }
 
 TEST(Console, WithoutALineTheDriverStaysStopped) {
     EXPECT_EQ(mrtu({"console", "help"}).out, kHelp);
-    EXPECT_EQ(mrtu({"console", "read", "1?HREG?400001?short"}).out, "Protocol not started");
+    const Outcome outcome = mrtu({"console", "read", "1?HREG?400001?short"});
+    EXPECT_EQ(outcome.out, "Protocol not started");
+    EXPECT_EQ(outcome.exitCode, 2);
 }
 
 TEST(Console, PipedCommandsAreAnsweredLineByLine) {
@@ -70,7 +92,7 @@ TEST(Console, PipedCommandsAreAnsweredLineByLine) {
               "id 5 set to 7\n"
               "id 5 -> 7\n");
     EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(outcome.exitCode, 2);  // of "read x"
 }
 
 TEST(Console, AnUnknownPipedCommandDoesNotStopTheOthers) {

@@ -58,7 +58,40 @@ TEST_F(Override, ActsOnTheReadsOfALaterProcess) {
     // Node 7 answers for node 5; node 8 counts from 0, so its first register is the second.
     EXPECT_EQ(outcome.out,
               "5?HREG?400001?unsignedShort = 7000\n8?HREG?400001?unsignedShort = 8001\n");
-    EXPECT_EQ(outcome.err, "mrtu: 6?HREG?400001?unsignedShort: error -10: Node disabled\n");
+    EXPECT_NE(outcome.err.find("mrtu: 6?HREG?400001?unsignedShort: error -10: Node disabled\n"),
+              std::string::npos)
+        << outcome.err;
+    EXPECT_EQ(outcome.exitCode, 1);
+}
+
+TEST_F(Override, ThatIsInForceIsToldOnceWithTheWayOut) {
+    set({"node", "5=7", "baud=38400"});
+    const std::string clear = "mrtu override clear --storage " + storage_ + " baud node 5";
+    const std::string notice =
+        "mrtu: stored overrides of 'MRTU' (all lines without --ident) are in force: baud 38400 "
+        "instead of 9600, node 5 = 7; " +
+        storage_ + " holds them, '" + clear + "' clears them\n";
+    const std::string uri = "1?HREG?400001?unsignedShort";
+    EXPECT_EQ(run({"read"}, {"--baud", "9600", uri, uri}).err, notice);
+    EXPECT_EQ(run({"write"}, {"--baud", "9600", uri + "=1"}).err, notice);
+    EXPECT_EQ(run({"console"}, {"--baud", "9600", "getmaxtm"}).err, notice);
+    const Outcome cleared = mrtu({"override", "clear", "--storage", storage_, "baud", "node", "5"});
+    EXPECT_EQ(cleared.exitCode, 0) << cleared.err;
+    EXPECT_EQ(run({"read"}, {"--baud", "9600", uri}).err, "");
+    EXPECT_EQ(list(), kNothing);
+}
+
+TEST_F(Override, ThatKeepsThePortShutIsToldBeforeThat) {
+    mrtu({"override", "set", "--sim", "--storage", storage_, "baud=150"});
+    const Outcome outcome =
+        mrtu({"read", "--port", "/dev/null", "--storage", storage_, "1?HREG?400001?unsignedShort"});
+    EXPECT_NE(outcome.err.find("baud 150 instead of 19200"), std::string::npos) << outcome.err;
+    EXPECT_LT(outcome.err.find("baud 150"), outcome.err.find("not a terminal")) << outcome.err;
+}
+
+TEST_F(Override, ThatSaysWhatTheConfigurationSaysIsNotWorthAWord) {
+    set({"baud=38400", "parity=even"});
+    EXPECT_EQ(run({"read"}, {"--baud", "38400", "--parity", "EVEN", "1?OUTP?1?boolean"}).err, "");
 }
 
 TEST_F(Override, IsTheConsolesToo) {
@@ -123,6 +156,7 @@ TEST_F(Override, AStorageThatMayNotBeWrittenIsAFailureAndKeepsItsValues) {
                                  {.unprivileged = true});
     if (outcome.exitCode >= 126) GTEST_SKIP() << "the unprivileged user can't run the command";
     EXPECT_EQ(outcome.exitCode, 1);
+    EXPECT_EQ(outcome.out, "node 5 = 9\n");
     EXPECT_NE(outcome.err.find("storage"), std::string::npos) << outcome.err;
     EXPECT_NE(list().find("node 5 = 7 (stored)\n"), std::string::npos);
 }

@@ -84,6 +84,36 @@ TEST(Read, FloatsAreShortAndExact) {
     EXPECT_EQ(outcome.out, "1?HREG?400010?float = 1.42243865e-36\n");
 }
 
+TEST(Read, AByteOrderCanBeNamed) {
+    // Registers 1000 to 1003 of node 1: 0x03E8 to 0x03EB.
+    const Outcome outcome =
+        readWith({"--sim"}, {"1?HREG?400001?unsignedInt@ABCD", "1?HREG?400001?unsignedInt@CDAB",
+                             "1?HREG?400001?unsignedInt@DCBA", "1?HREG?400001?unsignedInt@BADC",
+                             "1?HREG?400001?uint64@ABCDEFGH", "1?HREG?400001?string-4@AB",
+                             "1?LONG?5000?unsignedInt@ABCD"});
+    EXPECT_EQ(outcome.out,
+              "1?HREG?400001?unsignedInt@ABCD = 65537001\n"
+              "1?HREG?400001?unsignedInt@CDAB = 65602536\n"
+              "1?HREG?400001?unsignedInt@DCBA = 3909347331\n"
+              "1?HREG?400001?unsignedInt@BADC = 3892570371\n"
+              "1?HREG?400001?uint64@ABCDEFGH = 281479276038587371\n"
+              "1?HREG?400001?string-4@AB = \"\\x03\\xe8\\x03\\xe9\"\n"
+              "1?LONG?5000?unsignedInt@ABCD = 600018000\n");
+    EXPECT_EQ(outcome.err, "");
+    EXPECT_EQ(outcome.exitCode, 0);
+}
+
+TEST(Read, KeysThatTheDriverDoesNotKnowAreToldOnce) {
+    const Outcome outcome = readWith({"--sim", "--set", "timout=5", "--set", "Node3::timout=5",
+                                      "--set", "Node3::timeout=5", "--set", "wholly=1"},
+                                     {"1?OUTP?3?boolean"});
+    EXPECT_EQ(outcome.err,
+              "mrtu: configuration: unknown key 'timout'; did you mean 'timeout'?\n"
+              "mrtu: configuration: unknown key 'wholly'; 'mrtu describe parameters' lists the "
+              "keys\n");
+    EXPECT_EQ(outcome.exitCode, 0);
+}
+
 struct Failing {
     const char* uri;
     int exitCode;
@@ -94,8 +124,8 @@ const Failing kFailing[] = {
     {"77?HREG?400001?int", 4, "mrtu: 77?HREG?400001?int: error -4: No response\n"},
     {"1?HREG?410001?int", 5,
      "mrtu: 1?HREG?410001?int: error -6: Exception: Illegal data address\n"},
-    {"255?HREG?400001?int", 1, "mrtu: 255?HREG?400001?int: error -10: Node disabled\n"},
-    {"0?HREG?400001?int", 1, "mrtu: 0?HREG?400001?int: error -10: Broadcast request\n"},
+    {"255?HREG?400001?int", 2, "mrtu: 255?HREG?400001?int: error -10: Node disabled\n"},
+    {"0?HREG?400001?int", 2, "mrtu: 0?HREG?400001?int: error -10: Broadcast request\n"},
     {"1?HREG?400001", 2,
      "mrtu: 1?HREG?400001: error -1: Tag URI error: 1?HREG?400001 - there must be 4 tag "
      "specification fields\n"},
@@ -105,6 +135,18 @@ const Failing kFailing[] = {
     {"1?HREG?400000?int", 2,
      "mrtu: 1?HREG?400000?int: error -1: Tag URI error: 1?HREG?400000?int - invalid offset for "
      "this memory type\n"},
+    {"1?HREG?465536?int", 2, "mrtu: 1?HREG?465536?int: error -1: Tag exceeds the memory area\n"},
+    {"1?HREG?400001?short(swap3)", 2,
+     "mrtu: 1?HREG?400001?short(swap3): error -9: the conversions can't be applied to this type\n"},
+    {"1?HREG?400001?string-3(swap2)", 2,
+     "mrtu: 1?HREG?400001?string-3(swap2): error -9: the conversions can't be applied to this "
+     "type\n"},
+    {"1?HREG?400001?float@ABDC", 2,
+     "mrtu: 1?HREG?400001?float@ABDC: error -1: 'ABDC' is no byte order of float: ABCD, CDAB, "
+     "DCBA, BADC\n"},
+    // 1000 is 0x03E8: the device's value is no BCD number, the URI is in order.
+    {"1?HREG?400001?unsignedShort(bcd)", 1,
+     "mrtu: 1?HREG?400001?unsignedShort(bcd): error -9: read conversion error\n"},
 };
 
 const std::vector<std::string> kImpatient{"--sim", "--timeout", "100", "--set", "repeat=0"};

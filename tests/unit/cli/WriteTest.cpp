@@ -84,7 +84,8 @@ TEST(Write, OneWrongAssignmentAndNothingIsSent) {
         {"1?IREG?300001?short=1", "mrtu: 1?IREG?300001?short: can only be read\n"},
         {"1?HREG?400002?short", "mrtu: '1?HREG?400002?short' is no URI=VALUE\n"},
         {"1?HREG?400002=1",
-         "mrtu: Tag URI error: 1?HREG?400002 - there must be 4 tag specification fields\n"},
+         "mrtu: 1?HREG?400002: Tag URI error: 1?HREG?400002 - there must be 4 tag specification "
+         "fields\n"},
     };
     for (const auto& row : rows) {
         const Outcome outcome = mrtu({"write", "--sim", "--trace", good, row.wrong});
@@ -124,10 +125,115 @@ TEST(Write, TheConfiguredFunctionIsUsed) {
     EXPECT_EQ(outcome.exitCode, 0);
 }
 
+// Function 5 writes one coil, and of an array the driver sends each the first eight's values.
+TEST(Write, AnArrayOfCoilsGoesCoilByCoilWithFunctionFive) {
+    const RunningSim sim({});
+    for (const char* const key : {"forceFunction=05", "Node1::forceFunction=5"}) {
+        const Outcome written = mrtu({"write", "--port", sim.device(), "--trace", "--set", key,
+                                      "1?OUTP?6?boolean-12=1,0,1,1,0,1,1,0,0,1,0,1"});
+        EXPECT_EQ(written.exitCode, 0) << written.err;
+        EXPECT_NE(written.err.find(" com1 > 01 05 00 10 FF 00 "), std::string::npos) << written.err;
+        const Outcome read = mrtu({"read", "--port", sim.device(), "1?OUTP?6?boolean-12"});
+        EXPECT_EQ(read.out, "1?OUTP?6?boolean-12 = 1,0,1,1,0,1,1,0,0,1,0,1\n") << key;
+        mrtu({"write", "--port", sim.device(), "1?OUTP?6?boolean-12=0,0,0,0,0,0,0,0,0,0,0,0"});
+    }
+}
+
+TEST(Write, AnArrayThatBreaksOffTellsWhatWasWritten) {
+    const Outcome outcome = mrtu({"write", "--sim", "--set", "forceFunction=05",
+                                  "1?OUTP?9999?boolean-4=1,1,1,1", "1?OUTP?10001?boolean-2=1,1"});
+    EXPECT_EQ(outcome.err,
+              "mrtu: 1?OUTP?9999?boolean-4: error -6: Exception: Illegal data address (the first 2 "
+              "coils were written)\n"
+              "mrtu: 1?OUTP?10001?boolean-2: error -6: Exception: Illegal data address\n");
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.exitCode, 5);
+}
+
+const std::vector<std::string> kBriefly{"write", "--sim", "--timeout", "20", "--set", "repeat=0"};
+
+TEST(Write, ABroadcastExpectsNoAnswer) {
+    std::vector<std::string> words = kBriefly;
+    words.push_back("0?HREG?400001?short=5");
+    const Outcome text = mrtu(words);
+    EXPECT_EQ(text.out, "0?HREG?400001?short = 5\n");
+    EXPECT_EQ(text.err, "mrtu: 0?HREG?400001?short: a broadcast: no answer is expected\n");
+    EXPECT_EQ(text.exitCode, 0);
+    words.push_back("--json");
+    EXPECT_EQ(nlohmann::json::parse(mrtu(words).out),
+              nlohmann::json::parse(R"([{"uri": "0?HREG?400001?short", "type": "short", "value": 5,
+                                         "broadcast": true}])"));
+    words.push_back("--verify");
+    const Outcome verified = mrtu(words);
+    EXPECT_EQ(verified.exitCode, 2);
+    EXPECT_NE(verified.err.find("a broadcast can't be read back"), std::string::npos)
+        << verified.err;
+}
+
+// Nobody answers its first request, so the driver never sends the second.
+TEST(Write, ABroadcastOfSeveralRequestsIsRefused) {
+    const struct {
+        std::vector<std::string> options;
+        const char* assignment;
+        int exitCode;
+    } rows[] = {
+        {{}, "0?HREG?400001?int=1", 0},
+        {{"--set", "presetFunction=06"}, "0?HREG?400001?short=1", 0},
+        {{"--set", "presetFunction=06"}, "0?HREG?400001?int=1", 2},
+        {{"--set", "Node0::maxOptLen=4"}, "0?HREG?400001?short-3=1,2,3", 2},
+        {{}, "0?OUTP?1?boolean-3=1,1,0", 0},
+        {{"--set", "forceFunction=05"}, "0?OUTP?1?boolean=1", 0},
+        {{"--set", "forceFunction=05"}, "0?OUTP?1?boolean-3=1,1,0", 2},
+        {{}, "0?LONG?5000?int=1", 0},
+        {{}, "0?LONG?5000?int-2=1,2", 2},
+    };
+    for (const auto& row : rows) {
+        std::vector<std::string> words = kBriefly;
+        words.insert(words.end(), row.options.begin(), row.options.end());
+        words.push_back(row.assignment);
+        const Outcome outcome = mrtu(words);
+        EXPECT_EQ(outcome.exitCode, row.exitCode) << row.assignment << outcome.err;
+        if (row.exitCode == 0) continue;
+        EXPECT_NE(outcome.err.find("a broadcast must fit into one request"), std::string::npos)
+            << outcome.err;
+    }
+}
+
+TEST(Write, AnOverrideToZeroMakesABroadcastOfIt) {
+    const std::string storage = cli_test::scratchFile("broadcast.db");
+    mrtu({"override", "set", "--sim", "--storage", storage, "node", "5=0"});
+    std::vector<std::string> words = kBriefly;
+    words.insert(words.end(), {"--storage", storage, "5?HREG?400001?short=5"});
+    const Outcome outcome = mrtu(words);
+    EXPECT_EQ(outcome.out, "5?HREG?400001?short = 5\n");
+    EXPECT_NE(outcome.err.find("a broadcast: no answer is expected\n"), std::string::npos);
+    words.push_back("5?HREG?400001?short-200=1" + [] {
+        std::string more;
+        for (int i = 1; i < 200; ++i)
+            more += ",1";
+        return more;
+    }());
+    const Outcome tooLong = mrtu(words);
+    EXPECT_EQ(tooLong.exitCode, 4);
+    EXPECT_NE(tooLong.err.find("short-200: error -4: No response\n"), std::string::npos);
+    words.push_back("--verify");
+    EXPECT_EQ(mrtu(words).exitCode, 4);
+}
+
+TEST(Write, WhatIsRefusedIsJsonToo) {
+    const Outcome outcome = mrtu({"write", "--sim", "--json", "1?HREG?400002?short=x"});
+    const auto document = nlohmann::json::parse(outcome.out);
+    EXPECT_EQ(document["exitCode"], 2);
+    EXPECT_EQ(document["errors"],
+              (std::vector<std::string>{"1?HREG?400002?short: 'x' is no whole number (short)",
+                                        "nothing was sent"}));
+    EXPECT_EQ(outcome.exitCode, 2);
+}
+
 TEST(Write, AValueThatTheDriversOwnAreaRefusesIsAFailure) {
     const Outcome outcome = mrtu({"write", "--sim", "1?SP_Stop?0?unsignedByte=7"});
     EXPECT_EQ(outcome.err, "mrtu: 1?SP_Stop?0?unsignedByte: error 1: refused\n");
-    EXPECT_EQ(outcome.exitCode, 1);
+    EXPECT_EQ(outcome.exitCode, 2);
 }
 
 TEST(Write, JsonTellsWhatWasWritten) {

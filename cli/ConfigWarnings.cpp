@@ -1,0 +1,36 @@
+#include "cli/ConfigWarnings.h"
+
+#include <fmt/format.h>
+
+#include <optional>
+#include <set>
+
+#include "cli/check/LintConfig.h"
+#include "cli/describe/DescriptionBlock.h"
+
+namespace cli {
+namespace {
+
+std::optional<Description> descriptionOf(const IProtocol& protocol) {
+    try {
+        return parseDescription(inflateDescription(protocol.GetXml()));
+    } catch (const CommandError&) {
+        return std::nullopt;
+    }
+}
+
+}  // namespace
+
+void warnOfUnknownKeys(CommandContext& context, const IProtocol& protocol,
+                       const std::string& configText) {
+    const auto description = descriptionOf(protocol);
+    if (!description) return;
+    std::set<std::string> said;
+    for (const Finding& finding : lintConfig(scanConfig("", configText), *description)) {
+        if (finding.rule != "unknown-key" || !said.insert(finding.message).second) continue;
+        complain(context,
+                 fmt::format("configuration: {}; {}", finding.message, finding.suggestion));
+    }
+}
+
+}  // namespace cli
