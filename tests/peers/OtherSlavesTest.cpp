@@ -1,56 +1,11 @@
 // The command and the driver against slaves that other people wrote, in both modes.
 #include <gtest/gtest.h>
 
-#include <memory>
-
-#include "OtherSlaves.h"
-#include "RunProgram.h"
+#include "OtherSlavesFixture.h"
 
 namespace {
 
-constexpr int kNode = 3;
-
-struct Peer {
-    const char* name;
-    const char* mode;
-    std::unique_ptr<peers::OtherSlave> (*make)();
-};
-
-void PrintTo(const Peer& peer, std::ostream* out) {
-    *out << peer.name;
-}
-
-const Peer kPeers[] = {
-    {"libmodbusRtu", "RTU",
-     []() -> std::unique_ptr<peers::OtherSlave> {
-         return std::make_unique<peers::LibmodbusSlave>(kNode);
-     }},
-    {"pymodbusRtu", "RTU",
-     []() -> std::unique_ptr<peers::OtherSlave> {
-         return std::make_unique<peers::PymodbusSlave>("rtu", kNode);
-     }},
-    {"pymodbusAscii", "ASCII",
-     []() -> std::unique_ptr<peers::OtherSlave> {
-         return std::make_unique<peers::PymodbusSlave>("ascii", kNode);
-     }},
-};
-
-class OtherSlavesTest : public testing::TestWithParam<Peer> {
-  protected:
-    /// Runs `mrtu` on the slave's line; `more` begins with the sub-command.
-    peers::ProgramResult mrtu(const std::vector<std::string>& more) const {
-        // Of an item that is set twice the first counts.
-        std::vector<std::string> words{MRTU_COMMAND};
-        words.insert(words.end(), more.begin(), more.end());
-        for (const std::string& item : {std::string("timeout=10000"), std::string("bits=8"),
-                                        std::string("txMode=") + GetParam().mode})
-            words.insert(words.end(), {"--set", item});
-        words.insert(words.end(), {"--port", slave_->port(), "--storage", "none"});
-        return peers::runProgram(words);
-    }
-
-    std::unique_ptr<peers::OtherSlave> slave_ = GetParam().make();
-};
+using peers::OtherSlavesTest;
 
 TEST_P(OtherSlavesTest, EveryAreaHoldsWhatTheSlaveSays) {
     const auto result = mrtu({"read", "3?OUTP?1?boolean-8", "3?INP?100001?boolean-8",
@@ -100,7 +55,6 @@ TEST_P(OtherSlavesTest, AnotherNodesRequestStaysUnanswered) {
     EXPECT_NE(result.output.find("error -4: No response"), std::string::npos) << result.output;
 }
 
-INSTANTIATE_TEST_SUITE_P(Peers, OtherSlavesTest, testing::ValuesIn(kPeers),
-                         [](const auto& peer) { return std::string(peer.param.name); });
+INSTANTIATE_TEST_SUITE_P(Peers, OtherSlavesTest, testing::ValuesIn(peers::kPeers), peers::nameOf);
 
 }  // namespace
