@@ -1,6 +1,9 @@
 // Command lines and configurations that are not accepted, and questions.
 #include <gtest/gtest.h>
 
+#include <nlohmann/json.hpp>
+#include <sstream>
+
 #include "tests/unit/cli/Child.h"
 
 namespace {
@@ -9,6 +12,15 @@ using cli_test::mrtu;
 using cli_test::Outcome;
 
 const std::string kUri = "1?HREG?400001?unsignedShort";
+
+/// Each line of standard error is a complaint, and there is one.
+void expectComplaints(const std::string& err) {
+    std::istringstream lines(err);
+    int count = 0;
+    for (std::string line; std::getline(lines, line); ++count)
+        EXPECT_EQ(line.rfind("mrtu: ", 0), 0U) << line;
+    EXPECT_GT(count, 0);
+}
 
 TEST(Usage, WrongCommandLinesExitWithTwo) {
     const std::vector<std::string> rows[] = {
@@ -35,16 +47,128 @@ TEST(Usage, WrongCommandLinesExitWithTwo) {
         const std::string last = words.empty() ? "nothing" : words.back();
         EXPECT_EQ(outcome.exitCode, 2) << last;
         EXPECT_EQ(outcome.out, "") << last;
-        EXPECT_NE(outcome.err, "") << last;
+        expectComplaints(outcome.err);
     }
 }
 
-TEST(Usage, AMisspeltCommandIsNamed) {
-    EXPECT_NE(mrtu({"reed", kUri}).err.find("reed"), std::string::npos);
+TEST(Usage, WhatIsUnknownIsAnsweredWithWhatIsAccepted) {
+    const struct {
+        std::vector<std::string> words;
+        const char* answer;
+    } rows[] = {
+        {{"reed", kUri},
+         "unknown command: 'reed' is not one of read, write, console, override, info, describe, "
+         "check, inspect, sim; did you mean 'read'?"},
+        {{"override", "lst"},
+         "unknown command: 'lst' is not one of list, set, clear; did you mean 'list'?"},
+        {{"override"}, "one of list, set, clear must follow; 'mrtu override --help' tells more"},
+        {{"read", "--bauds", "9600", kUri}, "unknown option '--bauds'; did you mean '--baud'?"},
+        {{"read", "--bauds=9600", kUri}, "unknown option '--bauds'; did you mean '--baud'?"},
+        {{"--verson"}, "unknown option '--verson'; did you mean '--version'?"},
+        {{"sim", "--xyz"}, "unknown option '--xyz'; 'mrtu sim --help' tells more"},
+        {{"read"}, "URI is required; 'mrtu read --help' tells more"},
+        {{"info", "more"}, "'more' was not expected; 'mrtu info --help' tells more"},
+        {{"describe", "modls"},
+         "section: 'modls' is not one of models, memory, parameters, conversions; did you mean "
+         "'models'?"},
+        {{"read", "--sim", "--model", "9", kUri},
+         "--model: '9' is not one of 1, 2, 3, 4; 'mrtu read --help' tells more"},
+        {{"write", "--sim", "--parity", "evn", "x"},
+         "--parity: 'evn' is not one of none, even, odd, mark; did you mean 'even'?"},
+        {{"read", "--sim", "--baud", "9601", kUri},
+         "--baud: '9601' is not one of 150, 300, 600, 1200, 2400, 4800, 9600, 19200, 38400, "
+         "57600, 115200; did you mean '9600'?"},
+        {{"read", "--sim", "--timeout", "-5", kUri},
+         "--timeout: '-5' is no number from 0 to 3600000; 'mrtu read --help' tells more"},
+        {{"read", "--config", "", kUri}, "--config: an empty word; 'mrtu read --help' tells more"},
+    };
+    for (const auto& row : rows) {
+        const Outcome outcome = mrtu(row.words);
+        EXPECT_EQ(outcome.err, std::string("mrtu: ") + row.answer + '\n');
+        EXPECT_EQ(outcome.out, "") << row.answer;
+        EXPECT_EQ(outcome.exitCode, 2) << row.answer;
+    }
+}
+
+TEST(Usage, ShortFormsRefuseWhatTheDriverWouldTakeForSomethingElse) {
+    for (const char* const option :
+         {"--baud", "--parity", "--stopbits", "--node", "--model", "--timeout"}) {
+        for (const char* const value : {"abc", "", "0x10", "999999999999", "-1"}) {
+            const Outcome outcome = mrtu({"read", "--sim", option, value, kUri});
+            EXPECT_EQ(outcome.exitCode, 2) << option << ' ' << value;
+            EXPECT_EQ(outcome.err.rfind(std::string("mrtu: ") + option, 0), 0U) << outcome.err;
+        }
+    }
+    EXPECT_EQ(mrtu({"read", "--sim", "--baud", "0", kUri}).exitCode, 2);
+    // The driver alone would read 010 as 8.
+    EXPECT_EQ(mrtu({"console", "--timeout", "010", "--set", "repeat=2", "getmaxtm"}).out,
+              "maxtm = 20 ms\n");
+}
+
+TEST(Usage, WithJsonEveryFailureIsJson) {
+    const std::vector<std::string> rows[] = {
+        {"read"},
+        {"read", "--bogus", kUri},
+        {"read", kUri},
+        {"read", "--sim", "--config", "/nowhere/x.cfg", kUri},
+        {"read", "--port", "/nowhere/tty", kUri},
+        {"read", "--sim", "--plugin", "/nowhere/x.so", kUri},
+        {"read", "--sim", "--storage", "/dev/null/x.db", kUri},
+        {"read", "--sim", "1?HREG?400001?word", "1?HREG?410001?int"},
+        {"write", "--sim", "x"},
+        {"write", "--sim", "1?HREG?410001?short=1"},
+        {"describe", "--plugin", "/nowhere/x.so"},
+        {"describe", "modls"},
+        {"check", "--config", "/nowhere/x.cfg"},
+        {"inspect", "/nowhere/x.so"},
+        {"inspect", "/dev/null"},
+        {"info"},
+        {"reed"},
+        {},
+    };
+    for (std::vector<std::string> words : rows) {
+        const std::string first = words.empty() ? "nothing" : words.front();
+        words.push_back("--json");
+        const Outcome outcome = mrtu(words);
+        EXPECT_NE(outcome.exitCode, 0) << first;
+        const auto document = nlohmann::json::parse(outcome.out, nullptr, false);
+        EXPECT_FALSE(document.is_discarded()) << first << ": " << outcome.out;
+        if (!document.is_object() || !document.contains("errors")) continue;
+        EXPECT_EQ(document["exitCode"], outcome.exitCode) << first;
+        std::string complaints;
+        for (const auto& each : document["errors"])
+            complaints += "mrtu: " + each.get<std::string>() + '\n';
+        EXPECT_EQ(complaints, outcome.err) << first;
+        expectComplaints(outcome.err);
+    }
+}
+
+/// Lines behind `| name |`, `  name ` and so on.
+bool hasLineFor(const std::string& text, const std::string& front) {
+    return text.find('\n' + front) != std::string::npos;
+}
+
+TEST(Usage, EveryCommandStandsInTheHelpAndInTheDocuments) {
+    const std::string help = mrtu({"--help"}).out;
+    const std::string page = cli_test::contentsOf(SOURCE_FOLDER "/docs/command-line.md");
+    const std::string readme = cli_test::contentsOf(SOURCE_FOLDER "/README.md");
+    std::string names = mrtu({"reed"}).err;
+    names = names.substr(names.find("one of ") + 7);
+    names = names.substr(0, names.find(';'));
+    std::istringstream words(names);
+    int count = 0;
+    for (std::string name; words >> name; ++count) {
+        if (name.ends_with(',')) name.pop_back();
+        EXPECT_TRUE(hasLineFor(help, "  " + name + ' ')) << name;
+        EXPECT_TRUE(hasLineFor(page, "| `" + name + "` |")) << name;
+        EXPECT_TRUE(hasLineFor(readme, "| `" + name + "` |")) << name;
+    }
+    EXPECT_EQ(9, count);
 }
 
 TEST(Usage, EveryCommandExplainsItselfWithExamples) {
-    for (const char* const command : {"read", "write", "console", "override", "info", "sim"}) {
+    for (const char* const command :
+         {"read", "write", "console", "override", "info", "describe", "check", "inspect", "sim"}) {
         const Outcome outcome = mrtu({command, "--help"});
         EXPECT_EQ(outcome.exitCode, 0) << command;
         EXPECT_NE(outcome.out.find("Examples:\n  mrtu " + std::string(command)), std::string::npos)
