@@ -50,8 +50,8 @@ void append(Findings& all, const Findings& more) {
 void checkTags(IProtocol& protocol, const TagSurroundings& surroundings, std::vector<TagLine>& tags,
                Findings& out) {
     for (TagLine& tag : tags) {
-        std::string refusal;
-        tag.facts = factsOf(protocol, tag.uri, refusal);
+        std::string refusal = tag.orderRefusal;
+        if (refusal.empty()) tag.facts = factsOf(protocol, tag.driverUri, refusal);
         if (!tag.facts) out.push_back(tagRefusal(tag, surroundings, refusal));
         append(out, lintTag(tag, surroundings));
     }

@@ -2,6 +2,9 @@
 
 #include <algorithm>
 
+#include "cli/ByteOrder.h"
+#include "cli/ExitCode.h"
+
 namespace cli {
 namespace {
 
@@ -48,7 +51,19 @@ Place TagLine::placeOf(std::size_t field) const {
 }
 
 TagLine tagLine(std::string_view uri, const std::string& source, int line, int column) {
-    return {std::string(uri), {source, line, column}, fieldsOf(uri, column), std::nullopt};
+    TagLine tag{.uri = std::string(uri),
+                .place = {source, line, column},
+                .fields = {},
+                .facts = std::nullopt,
+                .driverUri = std::string(uri),
+                .orderRefusal = {}};
+    try {
+        tag.driverUri = withoutByteOrder(tag.uri);
+    } catch (const CommandError& error) {
+        tag.orderRefusal = error.what();
+    }
+    tag.fields = fieldsOf(tag.driverUri, column);
+    return tag;
 }
 
 std::vector<TagLine> tagLines(const std::string& source, std::string_view text) {

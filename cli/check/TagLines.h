@@ -39,10 +39,13 @@ struct UriField {
 };
 
 struct TagLine {
-    std::string uri;
+    std::string uri;  ///< As written.
     Place place;
-    std::vector<UriField> fields;   ///< Four in a well-formed URI: node, area, address, data type.
+    std::vector<UriField> fields;   ///< Four in a well-formed URI: node, area, address, data type;
+                                    ///< the data type with conversions for a byte order by name.
     std::optional<TagFacts> facts;  ///< Nothing when the driver refused the tag.
+    std::string driverUri;          ///< The URI with conversions for a byte order by name.
+    std::string orderRefusal;       ///< Why the named byte order can't be; empty for most.
 
     [[nodiscard]] bool wellFormed() const { return fields.size() == 4; }
     [[nodiscard]] const std::string& node() const { return fields[0].text; }

@@ -108,6 +108,9 @@ Verdict blameOf(const TagLine& tag, const TagSurroundings& around) {
 
 Finding tagRefusal(const TagLine& tag, const TagSurroundings& surroundings,
                    const std::string& message) {
+    if (!tag.orderRefusal.empty()) {
+        return {Severity::Error, "refused", tag.placeOf(3), tag.orderRefusal, {}};
+    }
     const Verdict blame = blameOf(tag, surroundings);
     return {Severity::Error, "refused", tag.placeOf(blame ? blame->field : 0), message,
             blame ? blame->suggestion : std::string()};

@@ -65,6 +65,18 @@ TEST_F(CheckCommand, CleanConfigurationAndTagsAreClean) {
     EXPECT_EQ(outcome.out, "0 errors, 0 warnings (2 tags checked)\n");
 }
 
+TEST_F(CheckCommand, ByteOrdersMayBeNamed) {
+    const Outcome good =
+        check(kGood, {"--strict", "1?HREG?400001?float@ABCD", "1?HREG?400003?double@GHEFCDAB",
+                      "1?HREG?400007?string-8@AB"});
+    EXPECT_EQ(good.code, 0) << good.out;
+    const Outcome wrong = check(kGood, {"1?HREG?400001?float@ABDC"});
+    EXPECT_EQ(wrong.code, 2);
+    EXPECT_EQ(wrong.out,
+              "argument:1:15: error: 'ABDC' is no byte order of float: ABCD, CDAB, DCBA, BADC "
+              "[refused]\n1 error, 0 warnings (1 tag checked)\n");
+}
+
 TEST_F(CheckCommand, WarningsCountOnlyWhenStrict) {
     const std::string config = kGood + "timout=1";
     EXPECT_EQ(check(config, {}).code, 0);

@@ -31,6 +31,17 @@ TEST(TagLines, FieldsAreTrimmedAndKnowTheirColumns) {
     EXPECT_EQ(tag.placeOf(9), tag.place);
 }
 
+TEST(TagLines, AByteOrderByNameIsItsConversions) {
+    const TagLine tag = tagLine("1?HREG?400001?float@ABCD", "t", 1, 1);
+    EXPECT_EQ("1?HREG?400001?float@ABCD", tag.uri);
+    EXPECT_EQ("1?HREG?400001?float(swap2,swap4)", tag.driverUri);
+    EXPECT_EQ("float(swap2,swap4)", tag.dataType());
+    EXPECT_EQ("", tag.orderRefusal);
+    const TagLine wrong = tagLine("1?HREG?400001?float@ABDC", "t", 1, 1);
+    EXPECT_EQ("'ABDC' is no byte order of float: ABCD, CDAB, DCBA, BADC", wrong.orderRefusal);
+    EXPECT_EQ(wrong.uri, wrong.driverUri);
+}
+
 TEST(TagLines, OtherCountsOfFieldsAreNotWellFormed) {
     for (const char* uri : {"", "1", "1?A?2", "1?A?2?int?x"}) {
         EXPECT_FALSE(tagLine(uri, "t", 1, 1).wellFormed()) << uri;
