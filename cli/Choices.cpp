@@ -16,7 +16,10 @@ bool sameWord(std::string_view a, std::string_view b) {
 
 std::string didYouMean(std::string_view word, const std::vector<std::string>& names) {
     const std::string nearest = nearestName(word, names);
-    return nearest.empty() ? "" : fmt::format("; did you mean '{}'?", nearest);
+    // Numbers that differ in two digits have nothing to do with each other.
+    const bool number = word.find_first_not_of("0123456789") == std::string_view::npos;
+    if (nearest.empty() || (number && editDistance(word, nearest) > 1)) return {};
+    return fmt::format("; did you mean '{}'?", nearest);
 }
 
 std::string notOneOf(std::string_view word, const std::vector<std::string>& choices) {

@@ -53,12 +53,13 @@ const SerialSetting* settingOf(std::string_view name) {
 }
 
 std::uint32_t codeOf(std::string_view whole, const SerialSetting& setting, std::string_view text) {
-    std::vector<std::string_view> known;
+    std::vector<std::string> known;
     for (const SettingWord& word : setting.words) {
         if (sameWord(word.word, text)) return word.code;
-        known.push_back(word.word);
+        known.emplace_back(word.word);
     }
-    refuse(whole, fmt::format("{} is one of {}", setting.name, fmt::join(known, ", ")));
+    refuse(whole, fmt::format("{} is one of {}{}", setting.name, fmt::join(known, ", "),
+                              didYouMean(text, known)));
 }
 
 std::uint8_t parseAddress(std::string_view whole, std::string_view text) {
@@ -70,6 +71,14 @@ bool parseOnOff(std::string_view whole, std::string_view text) {
     if (text == "on") return true;
     if (text == "off") return false;
     refuse(whole, "Modicon mode is on or off");
+}
+
+/// @return what words can begin with.
+std::vector<std::string> subjects() {
+    std::vector<std::string> names{"node", "modicon"};
+    for (const SerialSetting& setting : kSettings)
+        names.emplace_back(setting.name);
+    return names;
 }
 
 enum class Subject : std::uint8_t { None, Node, Modicon };
@@ -93,7 +102,8 @@ void addChange(OverrideChanges& changes, const std::string& word, Subject subjec
     } else if (subject == Subject::Modicon) {
         changes.modicon.push_back({parseNumber(word, left, kNodeOff), parseOnOff(word, right)});
     } else {
-        refuse(word, "the settings are baud, parity, stop and mode; nodes go as 'node N=M'");
+        refuse(word, "the settings are baud, parity, stop and mode; nodes go as 'node N=M'" +
+                         didYouMean(left, subjects()));
     }
 }
 
@@ -105,7 +115,8 @@ void addRemoval(OverrideRemovals& removals, const std::string& word, Subject sub
     } else if (subject == Subject::Modicon) {
         removals.modicon.push_back(parseNumber(word, word, kNodeOff));
     } else {
-        refuse(word, "expected node N, modicon N, baud, parity, stop, mode or all");
+        refuse(word, "expected node N, modicon N, baud, parity, stop, mode or all" +
+                         didYouMean(word, subjects()));
     }
 }
 

@@ -15,12 +15,15 @@ constexpr const char* kFooter =
 needs quotes around it. Each URI gets a line "URI = value"; one that fails gets its error on
 standard error and does not stop the others.
 
-Byte order, as the bytes travel; A is the most significant one, ABCD what most devices send:
-  32 bits: float@ABCD, @CDAB, @DCBA or @BADC. Without an order CDAB is meant
-  64 bits: double@ABCDEFGH, @GHEFCDAB, @HGFEDCBA, @BADCFEHG. Without one GHEFCDAB
-  texts:   string-8@AB is the usual order, the first character in the high byte. Without one BA
-The driver itself calls float@ABCD float(swap2,swap4), @DCBA (swap2), @BADC (swap4); double@ABCDEFGH
-(swap2,swap8), @HGFEDCBA (swap2), @BADCFEHG (swap8); string-8@AB string-8(swap2).
+Byte order: named behind the type, as the bytes travel; A is the most significant byte. Most devices
+send ABCD. Without a name and without conversions it is CDAB, GHEFCDAB, and BA for texts.
+
+                              32 bits      as conversions        64 bits          as conversions
+  usual, high word first      float@ABCD   float(swap2,swap4)    double@ABCDEFGH  double(swap2,swap8)
+  low word first              float@CDAB   float                 double@GHEFCDAB  double
+  all bytes reversed          float@DCBA   float(swap2)          double@HGFEDCBA  double(swap2)
+  high word, bytes swapped    float@BADC   float(swap4)          double@BADCFEHG  double(swap8)
+  text, usual                 string-8@AB  string-8(swap2)
 
 Examples:
   mrtu read --sim '1?HREG?400001?unsignedShort'

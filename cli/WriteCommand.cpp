@@ -19,7 +19,7 @@ constexpr const char* kFooter =
     R"(Values are written as `mrtu read` prints them: numbers (0x... too), 0 or 1 (false, true), arrays as
 comma lists, strings with or without double quotes, binary as 0x and two digits a byte. All values
 are looked at first: when one is wrong, nothing is sent. Every written tag gets a line
-"URI = value", with --verify the value that was read back.
+"URI = value", with --verify the value that was read back. `mrtu read --help` tells the byte orders.
 
 Examples:
   mrtu write --sim '1?HREG?400001?short=-5' '1?OUTP?1?boolean-4=1,0,0,1'

@@ -89,6 +89,16 @@ bool readPart(std::string_view part, Fault& fault) {
     return row->set(hasValue ? part.substr(equals + 1) : std::string_view{}, fault);
 }
 
+/// @return "silent, node, ..., exception=, ...".
+std::string knownParts() {
+    std::string names;
+    for (const PartRow& row : kParts) {
+        if (!names.empty()) names += ", ";
+        names.append(row.name).append(row.hasValue ? "=" : "");
+    }
+    return names;
+}
+
 }  // namespace
 
 std::optional<Fault> parseFault(std::string_view text, std::string& error) {
@@ -97,7 +107,7 @@ std::optional<Fault> parseFault(std::string_view text, std::string& error) {
         const std::size_t comma = text.find(',');
         const std::string_view part = text.substr(0, comma);
         if (!readPart(part, fault)) {
-            error = "not a fault: \"" + std::string(part) + "\"";
+            error = "not a fault: \"" + std::string(part) + "\"; the faults are " + knownParts();
             return std::nullopt;
         }
         if (comma == std::string_view::npos) return fault;

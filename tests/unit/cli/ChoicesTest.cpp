@@ -9,6 +9,9 @@ const std::vector<std::string> kParities{"none", "even", "odd", "mark"};
 TEST(Choices, TheNearestNameIsOffered) {
     EXPECT_EQ("; did you mean 'even'?", cli::didYouMean("evn", kParities));
     EXPECT_EQ("", cli::didYouMean("something else", kParities));
+    EXPECT_EQ("; did you mean '9600'?", cli::didYouMean("9601", {"9600", "19200"}));
+    EXPECT_EQ("", cli::didYouMean("14400", {"1200", "19200"}));
+    EXPECT_EQ("", cli::didYouMean("0", {"150", "300"}));
     EXPECT_EQ("'evn' is not one of none, even, odd, mark; did you mean 'even'?",
               cli::notOneOf("evn", kParities));
     EXPECT_EQ("'' is not one of none, even, odd, mark", cli::notOneOf("", kParities));

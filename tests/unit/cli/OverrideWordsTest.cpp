@@ -82,7 +82,11 @@ TEST(OverrideWords, WhatCannotBeSetIsNamed) {
          "115200"},
         {{"parity=both"}, "'parity=both': parity is one of none, even, odd, mark, space"},
         {{"stop=7"}, "'stop=7': stop is one of 1, 2"},
-        {{"mode=RS-485P"}, "'mode=RS-485P': mode is one of RS-232, RS-485, RS-422"},
+        {{"mode=RS-485P"},
+         "'mode=RS-485P': mode is one of RS-232, RS-485, RS-422; did you mean 'RS-485'?"},
+        {{"pairty=even"},
+         "'pairty=even': the settings are baud, parity, stop and mode; nodes go as 'node N=M'; did "
+         "you mean 'parity'?"},
         {{"node", "5=256"}, "'5=256': '256' is no number from 0 to 255"},
         {{"node", "256=5"}, "'256=5': '256' is no number from 0 to 255"},
         {{"node", "-1=5"}, "'-1=5': '-1' is no number from 0 to 255"},
