@@ -40,7 +40,7 @@ class Session {
     /// Tells whether the command line names a line at all.
     [[nodiscard]] bool hasLine() const;
 
-    runtime::Channel& channel();
+    [[nodiscard]] runtime::Channel& channel() const;
 
     /// Makes a tag of a URI, which may name its byte order; it lives as long as the session.
     /// Errors: Usage, also for conversions that can't be applied to any value of the type.
