@@ -141,6 +141,7 @@ const ByteOrder& chosen(const OrderedType& type, const std::vector<ByteOrder>& c
                                     [&](const ByteOrder& each) { return each.name == type.order; });
     if (found != choices.end()) return *found;
     std::vector<std::string_view> names;
+    names.reserve(choices.size());
     for (const ByteOrder& each : choices)
         names.push_back(each.name);
     refuse(fmt::format("'{}' is no byte order of {}: {}", type.order, type.name,
