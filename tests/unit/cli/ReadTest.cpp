@@ -144,8 +144,8 @@ const Failing kFailing[] = {
     {"1?HREG?400001?float@ABDC", 2,
      "mrtu: 1?HREG?400001?float@ABDC: error -1: 'ABDC' is no byte order of float: ABCD, CDAB, "
      "DCBA, BADC\n"},
-    {"1?HREG?400001?string-1000000000(swap2)", 2,
-     "mrtu: 1?HREG?400001?string-1000000000(swap2): error -1: Tag exceeds the memory area\n"},
+    {"1?HREG?400001?string-1000000(swap2)", 2,
+     "mrtu: 1?HREG?400001?string-1000000(swap2): error -1: Tag exceeds the memory area\n"},
     // 1000 is 0x03E8: the device's value is no BCD number, the URI is in order.
     {"1?HREG?400001?unsignedShort(bcd)", 1,
      "mrtu: 1?HREG?400001?unsignedShort(bcd): error -9: read conversion error\n"},
