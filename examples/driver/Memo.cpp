@@ -57,7 +57,9 @@ ITag* Memo::CreateTagBase(const char* uri) try {
     ProtUtilsN::ParseSubstrings(uri, fields, '?');
     if (fields.size() != 3) return refuse("A tag is memorytype?index?datatype");
 
+    // The tag is the engine's, which tells of short memory instead of throwing.
     auto tag = std::make_unique<ProtgenTag>(uri, kUriNames);
+    if (!tag->isComplete()) return refuse("Out of memory");
     tag->setModel(memory_.getModel("1"));
     tag->setMemoryType(memory_.getMemoryType("1", fields[0]));
     if (tag->memoryType() == nullptr) return refuse("The only memory type is CELL");
@@ -69,7 +71,8 @@ ITag* Memo::CreateTagBase(const char* uri) try {
     std::vector<std::string> conversions;
     if (!ProtUtilsN::GetICOMType(fields[2], type, itemType, length, conversions))
         return refuse("Data type unknown");
-    tag->setDataType(type, itemType, length, std::move(conversions));
+    if (!tag->setDataType(type, itemType, length, std::move(conversions)))
+        return refuse("Out of memory");
     return tag.release();
 } catch (const std::bad_alloc&) {
     return refuse("Out of memory");

@@ -113,7 +113,7 @@ TEST(Usage, WithJsonEveryFailureIsJson) {
         {"read", "--sim", "--config", "/nowhere/x.cfg", kUri},
         {"read", "--port", "/nowhere/tty", kUri},
         {"read", "--sim", "--plugin", "/nowhere/x.so", kUri},
-        {"read", "--sim", "--storage", "/dev/null/x.db", kUri},
+        {"read", "--sim", "--storage", SOURCE_FOLDER "/README.md", kUri},
         {"read", "--sim", "1?HREG?400001?word", "1?HREG?410001?int"},
         {"write", "--sim", "x"},
         {"write", "--sim", "1?HREG?410001?short=1"},
