@@ -19,9 +19,14 @@ std::string addressKey(int node) {
 }
 
 std::optional<int> nodeOfAddressKey(std::string_view key) {
+    const auto number = addressNumber(key);
+    if (!number) return std::nullopt;
+    return static_cast<int>(std::strtol(number->c_str(), nullptr, 0));
+}
+
+std::optional<std::string> addressNumber(std::string_view key) {
     if (!key.starts_with(kAddressFront)) return std::nullopt;
-    const std::string number(key.substr(kAddressFront.size()));
-    return static_cast<int>(std::strtol(number.c_str(), nullptr, 0));
+    return std::string(key.substr(kAddressFront.size()));
 }
 
 std::string modiconKey(int node) {
@@ -29,13 +34,18 @@ std::string modiconKey(int node) {
 }
 
 std::optional<int> nodeOfModiconKey(std::string_view key) {
-    if (!key.starts_with(kModiconFront) || !key.ends_with(kModiconTail)) return std::nullopt;
+    if (!isModiconKey(key)) return std::nullopt;
     key.remove_prefix(kModiconFront.size());
     key.remove_suffix(kModiconTail.size());
     int node = 0;
     const auto [stop, error] = std::from_chars(key.data(), key.data() + key.size(), node);
     if (error != std::errc{} || stop != key.data() + key.size()) return std::nullopt;
     return node;
+}
+
+bool isModiconKey(std::string_view key) {
+    return key.size() >= kModiconFront.size() + kModiconTail.size() &&
+           key.starts_with(kModiconFront) && key.ends_with(kModiconTail);
 }
 
 }  // namespace cli

@@ -6,8 +6,8 @@
 #include <cerrno>
 #include <cstdlib>
 #include <optional>
-#include <string_view>
 
+#include "cli/OverrideKeys.h"
 #include "cli/OverrideWords.h"
 #include "runtime/SqliteStorage.h"
 
@@ -18,8 +18,6 @@ using runtime::SqliteStorage;
 using runtime::StorageError;
 using runtime::StorageFault;
 
-constexpr std::string_view kAddressKey = "tempNode";
-constexpr std::string_view kModiconTail = "_ModiconMode";
 constexpr const char* kGoWithout = "--storage none does without";
 
 /// A number as the driver reads it: decimal, 0x hexadecimal, leading 0 octal; but all of the text.
@@ -62,8 +60,8 @@ std::unique_ptr<runtime::Storage> goWithout(CommandContext& context, StorageNeed
 
 std::string overrideFault(const std::string& key, const runtime::StoredValue& value) {
     const std::string text = runtime::storedText(value);
-    if (key.starts_with(kAddressKey)) return addressFault(key.substr(kAddressKey.size()), text);
-    if (key.starts_with("node") && key.ends_with(kModiconTail)) {
+    if (const auto node = addressNumber(key)) return addressFault(*node, text);
+    if (isModiconKey(key)) {
         const bool flag = text == "0" || text == "1" || text == "true" || text == "false";
         return flag ? "" : fmt::format("'{}' is neither 0 nor 1", text);
     }

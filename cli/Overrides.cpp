@@ -109,9 +109,8 @@ bool Overrides::stores(const SerialSetting& setting, std::uint32_t code) {
 }
 
 void Overrides::forgetAddress(int node) {
-    if (session_.storage() == nullptr) return;
-    for (const runtime::StoredEntry& entry : session_.storage()->entries(section())) {
-        if (nodeOfAddressKey(entry.key) == node) removeKey(entry.key);
+    for (const std::string& key : keys()) {
+        if (nodeOfAddressKey(key) == node) removeKey(key);
     }
 }
 void Overrides::forgetModicon(int node) {
@@ -122,13 +121,19 @@ void Overrides::forget(const SerialSetting& setting) {
 }
 
 void Overrides::forgetAll() {
-    if (session_.storage() == nullptr) return;
-    for (const runtime::StoredEntry& entry : session_.storage()->entries(section())) {
-        removeKey(entry.key);
-    }
-    for (const runtime::UnusedEntry& entry : session_.storage()->unused(section())) {
-        removeKey(entry.key);
-    }
+    for (const std::string& key : keys())
+        removeKey(key);
+}
+
+// Of what is in force and of what is there and not used.
+std::vector<std::string> Overrides::keys() {
+    std::vector<std::string> keys;
+    if (session_.storage() == nullptr) return keys;
+    for (const runtime::StoredEntry& entry : session_.storage()->entries(section()))
+        keys.push_back(entry.key);
+    for (const runtime::UnusedEntry& entry : session_.storage()->unused(section()))
+        keys.push_back(entry.key);
+    return keys;
 }
 
 bool Overrides::hasKey(const std::string& key) {

@@ -3,6 +3,7 @@
 
 #include <set>
 #include <string>
+#include <vector>
 
 #include "cli/OverrideWords.h"
 #include "cli/Session.h"
@@ -41,6 +42,7 @@ class Overrides {
   private:
     std::uint32_t read(const std::string& uri);
     void write(const std::string& uri, std::uint32_t value, std::size_t bytes);
+    std::vector<std::string> keys();
     bool hasKey(const std::string& key);
     bool storesNumber(const std::string& key, int number);
     void removeKey(const std::string& key);

@@ -172,4 +172,14 @@ TEST(Storage, WithAnOverrideOutOfRangeReportsItAndDoesNotUseIt) {
         << read.err;
 }
 
+// A key's number may be hexadecimal: the driver understands it, and so must the one who clears it.
+TEST(Storage, ClearsAnUnusedOverrideHoweverItsNodeIsWritten) {
+    const std::string file = scratchFile("spelling.db");
+    ASSERT_EQ(0, setOn(file, "5=7").exitCode);
+    execute(file, "UPDATE settings SET key='tempNode0x05'");
+    EXPECT_TRUE(has(readWith(file).err, "tempNode0x05 is not used"));
+    ASSERT_EQ(0, mrtu({"override", "clear", "--storage", file, "node", "5"}).exitCode);
+    EXPECT_EQ("", readWith(file).err);
+}
+
 }  // namespace
