@@ -14,7 +14,10 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     for (const std::uint8_t byte : received.first(std::min<std::size_t>(received.size(), 6)))
         request.put(byte);
     if (request.length() < 6) return 0;
-    if (!_MRTU::checkCommon(request, reply)) _MRTU::checkReadBody(reply, decoded.length - 4);
-    _MRTU::checkWriteBody(request, reply);
+    for (const bool accepted : {false, true}) {
+        reply.accepted = accepted;
+        reply.received = static_cast<int>(received.size());
+        _MRTU::checkReply(request, reply, decoded.length - 4);
+    }
     return 0;
 }

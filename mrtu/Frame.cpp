@@ -47,9 +47,6 @@ std::uint8_t nibble(std::uint8_t character) {
     return low(character > '9' ? character - 0x37u : character - 0x30u);
 }
 
-constexpr std::size_t kMinRtuFrame = 5;
-constexpr std::size_t kMinAsciiFrame = 9;
-
 }  // namespace
 
 void Message::putWord(std::uint16_t word) {
@@ -83,7 +80,7 @@ std::uint8_t calcLrc(ByteView data) {
 }
 
 bool isGoodRtuFrame(ByteView frame) {
-    if (frame.size() < kMinRtuFrame) return false;
+    if (frame.size() < static_cast<std::size_t>(kMinFrame)) return false;
     const ByteView check = frame.last(2);
     const auto received = static_cast<std::uint16_t>((check[0] << 8) | check[1]);
     return calcCRC(frame.data(), static_cast<int>(frame.size()) - 2) == received;
@@ -91,7 +88,8 @@ bool isGoodRtuFrame(ByteView frame) {
 
 AsciiBytes decodeAscii(ByteView characters) {
     AsciiBytes decoded;
-    if (characters.size() < kMinAsciiFrame || characters[0] != ':') return decoded;
+    if (characters.size() < static_cast<std::size_t>(kMinAsciiFrame) || characters[0] != ':')
+        return decoded;
     // Colon, CR and LF aside; an odd character out is left alone.
     const std::size_t count = (characters.size() - 4) / 2 + 1;
     const ByteView digits = characters.subspan(1, 2 * count);
@@ -116,26 +114,4 @@ std::uint16_t calcCRC(const unsigned char* data, int length) {
     if (length < 0) length = 0;
     const std::uint16_t crc = _MRTU::crcRegister({data, static_cast<std::size_t>(length)});
     return static_cast<std::uint16_t>((_MRTU::low(crc) << 8) | _MRTU::high(crc));
-}
-
-const char* getExceptionText(unsigned char code) {
-    struct Row {
-        unsigned char code;
-        const char* text;
-    };
-    // Source of the codes: Modbus Application Protocol V1.1b3, 7.
-    static constexpr Row rows[] = {
-        {1, "Exception: Illegal function"},
-        {2, "Exception: Illegal data address"},
-        {3, "Exception: Illegal data value"},
-        {4, "Exception: Failure in device"},
-        {5, "Exception: server needs more time to finish"},
-        {6, "Exception: server device busy"},
-        {8, "Exception: parity error in target memory"},
-        {10, "Exception: gateway: path to target unavailable"},
-        {11, "Exception: gateway: timeout from target"},
-    };
-    for (const Row& row : rows)
-        if (row.code == code) return row.text;
-    return "Unknown exception";
 }

@@ -8,23 +8,15 @@
 #include <cstdint>
 #include <span>
 
+#include "mrtu/ModbusNumbers.h"
+
 /// The Modbus CRC-16 (initial value 0xFFFF, polynomial 0xA001 reflected) with its two bytes
 /// exchanged, so that it equals (frame[n-2] << 8) | frame[n-1] of a correct frame.
 std::uint16_t calcCRC(const unsigned char* data, int length);
 
-/// @return the text for an exception code, "Unknown exception" for an unknown one.
-const char* getExceptionText(unsigned char code);
-
 namespace _MRTU {
 
 using ByteView = std::span<const std::uint8_t>;
-
-/// Bytes of an RTU frame, node and CRC included. Source: Modbus over Serial Line V1.02, 2.5.1.
-inline constexpr int kMaxFrame = 256;
-/// Bytes of a message without its check: node, function and body.
-inline constexpr int kMaxMessage = kMaxFrame - 2;
-/// Characters of an ASCII frame: colon, two for each byte and for the LRC, CR, LF.
-inline constexpr int kMaxAsciiFrame = 1 + 2 * (kMaxMessage + 1) + 2;
 
 /// A request without its check, built front to back.
 class Message {
@@ -36,6 +28,8 @@ class Message {
 
     ByteView view() const { return {bytes_.data(), static_cast<std::size_t>(length_)}; }
     std::uint8_t operator[](std::size_t index) const { return bytes_[index]; }
+    std::uint8_t node() const { return bytes_[0]; }
+    std::uint8_t function() const { return bytes_[1]; }
     int length() const { return length_; }
 
   private:

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <string>
 
+#include "mrtu/ModbusNumbers.h"
+
 namespace _MRTU {
 
 namespace {
@@ -53,7 +55,7 @@ constexpr std::array<MemoryRow, 12> memoryRows{
               .blockReadCount = 2000,
               .bitRead = true,
               .readOnly = true,
-              .readFunction = 2,
+              .readFunction = kReadInputs,
               .write = WriteChoice::never},
     MemoryRow{.name = "OUTP",
               .naturalType = ICU_Type::boolean,
@@ -64,7 +66,7 @@ constexpr std::array<MemoryRow, 12> memoryRows{
               .bitRead = true,
               .bitWrite = true,
               .bitArrayWrite = true,
-              .readFunction = 1,
+              .readFunction = kReadCoils,
               .write = WriteChoice::coils},
     MemoryRow{.name = "HREG",
               .naturalType = ICU_Type::unsignedShort,
@@ -72,7 +74,7 @@ constexpr std::array<MemoryRow, 12> memoryRows{
               .ranges = decade(400000),
               .blockReadCount = 125,
               .blockWriteCount = 123,
-              .readFunction = 3,
+              .readFunction = kReadRegisters,
               .write = WriteChoice::registers},
     MemoryRow{.name = "IREG",
               .naturalType = ICU_Type::unsignedShort,
@@ -80,7 +82,7 @@ constexpr std::array<MemoryRow, 12> memoryRows{
               .ranges = decade(300000),
               .blockReadCount = 125,
               .readOnly = true,
-              .readFunction = 4,
+              .readFunction = kReadInputRegisters,
               .write = WriteChoice::never},
     MemoryRow{.name = "LONG",
               .naturalType = ICU_Type::unsignedInt,
@@ -89,7 +91,7 @@ constexpr std::array<MemoryRow, 12> memoryRows{
               .blockReadCount = 62,
               .blockWriteCount = 61,
               .enronOnly = true,
-              .readFunction = 3,
+              .readFunction = kReadRegisters,
               .write = WriteChoice::single},
     own("NO", ICU_Type::unsignedByte, kUnsignedByte, 1, 1, DriverArea::nodeOverride),
     own("NP_Mode", ICU_Type::boolean, kBoolean, 1, 0, DriverArea::modiconMode),

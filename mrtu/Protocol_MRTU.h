@@ -87,10 +87,11 @@ class Protocol_MRTU : public ProtgenProtocol {
     bool modiconMode(const Tag_MRTU& tag);
     std::uint16_t lineAddress(const Tag_MRTU& tag, int index);
     std::uint8_t lineNode(const Tag_MRTU& tag) const;
-    _MRTU::Fault exchange(const Tag_MRTU& tag, const _MRTU::Message& request, _MRTU::Reply& reply);
+    _MRTU::Fault beginRequest(const Tag_MRTU& tag, std::uint8_t function, int index,
+                              _MRTU::Message& request);
+    void exchange(const Tag_MRTU& tag, const _MRTU::Message& request, _MRTU::Reply& reply);
     void flushInput();
-    int receiveReply(const _MRTU::NodeParams& node, bool ascii, _MRTU::Reply& reply,
-                     bool& accepted);
+    void receiveReply(const _MRTU::NodeParams& node, bool ascii, _MRTU::Reply& reply);
 
     // Reads and writes of device areas
     _MRTU::Fault readItems(const Tag_MRTU& tag, int index, unsigned char* data, int count);

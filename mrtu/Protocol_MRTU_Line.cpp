@@ -12,46 +12,10 @@ using _MRTU::Reply;
 
 namespace {
 
-constexpr int kMinReply = 5;
-constexpr int kCrcLength = 2;
-constexpr int kLrcLength = 1;
 /// What may follow the first byte of a reply.
 constexpr int kMaxRest = 0x200;
 /// A line that still delivers bytes after this many is babbling, and waiting does not end it.
 constexpr int kMaxFlush = 65536;
-
-/// Lays a frame over the one before; what is longer than the buffer is cut.
-void keep(_MRTU::ByteView frame, Reply& reply) {
-    reply.length = static_cast<int>(frame.size());
-    std::copy_n(frame.begin(), std::min(frame.size(), reply.bytes.size()), reply.bytes.begin());
-}
-
-/// Takes over what was received, good or bad: after the last attempt the bytes are looked at again.
-/// @return whether it is a good frame.
-bool acceptRtu(_MRTU::ByteView received, Reply& reply) {
-    if (received.size() < kMinReply) return false;
-    keep(received, reply);
-    return _MRTU::isGoodRtuFrame(received);
-}
-
-bool acceptAscii(_MRTU::ByteView received, Reply& reply) {
-    const _MRTU::AsciiBytes decoded = _MRTU::decodeAscii(received);
-    if (decoded.length == 0) return false;
-    keep({decoded.bytes.data(), static_cast<std::size_t>(decoded.length)}, reply);
-    return _MRTU::isGoodAsciiFrame(decoded);
-}
-
-/// The check of the last resort, a CRC in both modes.
-bool holdsCrcFrame(const Reply& reply) {
-    const std::size_t held = std::min(static_cast<std::size_t>(reply.length), reply.bytes.size());
-    return _MRTU::isGoodRtuFrame({reply.bytes.data(), held});
-}
-
-Fault lastOutcome(int received, const Reply& reply) {
-    if (received == 0) return _MRTU::kNoResponse;
-    if (received < kMinReply) return _MRTU::kTooShort;
-    return holdsCrcFrame(reply) ? _MRTU::kNoFault : _MRTU::kChecksum;
-}
 
 }  // namespace
 
@@ -79,22 +43,36 @@ std::uint8_t Protocol_MRTU::lineNode(const Tag_MRTU& tag) const {
     return static_cast<std::uint8_t>(node & 0xFFu);
 }
 
-Fault Protocol_MRTU::exchange(const Tag_MRTU& tag, const Message& request, Reply& reply) {
+/// Node, function and start address of a request, unless nobody may be asked now.
+Fault Protocol_MRTU::beginRequest(const Tag_MRTU& tag, std::uint8_t function, int index,
+                                  Message& request) {
+    // A Stop() may have come while this thread waited for the line, and a Start() that has not yet
+    // opened or set up the port.
+    if (!started_) return _MRTU::kNotStarted;
+
+    const std::uint16_t address = lineAddress(tag, index);
+    const std::uint8_t node = lineNode(tag);
+    if (node == _MRTU::kDisabledNode) return _MRTU::kNodeDisabled;
+    if (node == _MRTU::kBroadcastNode && _MRTU::isRead(function)) return _MRTU::kBroadcast;
+
+    request.put(node);
+    request.put(function);
+    request.putWord(address);
+    return _MRTU::kNoFault;
+}
+
+/// Asks until a good frame comes or no attempt is left.
+void Protocol_MRTU::exchange(const Tag_MRTU& tag, const Message& request, Reply& reply) {
     const _MRTU::NodeParams& node = *tag.nodeParams();
     const bool ascii = tag.commonParams()->isAscii();
     const Frame frame = ascii ? _MRTU::frameAscii(request.view()) : _MRTU::frameRtu(request.view());
-    reply.checkLength = ascii ? kLrcLength : kCrcLength;
+    reply.checkLength = ascii ? _MRTU::kLrcLength : _MRTU::kCrcLength;
 
-    int received = 0;
-    bool accepted = false;
-    for (int left = node.repeat; left >= 0 && !accepted; --left) {
+    for (int left = node.repeat; left >= 0 && !reply.accepted; --left) {
         flushInput();
         port_->send(frame.bytes.data(), frame.length);
-        received = receiveReply(node, ascii, reply, accepted);
+        receiveReply(node, ascii, reply);
     }
-    if (!accepted)
-        if (const Fault fault = lastOutcome(received, reply)) return fault;
-    return _MRTU::checkCommon(request, reply);
 }
 
 void Protocol_MRTU::flushInput() {
@@ -103,19 +81,19 @@ void Protocol_MRTU::flushInput() {
     }
 }
 
-/// Waits for one reply. @return the number of bytes or characters received.
-int Protocol_MRTU::receiveReply(const _MRTU::NodeParams& node, bool ascii, Reply& reply,
-                                bool& accepted) {
+/// Waits for one reply.
+void Protocol_MRTU::receiveReply(const _MRTU::NodeParams& node, bool ascii, Reply& reply) {
     std::array<unsigned char, 1 + kMaxRest> raw;
-    if (port_->receiveByte(raw.data(), node.timeout, 0) == 0) return 0;
+    reply.received = 0;
+    if (port_->receiveByte(raw.data(), node.timeout, 0) == 0) return;
 
     int rest = 0;
     const int gapMs = lineSetting(&_MRTU::SerialSettings::gapMs);
     const int ok = port_->receiveFrame(raw.data() + 1, kMaxRest, node.timeout, gapMs, &rest, 0);
     rest = std::clamp(rest, 0, kMaxRest);
-    if (ok != 0) {
-        const _MRTU::ByteView received(raw.data(), static_cast<std::size_t>(1 + rest));
-        accepted = ascii ? acceptAscii(received, reply) : acceptRtu(received, reply);
-    }
-    return 1 + rest;
+    reply.received = 1 + rest;
+    if (ok == 0) return;
+    const _MRTU::ByteView received(raw.data(), static_cast<std::size_t>(reply.received));
+    reply.accepted =
+        ascii ? _MRTU::acceptAscii(received, reply) : _MRTU::acceptRtu(received, reply);
 }

@@ -12,8 +12,6 @@ using _MRTU::Reply;
 
 namespace {
 
-constexpr std::uint8_t kDisabledNode = 0xFF;
-constexpr std::uint8_t kBroadcastNode = 0;
 constexpr std::size_t kDataStart = 1 + 1 + 1;  // node, function, byte count
 
 /// Turns items that came most significant byte first into host (little-endian) order.
@@ -58,30 +56,19 @@ bool Protocol_MRTU::doReadBits(const ProtgenTag* tag, int index, unsigned char* 
 
 /// One read request. `data` is stored only after every check has passed.
 Fault Protocol_MRTU::readItems(const Tag_MRTU& tag, int index, unsigned char* data, int count) {
-    // A Stop() may have come while this thread waited for the line, and a Start() that has not yet
-    // opened or set up the port.
-    if (!started_) return _MRTU::kNotStarted;
-
-    const std::uint16_t address = lineAddress(tag, index);
-    const std::uint8_t node = lineNode(tag);
-    if (node == kDisabledNode) return _MRTU::kNodeDisabled;
-    if (node == kBroadcastNode) return _MRTU::kBroadcast;
-
     Message request;
-    request.put(node);
-    request.put(tag.readFunction());
-    request.putWord(address);
+    if (const Fault fault = beginRequest(tag, tag.readFunction(), index, request)) return fault;
     request.putWord(static_cast<std::uint16_t>(static_cast<unsigned>(count) & 0xFFFFu));
 
     Reply reply;
-    if (const Fault fault = exchange(tag, request, reply)) return fault;
+    exchange(tag, request, reply);
 
     const ICU_Type natural = tag.memoryType()->getNaturalType();
     const bool bits = ProtUtilsN::IsBitType(natural);
     const int itemLength = ProtUtilsN::GetDataLength(natural);
     const long long dataLength =
         bits ? (static_cast<long long>(count) + 7) / 8 : static_cast<long long>(count) * itemLength;
-    if (const Fault fault = _MRTU::checkReadBody(reply, dataLength)) return fault;
+    if (const Fault fault = _MRTU::checkReply(request, reply, dataLength)) return fault;
 
     const std::uint8_t* received = reply.bytes.data() + kDataStart;
     if (bits)

@@ -12,17 +12,6 @@ using _MRTU::Reply;
 
 namespace {
 
-constexpr std::uint8_t kWriteCoil = 5;
-constexpr std::uint8_t kWriteRegister = 6;
-constexpr std::uint8_t kDisabledNode = 0xFF;
-
-constexpr Fault kReadOnly{-3, "Memory type is read only"};
-constexpr Fault kTooMany{-1, "Too many items for one request"};
-
-bool isSingle(std::uint8_t function) {
-    return function == kWriteCoil || function == kWriteRegister;
-}
-
 bool bitOf(const unsigned char* data, int index) {
     return (data[0] >> (static_cast<unsigned>(index) % 8u) & 1u) != 0;
 }
@@ -70,11 +59,11 @@ int Protocol_MRTU::doWrite(const ProtgenTag* tag, int index, const unsigned char
 int Protocol_MRTU::write(const Tag_MRTU& own, int index, const unsigned char* data, int count) {
     if (!started_) return fail(_MRTU::kNotStarted);
     if (own.driverArea() != _MRTU::DriverArea::none) return writeDriverArea(own, data) ? 1 : 0;
-    if (!isSingle(own.writeFunction())) return writeItems(&own, index, data, count);
+    if (!_MRTU::isSingleWrite(own.writeFunction())) return writeItems(&own, index, data, count);
 
     // One request for each item. Coils all look at the same first byte, each at the bit of its own
     // number; registers walk through the data.
-    const int step = own.writeFunction() == kWriteCoil ? 0 : own.memoryItemLength();
+    const int step = own.writeFunction() == _MRTU::kWriteCoil ? 0 : own.memoryItemLength();
     for (int item = 0; item < count; ++item, data += step)
         if (writeItems(&own, index + item, data, 1) == 0) return 0;
     return 1;
@@ -88,7 +77,7 @@ int Protocol_MRTU::doWriteBits(const ProtgenTag* tag, int index, const unsigned 
 /// One transaction: builds, sends and checks one request.
 int Protocol_MRTU::writeItems(const Tag_MRTU* tag, int index, const unsigned char* data,
                               int count) {
-    if (tag->writeFunction() == 0) return fail(kReadOnly);
+    if (tag->writeFunction() == 0) return fail(_MRTU::kReadOnly);
     pauseBefore(*tag);
     const LineLock lock(*this);
     if (const Fault fault = writeRequest(*tag, index, data, count)) return fail(fault);
@@ -97,32 +86,23 @@ int Protocol_MRTU::writeItems(const Tag_MRTU* tag, int index, const unsigned cha
 
 Fault Protocol_MRTU::writeRequest(const Tag_MRTU& tag, int index, const unsigned char* data,
                                   int count) {
-    // A Stop() may have come while this thread waited for the line, and a Start() that has not yet
-    // opened or set up the port.
-    if (!started_) return _MRTU::kNotStarted;
-
-    const std::uint16_t address = lineAddress(tag, index);
-    const std::uint8_t node = lineNode(tag);
-    if (node == kDisabledNode) return _MRTU::kNodeDisabled;
-
     const bool bits = tag.inBitMemory();
     const std::uint8_t function = tag.writeFunction();
     Message request;
-    request.put(node);
-    request.put(function);
-    request.putWord(address);
-    if (!isSingle(function)) putCounts(request, bits, count);
+    if (const Fault fault = beginRequest(tag, function, index, request)) return fault;
+    if (!_MRTU::isSingleWrite(function)) putCounts(request, bits, count);
 
     bool complete = true;
     if (!bits)
         complete = putItems(request, data, count, tag.memoryItemLength());
-    else if (function == kWriteCoil)
+    else if (function == _MRTU::kWriteCoil)
         putCoil(request, bitOf(data, index));
     else
         complete = putBits(request, data, index, count);
-    if (!complete) return kTooMany;
+    if (!complete) return _MRTU::kTooMany;
 
     Reply reply;
-    if (const Fault fault = exchange(tag, request, reply)) return fault;
-    return _MRTU::checkWriteBody(request, reply);
+    exchange(tag, request, reply);
+    constexpr int kNoData = 0;
+    return _MRTU::checkReply(request, reply, kNoData);
 }

@@ -1,9 +1,13 @@
-// What a reply must look like: pure checks, each list read top to bottom, first failure wins.
+// What came for a request, and the list of checks that it has to pass.
 #pragma once
 
+#include <array>
 #include <cstdint>
 
 #include "mrtu/Frame.h"
+
+/// @return the text for an exception code, "Unknown exception" for an unknown one.
+const char* getExceptionText(unsigned char code);
 
 namespace _MRTU {
 
@@ -17,7 +21,9 @@ struct Fault {
 
 inline constexpr Fault kNoFault{};
 inline constexpr Fault kCannotOpen{-1, "Can't open serial port"};
+inline constexpr Fault kTooMany{-1, "Too many items for one request"};
 inline constexpr Fault kNotStarted{-3, "Protocol not started"};
+inline constexpr Fault kReadOnly{-3, "Memory type is read only"};
 inline constexpr Fault kNoResponse{-4, "No response"};
 inline constexpr Fault kTooShort{-6, "The received message too short"};
 inline constexpr Fault kChecksum{-6, "Incorrect response checksum"};
@@ -30,22 +36,29 @@ inline constexpr Fault kAcknowledge{-6, "Incorrect writing data acknowledge"};
 inline constexpr Fault kNodeDisabled{-10, "Node disabled"};
 inline constexpr Fault kBroadcast{-10, "Broadcast request"};
 
-/// An accepted frame. The buffer is zero when an exchange begins, and every frame of the exchange,
-/// good or bad, is laid over the one before: a check of a field that a short frame lacks compares
-/// with zero, or with what a longer frame of an earlier attempt left there.
+/// What the attempts of one exchange brought. The buffer is zero when an exchange begins, and every
+/// frame of the exchange, good or bad, is laid over the one before: a check of a field that a short
+/// frame lacks compares with zero, or with what a longer frame of an earlier attempt left there.
 struct Reply {
     std::array<std::uint8_t, kMaxFrame> bytes{};
-    int length = 0;       ///< Bytes of the frame, check included; may exceed the buffer.
-    int checkLength = 0;  ///< 2 for a CRC, 1 for an LRC.
+    int length = 0;         ///< Bytes of the frame, check included; may exceed the buffer.
+    int checkLength = 0;    ///< 2 for a CRC, 1 for an LRC.
+    int received = 0;       ///< Bytes or characters that the last attempt brought.
+    bool accepted = false;  ///< The last attempt brought a frame whose check is right.
 };
 
-/// Node, exception, function.
-Fault checkCommon(const Message& request, const Reply& reply);
+inline constexpr int kCrcLength = 2;
+inline constexpr int kLrcLength = 1;
 
-/// Length of the frame and byte count, for `dataLength` bytes of data.
-Fault checkReadBody(const Reply& reply, long long dataLength);
+/// Takes over what an attempt received, good or bad: after the last attempt the bytes are looked at
+/// again. Frames too short to be one leave the buffer alone.
+/// @return whether it is a good frame.
+bool acceptRtu(ByteView received, Reply& reply);
+bool acceptAscii(ByteView received, Reply& reply);
 
-/// Start address, and echoed value (functions 5 and 6) or count (15 and 16).
-Fault checkWriteBody(const Message& request, const Reply& reply);
+/// The one list of what a reply must look like, after the last attempt.
+/// @param dataLength  Bytes of data that a read asked for; of no meaning for a write.
+/// @return the first check that fails, or kNoFault.
+Fault checkReply(const Message& request, const Reply& reply, long long dataLength);
 
 }  // namespace _MRTU

@@ -9,6 +9,7 @@
 #include "framework/DataTypes.h"
 #include "framework/Guarded.h"
 #include "framework/TextUtils.h"
+#include "mrtu/ModbusNumbers.h"
 #include "mrtu/Protocol_MRTU.h"
 
 using _MRTU::DriverArea;
@@ -135,13 +136,15 @@ void Tag_MRTU::getCodes() {
             writeFunction_ = 0;
             break;
         case WriteChoice::coils:
-            writeFunction_ = nodeParams_->forceFunction == "15" ? 15 : 5;
+            writeFunction_ =
+                nodeParams_->forceFunction == "15" ? _MRTU::kWriteCoils : _MRTU::kWriteCoil;
             break;
         case WriteChoice::registers:
-            writeFunction_ = nodeParams_->presetFunction == "16" ? 16 : 6;
+            writeFunction_ = nodeParams_->presetFunction == "16" ? _MRTU::kWriteRegisters
+                                                                 : _MRTU::kWriteRegister;
             break;
         case WriteChoice::single:
-            writeFunction_ = 6;
+            writeFunction_ = _MRTU::kWriteRegister;
             break;
     }
 }

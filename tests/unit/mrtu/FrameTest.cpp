@@ -3,8 +3,6 @@
 
 #include <gtest/gtest.h>
 
-#include <map>
-
 #include "tests/support/Replies.h"
 
 namespace {
@@ -108,26 +106,6 @@ TEST(MessageTest, TellsWhatStillFits) {
     message.put(1);
     EXPECT_TRUE(message.fits(253));
     EXPECT_FALSE(message.fits(254));
-}
-
-TEST(ExceptionTextTest, EveryCode) {
-    const std::map<int, std::string> texts = {
-        {1, "Exception: Illegal function"},
-        {2, "Exception: Illegal data address"},
-        {3, "Exception: Illegal data value"},
-        {4, "Exception: Failure in device"},
-        {5, "Exception: server needs more time to finish"},
-        {6, "Exception: server device busy"},
-        {8, "Exception: parity error in target memory"},
-        {10, "Exception: gateway: path to target unavailable"},
-        {11, "Exception: gateway: timeout from target"},
-    };
-    for (int code = 0; code <= 255; ++code) {
-        const auto known = texts.find(code);
-        EXPECT_EQ(known == texts.end() ? "Unknown exception" : known->second,
-                  getExceptionText(static_cast<unsigned char>(code)))
-            << code;
-    }
 }
 
 }  // namespace

@@ -1,11 +1,14 @@
-// The checks of an accepted frame: one test a rule, one for each pair of neighbours.
+// The list of checks of a reply: one test a rule, one for each pair of neighbours.
 #include "mrtu/Reply.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <map>
+#include <string>
 
 #include "tests/support/Bytes.h"
+#include "tests/support/Replies.h"
 
 namespace {
 
@@ -19,14 +22,33 @@ _MRTU::Message message(const std::string& bytes) {
     return result;
 }
 
-/// The frame of a body; two zeroes stand for the check, which nobody looks at any more.
+/// The accepted frame of a body; two zeroes stand for the check, which nobody looks at any more.
 _MRTU::Reply reply(const std::string& bytes, int checkLength = 2) {
     _MRTU::Reply result;
     const Bytes body = hex(bytes);
     std::copy(body.begin(), body.end(), result.bytes.begin());
     result.length = static_cast<int>(body.size()) + checkLength;
     result.checkLength = checkLength;
+    result.received = result.length;
+    result.accepted = true;
     return result;
+}
+
+/// The same after attempts that brought no good frame, `received` bytes in the last of them.
+_MRTU::Reply refused(const std::string& bytes, int received) {
+    _MRTU::Reply result = reply(bytes);
+    result.received = received;
+    result.accepted = false;
+    return result;
+}
+
+/// What is said about a reply to a read of `dataLength` bytes, or to a write.
+_MRTU::Fault checkRead(const _MRTU::Reply& reply, long long dataLength) {
+    return checkReply(message("01 03 00 00 00 01"), reply, dataLength);
+}
+
+_MRTU::Fault checkWrite(const _MRTU::Message& request, const _MRTU::Reply& reply) {
+    return checkReply(request, reply, 0);
 }
 
 void expectFault(int code, const std::string& text, const _MRTU::Fault& fault) {
@@ -41,80 +63,124 @@ const char* const kOffsetText = "Incorrect offset in response";
 const char* const kCountText = "Incorrect count in response";
 const char* const kAcknowledgeText = "Incorrect writing data acknowledge";
 
+TEST(ArrivalCheckTest, NothingReceivedIsNoResponse) {
+    expectFault(-4, "No response", checkRead(_MRTU::Reply(), 2));
+}
+
+TEST(ArrivalCheckTest, LessThanFiveBytesAreTooShort) {
+    for (int received = 1; received < 5; ++received)
+        expectFault(-6, "The received message too short", checkRead(refused("", received), 2));
+}
+
+TEST(ArrivalCheckTest, FiveBytesAreLookedAtForTheirCheckSum) {
+    expectFault(-6, "Incorrect response checksum", checkRead(refused("01 83 02", 5), 2));
+}
+
+TEST(ArrivalCheckTest, RightCheckSumAfterAllLetsTheFramePass) {
+    _MRTU::Reply frame = refused("01 03 02 12 34", 7);
+    const Bytes crc = testing_support::crcOf(hex("01 03 02 12 34"));
+    std::copy(crc.begin(), crc.end(), frame.bytes.begin() + 5);
+    EXPECT_FALSE(checkRead(frame, 2));
+}
+
+TEST(ArrivalCheckTest, OnlyTheLastAttemptDecidesWhatIsMissing) {
+    // A whole frame lies in the buffer from an earlier attempt.
+    expectFault(-4, "No response", checkRead(refused("01 03 02 12 34", 0), 2));
+    expectFault(-6, "The received message too short", checkRead(refused("01 03 02 12 34", 4), 2));
+}
+
+TEST(ArrivalCheckTest, TooShortIsReportedBeforeCheckSum) {
+    expectFault(-6, "The received message too short", checkRead(refused("01 83", 4), 2));
+}
+
+TEST(ArrivalCheckTest, CheckSumIsReportedBeforeNode) {
+    expectFault(-6, "Incorrect response checksum", checkRead(refused("02 03 02 12 34", 7), 2));
+}
+
 TEST(CommonCheckTest, RightNodeAndFunctionPass) {
-    EXPECT_FALSE(checkCommon(message("01 03 00 00 00 01"), reply("01 03 02 00 00")));
+    EXPECT_FALSE(checkRead(reply("01 03 02 00 00"), 2));
 }
 
 TEST(CommonCheckTest, NodeMustMatch) {
-    expectFault(-6, kNodeText, checkCommon(message("01 03 00 00 00 01"), reply("02 03 02 00 00")));
+    expectFault(-6, kNodeText, checkRead(reply("02 03 02 00 00"), 2));
 }
 
 TEST(CommonCheckTest, ExceptionIsReportedWithItsText) {
-    expectFault(-6, "Exception: Illegal data address",
-                checkCommon(message("01 03 00 00 00 01"), reply("01 83 02")));
-    expectFault(-6, "Unknown exception",
-                checkCommon(message("01 03 00 00 00 01"), reply("01 83 07")));
+    expectFault(-6, "Exception: Illegal data address", checkRead(reply("01 83 02"), 2));
+    expectFault(-6, "Unknown exception", checkRead(reply("01 83 07"), 2));
 }
 
 TEST(CommonCheckTest, FunctionMustMatch) {
-    expectFault(-6, kOperationText,
-                checkCommon(message("01 03 00 00 00 01"), reply("01 04 02 00 00")));
+    expectFault(-6, kOperationText, checkRead(reply("01 04 02 00 00"), 2));
 }
 
 TEST(CommonCheckTest, ExceptionOfAnotherFunctionIsAWrongOperation) {
-    expectFault(-6, kOperationText, checkCommon(message("01 03 00 00 00 01"), reply("01 84 02")));
+    expectFault(-6, kOperationText, checkRead(reply("01 84 02"), 2));
 }
 
 TEST(CommonCheckTest, NodeIsReportedBeforeException) {
-    expectFault(-6, kNodeText, checkCommon(message("01 03 00 00 00 01"), reply("02 83 02")));
+    expectFault(-6, kNodeText, checkRead(reply("02 83 02"), 2));
 }
 
 TEST(CommonCheckTest, NodeIsReportedBeforeFunction) {
-    expectFault(-6, kNodeText, checkCommon(message("01 03 00 00 00 01"), reply("02 04 02")));
+    expectFault(-6, kNodeText, checkRead(reply("02 04 02"), 2));
+}
+
+TEST(CommonCheckTest, ExceptionIsReportedBeforeDataLength) {
+    expectFault(-6, "Exception: Illegal function", checkRead(reply("01 83 01"), 2));
+}
+
+TEST(CommonCheckTest, FunctionIsReportedBeforeDataLength) {
+    expectFault(-6, kOperationText, checkRead(reply("01 04 03 12"), 2));
+}
+
+TEST(CommonCheckTest, FunctionIsReportedBeforeOffset) {
+    expectFault(-6, kOperationText,
+                checkWrite(message("01 06 00 10 12 34"), reply("01 05 00 11 12 34")));
 }
 
 TEST(ReadCheckTest, LengthAndByteCountMustMatch) {
-    EXPECT_FALSE(checkReadBody(reply("01 03 02 12 34"), 2));
-    EXPECT_FALSE(checkReadBody(reply("01 03 02 12 34", 1), 2));
-    expectFault(-6, kLengthText, checkReadBody(reply("01 03 02 12 34 56"), 2));
-    expectFault(-6, kLengthText, checkReadBody(reply("01 03 02 12"), 2));
-    expectFault(-6, kLengthText, checkReadBody(reply("01 03 03 12 34"), 2));
-    expectFault(-6, kLengthText, checkReadBody(reply("01 03 00"), 2));
+    EXPECT_FALSE(checkRead(reply("01 03 02 12 34"), 2));
+    EXPECT_FALSE(checkRead(reply("01 03 02 12 34", 1), 2));
+    expectFault(-6, kLengthText, checkRead(reply("01 03 02 12 34 56"), 2));
+    expectFault(-6, kLengthText, checkRead(reply("01 03 02 12"), 2));
+    expectFault(-6, kLengthText, checkRead(reply("01 03 03 12 34"), 2));
+    expectFault(-6, kLengthText, checkRead(reply("01 03 00"), 2));
 }
 
 TEST(ReadCheckTest, CheckOfTheOtherModeMakesTheLengthWrong) {
     _MRTU::Reply frame = reply("01 03 02 12 34", 2);
     frame.checkLength = 1;
-    expectFault(-6, kLengthText, checkReadBody(frame, 2));
+    expectFault(-6, kLengthText, checkRead(frame, 2));
 }
 
 TEST(ReadCheckTest, NoDataAtAllIsALengthToo) {
-    EXPECT_FALSE(checkReadBody(reply("01 03 00"), 0));
-    expectFault(-6, kLengthText, checkReadBody(reply("01 03 01"), 0));
+    EXPECT_FALSE(checkRead(reply("01 03 00"), 0));
+    expectFault(-6, kLengthText, checkRead(reply("01 03 01"), 0));
 }
 
 TEST(ReadCheckTest, ProductAboveTwoHundredFiftyFiveNeverMatches) {
     _MRTU::Reply frame = reply("01 03 00");
     for (const int dataLength : {256, 512, 1024}) {
         frame.length = dataLength + 3 + 2;
-        expectFault(-6, kLengthText, checkReadBody(frame, dataLength));
+        expectFault(-6, kLengthText, checkRead(frame, dataLength));
     }
 }
 
 TEST(WriteCheckTest, MatchingAcknowledgementsPass) {
-    EXPECT_FALSE(checkWriteBody(message("01 06 00 10 12 34"), reply("01 06 00 10 12 34")));
-    EXPECT_FALSE(checkWriteBody(message("01 05 00 10 FF 00"), reply("01 05 00 10 FF 00")));
+    EXPECT_FALSE(checkWrite(message("01 06 00 10 12 34"), reply("01 06 00 10 12 34")));
+    EXPECT_FALSE(checkWrite(message("01 05 00 10 FF 00"), reply("01 05 00 10 FF 00")));
     EXPECT_FALSE(
-        checkWriteBody(message("01 10 00 10 00 02 04 00 01 00 02"), reply("01 10 00 10 00 02")));
-    EXPECT_FALSE(checkWriteBody(message("01 0F 00 10 00 03 01 05"), reply("01 0F 00 10 00 03")));
+        checkWrite(message("01 10 00 10 00 02 04 00 01 00 02"), reply("01 10 00 10 00 02")));
+    EXPECT_FALSE(checkWrite(message("01 0F 00 10 00 03 01 05"), reply("01 0F 00 10 00 03")));
 }
 
 TEST(WriteCheckTest, OffsetMustMatchInBothBytes) {
     for (const char* function : {"05", "06", "0F", "10"}) {
         const std::string head = std::string("01 ") + function;
         const auto request = message(head + " 12 34 FF 00");
-        expectFault(-6, kOffsetText, checkWriteBody(request, reply(head + " 13 34 FF 00")));
-        expectFault(-6, kOffsetText, checkWriteBody(request, reply(head + " 12 35 FF 00")));
+        expectFault(-6, kOffsetText, checkWrite(request, reply(head + " 13 34 FF 00")));
+        expectFault(-6, kOffsetText, checkWrite(request, reply(head + " 12 35 FF 00")));
     }
 }
 
@@ -122,8 +188,8 @@ TEST(WriteCheckTest, SingleWritesEchoTheirValue) {
     for (const char* function : {"05", "06"}) {
         const std::string head = std::string("01 ") + function + " 00 10 ";
         const auto request = message(head + "FF 00");
-        expectFault(-6, kAcknowledgeText, checkWriteBody(request, reply(head + "FE 00")));
-        expectFault(-6, kAcknowledgeText, checkWriteBody(request, reply(head + "FF 01")));
+        expectFault(-6, kAcknowledgeText, checkWrite(request, reply(head + "FE 00")));
+        expectFault(-6, kAcknowledgeText, checkWrite(request, reply(head + "FF 01")));
     }
 }
 
@@ -131,25 +197,24 @@ TEST(WriteCheckTest, BlockWritesTellTheirCount) {
     for (const char* function : {"0F", "10"}) {
         const std::string head = std::string("01 ") + function + " 00 10 ";
         const auto request = message(head + "01 02 04");
-        expectFault(-6, kCountText, checkWriteBody(request, reply(head + "00 02")));
-        expectFault(-6, kCountText, checkWriteBody(request, reply(head + "01 03")));
+        expectFault(-6, kCountText, checkWrite(request, reply(head + "00 02")));
+        expectFault(-6, kCountText, checkWrite(request, reply(head + "01 03")));
     }
 }
 
 TEST(WriteCheckTest, OffsetIsReportedBeforeAcknowledge) {
     expectFault(-6, kOffsetText,
-                checkWriteBody(message("01 06 00 10 12 34"), reply("01 06 00 11 12 35")));
+                checkWrite(message("01 06 00 10 12 34"), reply("01 06 00 11 12 35")));
 }
 
 TEST(WriteCheckTest, OffsetIsReportedBeforeCount) {
     expectFault(-6, kOffsetText,
-                checkWriteBody(message("01 10 00 10 00 01 02 00 00"), reply("01 10 00 11 00 02")));
+                checkWrite(message("01 10 00 10 00 01 02 00 00"), reply("01 10 00 11 00 02")));
 }
 
 TEST(WriteCheckTest, OnlyTwoEchoedBytesAreCompared) {
-    EXPECT_FALSE(checkWriteBody(message("01 06 00 10 11 22 33 44"), reply("01 06 00 10 11 22")));
-    EXPECT_FALSE(
-        checkWriteBody(message("01 06 00 10 11 22 33 44"), reply("01 06 00 10 11 22 00 00")));
+    EXPECT_FALSE(checkWrite(message("01 06 00 10 11 22 33 44"), reply("01 06 00 10 11 22")));
+    EXPECT_FALSE(checkWrite(message("01 06 00 10 11 22 33 44"), reply("01 06 00 10 11 22 00 00")));
 }
 
 TEST(FaultTextTest, CodesAndTexts) {
@@ -161,6 +226,26 @@ TEST(FaultTextTest, CodesAndTexts) {
     expectFault(-10, "Node disabled", _MRTU::kNodeDisabled);
     expectFault(-10, "Broadcast request", _MRTU::kBroadcast);
     EXPECT_EQ(0, _MRTU::kNoFault.code);
+}
+
+TEST(ExceptionTextTest, EveryCode) {
+    const std::map<int, std::string> texts = {
+        {1, "Exception: Illegal function"},
+        {2, "Exception: Illegal data address"},
+        {3, "Exception: Illegal data value"},
+        {4, "Exception: Failure in device"},
+        {5, "Exception: server needs more time to finish"},
+        {6, "Exception: server device busy"},
+        {8, "Exception: parity error in target memory"},
+        {10, "Exception: gateway: path to target unavailable"},
+        {11, "Exception: gateway: timeout from target"},
+    };
+    for (int code = 0; code <= 255; ++code) {
+        const auto known = texts.find(code);
+        EXPECT_EQ(known == texts.end() ? "Unknown exception" : known->second,
+                  getExceptionText(static_cast<unsigned char>(code)))
+            << code;
+    }
 }
 
 }  // namespace
