@@ -1,28 +1,19 @@
 #include "mrtu/MemoryMap.h"
 
 #include <algorithm>
+#include <array>
 #include <string>
 
 #include "mrtu/ModbusNumbers.h"
+#include "mrtu/Models.h"
 
 namespace _MRTU {
 
 namespace {
 
-using Ranges = std::array<MemoryRow::Range, 4>;
-
-constexpr std::array<std::string_view, 4> modelNames{"1", "2", "3", "4"};
-
-// The models "1" and "3" number an area from 1 within its decade, "2" and "4" from 0.
-constexpr Ranges decade(std::int32_t base) {
-    const MemoryRow::Range oneBased{base + 1, base + 65536};
-    const MemoryRow::Range zeroBased{base, base + 65535};
-    return {oneBased, zeroBased, oneBased, zeroBased};
-}
-
-constexpr Ranges everywhere(std::int32_t min, std::int32_t max) {
-    const MemoryRow::Range range{min, max};
-    return {range, range, range, range};
+// 65536 items, the first of them number 1 of its decade.
+constexpr MemoryRow::Range decade(std::int32_t base) {
+    return {base + 1, base + 65536};
 }
 
 constexpr std::uint32_t kUnsignedByte = 0x10;
@@ -37,21 +28,20 @@ constexpr MemoryRow own(std::string_view name, ICU_Type natural, std::uint32_t i
     return {.name = name,
             .naturalType = natural,
             .icomTypes = icomTypes,
-            .ranges = everywhere(0, maxIndex),
+            .range = {0, maxIndex},
             .blockReadCount = blockCount,
             .blockWriteCount = blockCount,
             .area = area};
 }
 
-}  // namespace
-
 // Limits a request: 2000 bits read, 1968 bits written, 125 registers read, 123 registers written;
 // half of that for 32-bit registers. Source: Modbus Application Protocol V1.1b3, 6.1 to 6.12.
-constexpr std::array<MemoryRow, 12> memoryRows{
+constexpr std::array memoryRows{
     MemoryRow{.name = "INP",
               .naturalType = ICU_Type::boolean,
               .icomTypes = kBits,
-              .ranges = decade(100000),
+              .range = decade(100000),
+              .numbered = true,
               .blockReadCount = 2000,
               .bitRead = true,
               .readOnly = true,
@@ -60,7 +50,8 @@ constexpr std::array<MemoryRow, 12> memoryRows{
     MemoryRow{.name = "OUTP",
               .naturalType = ICU_Type::boolean,
               .icomTypes = kBits,
-              .ranges = decade(0),
+              .range = decade(0),
+              .numbered = true,
               .blockReadCount = 2000,
               .blockWriteCount = 1968,
               .bitRead = true,
@@ -71,7 +62,8 @@ constexpr std::array<MemoryRow, 12> memoryRows{
     MemoryRow{.name = "HREG",
               .naturalType = ICU_Type::unsignedShort,
               .icomTypes = kAnyButTimeAndObject,
-              .ranges = decade(400000),
+              .range = decade(400000),
+              .numbered = true,
               .blockReadCount = 125,
               .blockWriteCount = 123,
               .readFunction = kReadRegisters,
@@ -79,7 +71,8 @@ constexpr std::array<MemoryRow, 12> memoryRows{
     MemoryRow{.name = "IREG",
               .naturalType = ICU_Type::unsignedShort,
               .icomTypes = kAnyButTimeAndObject,
-              .ranges = decade(300000),
+              .range = decade(300000),
+              .numbered = true,
               .blockReadCount = 125,
               .readOnly = true,
               .readFunction = kReadInputRegisters,
@@ -87,10 +80,10 @@ constexpr std::array<MemoryRow, 12> memoryRows{
     MemoryRow{.name = "LONG",
               .naturalType = ICU_Type::unsignedInt,
               .icomTypes = kDoubleWords,
-              .ranges = everywhere(0, 65535),
+              .range = {0, 65535},
               .blockReadCount = 62,
               .blockWriteCount = 61,
-              .enronOnly = true,
+              .longRegisters = true,
               .readFunction = kReadRegisters,
               .write = WriteChoice::single},
     own("NO", ICU_Type::unsignedByte, kUnsignedByte, 1, 1, DriverArea::nodeOverride),
@@ -103,15 +96,13 @@ constexpr std::array<MemoryRow, 12> memoryRows{
     own("SP_Done", ICU_Type::boolean, kBoolean, 0, 0, DriverArea::apply),
 };
 
-constexpr std::array<AddressRange, 5> table{
+constexpr std::array addressRanges{
     AddressRange{"INP", 10001, 19999, 100001, 165536},
     AddressRange{"OUTP", 1, 9999, 1, 65536},
     AddressRange{"HREG", 40001, 49999, 400001, 465536},
     AddressRange{"IREG", 30001, 39999, 300001, 365536},
     AddressRange{"LONG", 0, 65535, 0, 65535},
 };
-
-namespace {
 
 constexpr bool rowsAreComplete() {
     return std::all_of(memoryRows.begin(), memoryRows.end(), [](const MemoryRow& row) {
@@ -122,22 +113,41 @@ constexpr bool rowsAreComplete() {
 }
 static_assert(rowsAreComplete());
 
-constexpr bool rangesHaveRows() {
-    return std::all_of(table.begin(), table.end(), [](const AddressRange& range) {
-        return std::any_of(memoryRows.begin(), memoryRows.end(),
-                           [&](const MemoryRow& row) { return row.name == range.name; });
-    });
-}
-static_assert(rangesHaveRows());
-
 template <class Rows>
-auto findRow(const Rows& rows, std::string_view name) {
+constexpr auto findRow(const Rows& rows, std::string_view name) {
     const auto row = std::find_if(rows.begin(), rows.end(),
                                   [name](const auto& each) { return each.name == name; });
     return row != rows.end() ? &*row : nullptr;
 }
 
-MemoryType memoryTypeFor(const MemoryRow& row, const MemoryRow::Range& range) {
+// Without an address range every tag of the area would be refused; a range without its area is
+// dead.
+constexpr bool areasOnTheLineHaveRanges() {
+    return std::all_of(memoryRows.begin(), memoryRows.end(), [](const MemoryRow& row) {
+        const AddressRange* range = findRow(addressRanges, row.name);
+        if (row.area != DriverArea::none) return range == nullptr;
+        return range != nullptr && range->longMin == row.range.min &&
+               range->longMax == row.range.max;
+    });
+}
+static_assert(areasOnTheLineHaveRanges());
+
+constexpr bool rangesHaveAreas() {
+    return std::all_of(addressRanges.begin(), addressRanges.end(), [](const AddressRange& range) {
+        return findRow(memoryRows, range.name) != nullptr;
+    });
+}
+static_assert(rangesHaveAreas());
+
+template <class Rows>
+constexpr bool namesDiffer(const Rows& rows) {
+    return std::all_of(rows.begin(), rows.end(),
+                       [&](const auto& row) { return findRow(rows, row.name) == &row; });
+}
+static_assert(namesDiffer(memoryRows) && namesDiffer(addressRanges) && namesDiffer(models));
+
+MemoryType memoryTypeFor(const MemoryRow& row, const ModelRow& model) {
+    const int shift = row.numbered && model.zeroBased ? 1 : 0;
     MemoryType type;
     type.setName(std::string(row.name));
     type.setNaturalType(row.naturalType);
@@ -148,33 +158,31 @@ MemoryType memoryTypeFor(const MemoryRow& row, const MemoryRow::Range& range) {
     type.setReadOnly(row.readOnly);
     type.setBlockReadCount(row.blockReadCount);
     type.setBlockWriteCount(row.blockWriteCount);
-    type.setMinIndex(range.min);
-    type.setMaxIndex(range.max);
+    type.setMinIndex(row.range.min - shift);
+    type.setMaxIndex(row.range.max - shift);
     return type;
 }
 
-bool isEnron(std::string_view model) {
-    return model == "3" || model == "4";
-}
-
 }  // namespace
+
+constexpr std::span<const AddressRange> table = addressRanges;
 
 const MemoryRow* memoryRow(std::string_view name) {
     return findRow(memoryRows, name);
 }
 
 const AddressRange* addressRange(std::string_view name) {
-    return findRow(table, name);
+    return findRow(addressRanges, name);
 }
 
 void registerModels(MemoryManager& manager) {
-    for (std::size_t index = 0; index < modelNames.size(); ++index) {
-        Model model{std::string(modelNames[index])};
+    for (const ModelRow& row : models) {
+        Model model{std::string(row.name)};
         model.setMaxDatagramItems(0);
         model.setMaxDatagramLength(0);
-        for (const MemoryRow& row : memoryRows)
-            if (!row.enronOnly || isEnron(modelNames[index]))
-                model.addMemoryType(memoryTypeFor(row, row.ranges[index]));
+        for (const MemoryRow& memory : memoryRows)
+            if (row.longRegisters || !memory.longRegisters)
+                model.addMemoryType(memoryTypeFor(memory, row));
         manager.addModel(model);
     }
 }

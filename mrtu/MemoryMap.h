@@ -1,8 +1,8 @@
 // The Modbus memory map: twelve memory types in four models.
 #pragma once
 
-#include <array>
 #include <cstdint>
+#include <span>
 #include <string_view>
 
 #include "framework/MemoryManager.h"
@@ -30,7 +30,7 @@ enum class WriteChoice : std::uint8_t {
     single,     ///< 6, whatever the node says.
 };
 
-/// One memory type; index ranges in the order of the models "1" to "4".
+/// One memory type.
 struct MemoryRow {
     struct Range {
         std::int32_t min;
@@ -39,20 +39,19 @@ struct MemoryRow {
     std::string_view name;
     ICU_Type naturalType = ICU_Type::none;
     std::uint32_t icomTypes = 0;
-    std::array<Range, 4> ranges{};
+    Range range{};          ///< Of indices, in a model that numbers from 1.
+    bool numbered = false;  ///< A model that numbers from 0 has both bounds one lower.
     std::int32_t blockReadCount = 0;
     std::int32_t blockWriteCount = 0;
     bool bitRead = false;
     bool bitWrite = false;
     bool bitArrayWrite = false;
     bool readOnly = false;
-    bool enronOnly = false;         ///< Offered by the models "3" and "4" only.
+    bool longRegisters = false;     ///< Offered by the models that have them.
     std::uint8_t readFunction = 0;  ///< Modbus function code; 0: the tag keeps what it has.
     WriteChoice write = WriteChoice::keep;
     DriverArea area = DriverArea::none;
 };
-
-extern const std::array<MemoryRow, 12> memoryRows;
 
 /// One row of the reference address table: the classic five-digit form and the six-digit form of an
 /// area's addresses, bounds included.
@@ -64,7 +63,7 @@ struct AddressRange {
     std::int32_t longMax;
 };
 
-extern const std::array<AddressRange, 5> table;
+extern const std::span<const AddressRange> table;
 
 /// @return the row of the memory type called `name`, or null.
 const MemoryRow* memoryRow(std::string_view name);

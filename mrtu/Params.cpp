@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <limits>
 
+#include "mrtu/Models.h"
+
 namespace _MRTU {
 
 namespace {
@@ -75,7 +77,8 @@ bool NodeParams::parse(CfgParser& parser, int node, std::string& error) {
                     read.optional("forceFunction", forceFunction, std::string("15")) &&
                     read.optional("model", model, std::string("1"));
     if (!ok) return false;
-    if (model != "1" && model != "3") oneBased = false;
+    const ModelRow* row = modelRow(model);
+    if (row == nullptr || row->zeroBased) oneBased = false;
     return true;
 }
 

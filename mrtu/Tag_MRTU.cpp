@@ -10,6 +10,7 @@
 #include "framework/Guarded.h"
 #include "framework/TextUtils.h"
 #include "mrtu/ModbusNumbers.h"
+#include "mrtu/Models.h"
 #include "mrtu/Protocol_MRTU.h"
 
 using _MRTU::DriverArea;
@@ -26,7 +27,8 @@ constexpr std::array missingField{
 };
 
 bool isZeroBased(const Model& model) {
-    return model.getName() == "2" || model.getName() == "4";
+    const _MRTU::ModelRow* row = _MRTU::modelRow(model.getName());
+    return row != nullptr && row->zeroBased;
 }
 
 }  // namespace
@@ -110,10 +112,10 @@ bool Tag_MRTU::normalizeModbusOffset() {
     // The declared index range of "NO" is 0..1, yet only index 0 can be addressed.
     if (driverArea_ != DriverArea::none) return offset() == 0;
 
+    const _MRTU::MemoryRow* row = _MRTU::memoryRow(memoryType()->nameRef());
     const _MRTU::AddressRange* range = _MRTU::addressRange(memoryType()->nameRef());
-    if (range == nullptr) return false;
-    const bool asWritten = range->name == "LONG";
-    const bool shifted = isZeroBased(*model()) && !asWritten;
+    if (row == nullptr || range == nullptr) return false;
+    const bool shifted = row->numbered && isZeroBased(*model());
     if (shifted && offset() < std::numeric_limits<int>::max()) setOffset(offset() + 1);
 
     if (offset() >= range->shortMin && offset() <= range->shortMax)
