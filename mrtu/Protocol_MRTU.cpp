@@ -4,7 +4,7 @@
 #include <algorithm>
 #include <memory>
 
-#include "description/Description.h"
+#include "description/GetXml.h"
 #include "framework/HostServicePointers.h"
 #include "framework/TextUtils.h"
 #include "mrtu/LineLock.h"
@@ -16,7 +16,7 @@ constexpr _MRTU::Fault kParity{-1, "Parser: parameter 'parity' has invalid value
 constexpr _MRTU::Fault kMode{-1, "Parser: parameter 'mode' has invalid value"};
 
 /// Takes the settings over one by one, up to the first that is refused.
-_MRTU::Fault takeOver(const _MRTU::CommonParams& common, _MRTU::SerialSettings& line) {
+_MRTU::Fault takeOver(const _MRTU::CommonParams& common, _MRTU::LineSettings& line) {
     line.baud = common.baudrate;
     line.dataBits = common.isRtu() ? 8 : common.bits;
     line.stopBits = common.stopbits;
@@ -78,12 +78,12 @@ int Protocol_MRTU::Config(const char* text) {
     });
 }
 
-_MRTU::SerialSettings Protocol_MRTU::lineSettings() const {
+_MRTU::LineSettings Protocol_MRTU::lineSettings() const {
     const std::lock_guard lock(lineMutex_);
     return line_;
 }
 
-int Protocol_MRTU::lineSetting(int _MRTU::SerialSettings::*setting) const {
+int Protocol_MRTU::lineSetting(int _MRTU::LineSettings::*setting) const {
     const std::lock_guard lock(lineMutex_);
     return line_.*setting;
 }
@@ -101,7 +101,7 @@ int Protocol_MRTU::start() {
     if (!configured_) return fail(_MRTU::kCannotOpen);
     // What needs memory comes before the first change, so that a shortage changes nothing.
     const auto stored = nodeOverrides_.stored(GetIdent());
-    const _MRTU::SerialSettings line = lineSettings();
+    const _MRTU::LineSettings line = lineSettings();
     auto opened = overrides_.open(GetIdent(), {{"baud", line.baud},
                                                {"parity", line.parity},
                                                {"stop", line.stopBits},
@@ -127,7 +127,7 @@ void Protocol_MRTU::applySerialOverrides() {
 
 bool Protocol_MRTU::openPort() {
     // No line runs at 0 baud, and a host's port may divide by it.
-    const int baud = lineSetting(&_MRTU::SerialSettings::baud);
+    const int baud = lineSetting(&_MRTU::LineSettings::baud);
     if (baud == 0 || serialFactory_ == nullptr || !lock_) return false;
     port_ = serialFactory_->openPort(params_.getCommonParams()->uart.c_str());
     if (port_ == nullptr) return false;
@@ -137,7 +137,7 @@ bool Protocol_MRTU::openPort() {
 }
 
 bool Protocol_MRTU::configure(ISerialPort& port) const {
-    const _MRTU::SerialSettings line = lineSettings();
+    const _MRTU::LineSettings line = lineSettings();
     return port.configure(line.baud, line.parity, line.dataBits, line.stopBits, line.mode) != 0;
 }
 
@@ -183,7 +183,7 @@ const char* const* Protocol_MRTU::tagUriNames() const {
 }
 
 int Protocol_MRTU::vcsGetComParams(char* text, int size) const {
-    const _MRTU::SerialSettings line = lineSettings();
+    const _MRTU::LineSettings line = lineSettings();
     ProtUtilsN::BoundedWriter report(text, size);
     report << params_.getCommonParams()->uart << "," << line.baud << ","
            << _MRTU::parityWord(line.parity) << "," << line.dataBits << "," << line.stopBits << ","

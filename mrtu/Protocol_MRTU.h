@@ -11,10 +11,10 @@
 #include "framework/AddressReplacer.h"
 #include "framework/MemoryManager.h"
 #include "framework/ParameterReplacer.h"
+#include "mrtu/LineSettings.h"
 #include "mrtu/OwnedLock.h"
 #include "mrtu/Params.h"
 #include "mrtu/Reply.h"
-#include "mrtu/SerialSettings.h"
 #include "platform/IMultiTask2.h"
 #include "platform/ISerialFactory.h"
 
@@ -74,8 +74,8 @@ class Protocol_MRTU : public ProtgenProtocol {
 
     // The line, held between Start() and Stop()
     int start();
-    _MRTU::SerialSettings lineSettings() const;
-    int lineSetting(int _MRTU::SerialSettings::*setting) const;
+    _MRTU::LineSettings lineSettings() const;
+    int lineSetting(int _MRTU::LineSettings::*setting) const;
     void applySerialOverrides();
     // REQUIRE: the caller has the port's turn.
     bool openPort();
@@ -119,7 +119,7 @@ class Protocol_MRTU : public ProtgenProtocol {
     bool configured_ = false;  ///< A text was accepted, if only up to its parity or mode.
     MemoryManager memoryManager_;
     mutable std::mutex lineMutex_;  // guards line_, a leaf but for the replacers' locks
-    _MRTU::SerialSettings line_;
+    _MRTU::LineSettings line_;
     std::mutex portTurn_;
     // Changed by Start() while it is not started, and by Stop(), which holds the transaction lock.
     ISerialPort* port_ = nullptr;

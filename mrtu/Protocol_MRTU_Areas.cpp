@@ -7,7 +7,7 @@
 #include "mrtu/Tag_MRTU.h"
 
 using _MRTU::DriverArea;
-using _MRTU::SerialSettings;
+using _MRTU::LineSettings;
 
 namespace {
 
@@ -42,16 +42,16 @@ void Protocol_MRTU::readDriverArea(const Tag_MRTU& tag, unsigned char* data) {
             data[0] = modiconMode(tag) ? 1 : 0;
             break;
         case DriverArea::baud:
-            storeInt(data, serialValue("baud", lineSetting(&SerialSettings::baud)));
+            storeInt(data, serialValue("baud", lineSetting(&LineSettings::baud)));
             break;
         case DriverArea::parity:
-            data[0] = lowByte(serialValue("parity", lineSetting(&SerialSettings::parity)));
+            data[0] = lowByte(serialValue("parity", lineSetting(&LineSettings::parity)));
             break;
         case DriverArea::stopBits:
-            data[0] = lowByte(serialValue("stop", lineSetting(&SerialSettings::stopBits)));
+            data[0] = lowByte(serialValue("stop", lineSetting(&LineSettings::stopBits)));
             break;
         case DriverArea::lineMode:
-            data[0] = lowByte(serialValue("mode", lineSetting(&SerialSettings::mode)));
+            data[0] = lowByte(serialValue("mode", lineSetting(&LineSettings::mode)));
             break;
         case DriverArea::apply:
             data[0] = 0;

@@ -88,7 +88,7 @@ void Protocol_MRTU::receiveReply(const _MRTU::NodeParams& node, bool ascii, Repl
     if (port_->receiveByte(raw.data(), node.timeout, 0) == 0) return;
 
     int rest = 0;
-    const int gapMs = lineSetting(&_MRTU::SerialSettings::gapMs);
+    const int gapMs = lineSetting(&_MRTU::LineSettings::gapMs);
     const int ok = port_->receiveFrame(raw.data() + 1, kMaxRest, node.timeout, gapMs, &rest, 0);
     rest = std::clamp(rest, 0, kMaxRest);
     reply.received = 1 + rest;

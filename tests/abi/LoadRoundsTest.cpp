@@ -3,7 +3,7 @@
 
 #include <iostream>
 
-#include "tests/abi/Plugin.h"
+#include "tests/abi/LoadedPlugin.h"
 #include "tests/abi/Process.h"
 #include "tests/support/FakeHost.h"
 

@@ -4,7 +4,7 @@
 
 #include <string>
 
-#include "tests/abi/Plugin.h"
+#include "tests/abi/LoadedPlugin.h"
 #include "tests/support/FakeHost.h"
 
 namespace {

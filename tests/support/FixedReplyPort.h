@@ -6,7 +6,7 @@
 #include <cstring>
 
 #include "platform/ISerialFactory.h"
-#include "tests/support/Bytes.h"
+#include "tests/support/ByteTexts.h"
 
 namespace testing_support {
 

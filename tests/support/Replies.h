@@ -4,7 +4,7 @@
 #include <cstdint>
 #include <vector>
 
-#include "tests/support/Bytes.h"
+#include "tests/support/ByteTexts.h"
 
 namespace testing_support {
 

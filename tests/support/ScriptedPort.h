@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "platform/ISerialFactory.h"
-#include "tests/support/Bytes.h"
+#include "tests/support/ByteTexts.h"
 #include "tests/support/FakeMultiTask.h"
 
 namespace testing_support {

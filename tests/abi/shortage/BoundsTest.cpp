@@ -1,8 +1,8 @@
 // What is refused before memory is taken for it.
 #include <gtest/gtest.h>
 
-#include "tests/abi/shortage/Memory.h"
 #include "tests/abi/shortage/Operations.h"
+#include "tests/abi/shortage/ShortMemory.h"
 
 namespace shortage {
 namespace {

@@ -5,7 +5,7 @@
 #include <cstring>
 #include <iterator>
 
-#include "tests/abi/shortage/Memory.h"
+#include "tests/abi/shortage/ShortMemory.h"
 
 namespace shortage {
 

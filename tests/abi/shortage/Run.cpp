@@ -6,7 +6,7 @@
 #include <cstdio>
 #include <exception>
 
-#include "tests/abi/shortage/Memory.h"
+#include "tests/abi/shortage/ShortMemory.h"
 
 namespace shortage {
 

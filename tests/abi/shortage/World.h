@@ -4,7 +4,7 @@
 #include <array>
 #include <string>
 
-#include "tests/abi/Plugin.h"
+#include "tests/abi/LoadedPlugin.h"
 #include "tests/abi/shortage/Host.h"
 
 namespace shortage {

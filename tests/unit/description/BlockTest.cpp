@@ -4,7 +4,7 @@
 #include <cstring>
 #include <string>
 
-#include "description/Description.h"
+#include "description/GetXml.h"
 #include "tests/unit/description/Document.h"
 
 namespace description_test {

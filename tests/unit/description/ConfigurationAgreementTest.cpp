@@ -4,8 +4,8 @@
 #include <functional>
 #include <map>
 
+#include "mrtu/LineSettings.h"
 #include "mrtu/Params.h"
-#include "mrtu/SerialSettings.h"
 #include "tests/unit/description/Document.h"
 
 namespace description_test {

@@ -5,7 +5,7 @@
 #include <charconv>
 #include <cstring>
 
-#include "description/Description.h"
+#include "description/GetXml.h"
 
 namespace description_test {
 namespace {

@@ -4,7 +4,7 @@
 #include <cstring>
 #include <memory>
 
-#include "description/Description.h"
+#include "description/GetXml.h"
 #include "framework/DataTypes.h"
 #include "mrtu/Tag_MRTU.h"
 #include "platform/IProtModule.h"

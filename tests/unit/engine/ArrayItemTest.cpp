@@ -5,7 +5,7 @@
 #include <vector>
 
 #include "framework/DataTypes.h"
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 
 namespace {
 

@@ -6,7 +6,7 @@
 #include <memory>
 
 #include "framework/BitUtils.h"
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 
 namespace {
 

@@ -3,7 +3,7 @@
 
 #include <array>
 
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 
 namespace {
 

@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "tests/support/MemoryShortage.h"
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 
 namespace {
 

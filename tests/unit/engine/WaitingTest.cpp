@@ -8,7 +8,7 @@
 #include <latch>
 #include <thread>
 
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 
 namespace {
 

@@ -1,7 +1,7 @@
 // From the configuration to the settings of the line.
 #include "tests/unit/mrtu/DriverTest.h"
 
-#include "mrtu/SerialSettings.h"
+#include "mrtu/LineSettings.h"
 
 namespace {
 

@@ -7,7 +7,7 @@
 #include <map>
 #include <string>
 
-#include "tests/support/Bytes.h"
+#include "tests/support/ByteTexts.h"
 #include "tests/support/Replies.h"
 
 namespace {

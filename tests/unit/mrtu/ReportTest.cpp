@@ -1,7 +1,7 @@
 // The report of the line's settings and the extensions.
 #include <cstring>
 
-#include "mrtu/SerialSettings.h"
+#include "mrtu/LineSettings.h"
 #include "tests/unit/mrtu/DriverTest.h"
 
 namespace {

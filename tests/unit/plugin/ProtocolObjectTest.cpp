@@ -1,7 +1,7 @@
 // Protocol objects as the factory makes them.
 #include <cstring>
 
-#include "description/Description.h"
+#include "description/GetXml.h"
 #include "plugin/ProtFactory.h"
 #include "tests/unit/mrtu/DriverTest.h"
 

@@ -4,7 +4,7 @@
 #include <array>
 
 #include "tests/support/AllocationCounter.h"
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 
 namespace {
 

@@ -1,4 +1,4 @@
-#include "description/Description.h"
+#include "description/GetXml.h"
 
 #include <algorithm>
 #include <iterator>

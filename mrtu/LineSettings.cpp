@@ -1,4 +1,4 @@
-#include "mrtu/SerialSettings.h"
+#include "mrtu/LineSettings.h"
 
 #include <algorithm>
 #include <array>

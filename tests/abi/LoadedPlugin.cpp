@@ -1,4 +1,4 @@
-#include "tests/abi/Plugin.h"
+#include "tests/abi/LoadedPlugin.h"
 
 #include <dlfcn.h>
 

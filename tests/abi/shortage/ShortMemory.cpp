@@ -1,4 +1,4 @@
-#include "tests/abi/shortage/Memory.h"
+#include "tests/abi/shortage/ShortMemory.h"
 
 #include <algorithm>
 #include <cerrno>

@@ -1,4 +1,4 @@
-#include "tests/support/Bytes.h"
+#include "tests/support/ByteTexts.h"
 
 #include <gtest/gtest.h>
 

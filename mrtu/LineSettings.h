@@ -6,7 +6,7 @@
 namespace _MRTU {
 
 /// What the port is set to.
-struct SerialSettings {
+struct LineSettings {
     int baud = 0;
     int dataBits = 8;
     int stopBits = 1;

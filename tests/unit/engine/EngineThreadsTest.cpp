@@ -5,7 +5,7 @@
 #include <functional>
 #include <thread>
 
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 
 namespace {
 

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 #include "tests/unit/engine/TypeTexts.h"
 
 namespace {

@@ -1,4 +1,4 @@
-#include "tests/unit/engine/FakeDriver.h"
+#include "tests/unit/engine/EngineFakeDriver.h"
 
 #include <gtest/gtest.h>
 
