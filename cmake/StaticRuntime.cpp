@@ -1,5 +1,6 @@
 // Linked into a library that carries the C++ run time inside: what that run time needs to feel at
 // home in a library that is loaded on old panels, and unloaded again.
+#include <cstdlib>
 
 // The flag by which the C++ run time asks the C library whether atomic operations can be spared.
 // The C library has it since 2.32 only. Defined here, out of sight, it keeps that version out of
@@ -8,6 +9,15 @@ extern "C" [[gnu::visibility("hidden")]] char __libc_single_threaded;
 char __libc_single_threaded = 0;
 
 namespace __gnu_cxx {
+
+// The run time's own names the exception on stderr before it ends the process, and brings the
+// demangler along for that: a fifth of the plug-in. No exception leaves these libraries, and a
+// panel has nobody who reads its stderr. Source: libsupc++/vterminate.cc, eh_term_handler.cc.
+[[noreturn, gnu::visibility("hidden")]] void __verbose_terminate_handler();
+void __verbose_terminate_handler() {
+    std::abort();
+}
+
 // Source: libsupc++/eh_alloc.cc, where it serves memory checkers.
 void __freeres();
 }  // namespace __gnu_cxx
