@@ -23,6 +23,13 @@ constexpr std::array modeWords{Word{"RS-232", true}, Word{"RS-485", true}, Word{
 constexpr std::array listedBaudRates{150,  300,   600,   1200,  2400,  4800,
                                      9600, 19200, 38400, 57600, 115200};
 
+constexpr std::array listedStopBits{1, 2};
+
+template <class List>
+bool holds(const List& list, int number) {
+    return std::find(list.begin(), list.end(), number) != list.end();
+}
+
 template <std::size_t Count, class Same>
 int codeOf(const std::array<Word, Count>& words, std::string_view word, Same same) {
     for (std::size_t code = 0; code < Count; ++code)
@@ -31,9 +38,13 @@ int codeOf(const std::array<Word, Count>& words, std::string_view word, Same sam
 }
 
 template <std::size_t Count>
+bool isCode(const std::array<Word, Count>& /*words*/, int code) {
+    return code >= 0 && code < static_cast<int>(Count);
+}
+
+template <std::size_t Count>
 const char* wordOf(const std::array<Word, Count>& words, int code) {
-    const bool known = code >= 0 && code < static_cast<int>(Count);
-    return words[known ? static_cast<std::size_t>(code) : 0].text;
+    return words[isCode(words, code) ? static_cast<std::size_t>(code) : 0].text;
 }
 
 char lowered(char letter) {
@@ -71,7 +82,19 @@ const char* modeWord(int code) {
 }
 
 bool isListedBaudRate(int baud) {
-    return std::find(listedBaudRates.begin(), listedBaudRates.end(), baud) != listedBaudRates.end();
+    return holds(listedBaudRates, baud);
+}
+
+bool isListedParity(int code) {
+    return isCode(parityWords, code);
+}
+
+bool isListedStopBits(int bits) {
+    return holds(listedStopBits, bits);
+}
+
+bool isListedMode(int code) {
+    return isCode(modeWords, code) && modeWords[static_cast<std::size_t>(code)].configurable;
 }
 
 }  // namespace _MRTU

@@ -28,7 +28,11 @@ int modeCode(std::string_view word);
 const char* parityWord(int code);
 const char* modeWord(int code);
 
-/// The baud rates that may be set at run time.
+/// What may be set at run time: the listed baud rates, every parity that has a word, 1 or 2 stop
+/// bits, and the modes that can be configured.
 bool isListedBaudRate(int baud);
+bool isListedParity(int code);
+bool isListedStopBits(int bits);
+bool isListedMode(int code);
 
 }  // namespace _MRTU

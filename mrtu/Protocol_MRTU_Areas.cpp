@@ -11,9 +11,6 @@ using _MRTU::LineSettings;
 
 namespace {
 
-constexpr int kMaxParity = 4;
-constexpr int kMaxLineMode = 2;
-
 std::int32_t loadInt(const unsigned char* data) {
     std::uint32_t value = 0;
     for (unsigned byte = 0; byte < 4; ++byte)
@@ -72,11 +69,11 @@ bool Protocol_MRTU::writeDriverArea(const Tag_MRTU& tag, const unsigned char* da
         case DriverArea::baud:
             return stage("baud", loadInt(data), _MRTU::isListedBaudRate(loadInt(data)));
         case DriverArea::parity:
-            return stage("parity", data[0], data[0] <= kMaxParity);
+            return stage("parity", data[0], _MRTU::isListedParity(data[0]));
         case DriverArea::stopBits:
-            return stage("stop", data[0], data[0] == 1 || data[0] == 2);
+            return stage("stop", data[0], _MRTU::isListedStopBits(data[0]));
         case DriverArea::lineMode:
-            return stage("mode", data[0], data[0] <= kMaxLineMode);
+            return stage("mode", data[0], _MRTU::isListedMode(data[0]));
         case DriverArea::apply:
             applyStaged();
             return true;
