@@ -13,14 +13,15 @@ constexpr const char* kNoUri = "error: missing parameter (URI string)\n";
 using Console = ConsoleTest;
 
 TEST_F(Console, HelpListsTheDocumentedCommands) {
-    EXPECT_EQ(answerTo("help"),
-              "help - displays this message\n"
-              "info - displays information about the protocol version\n"
-              "xml  - displays the protocol xml description\n"
-              "read uri - reads data pointed by uri string\n"
-              "write uri hexData - writes data pointed by uri string\n"
-              "lasterror - displays the last protocol error\n"
-              "getmaxtm - displays the max time for executing a single read/write access\n");
+    EXPECT_EQ(
+        "help - displays this message\n"
+        "info - displays information about the protocol version\n"
+        "xml  - displays the protocol xml description\n"
+        "read uri - reads data pointed by uri string\n"
+        "write uri hexData - writes data pointed by uri string\n"
+        "lasterror - displays the last protocol error\n"
+        "getmaxtm - displays the max time for executing a single read/write access\n",
+        answerTo("help"));
 }
 
 TEST_F(Console, UnknownWordsLeaveTheAnswerUntouched) {
@@ -30,28 +31,29 @@ TEST_F(Console, UnknownWordsLeaveTheAnswerUntouched) {
         expectUnknown(command);
     }
     expectUnknown(nullptr);
-    EXPECT_EQ(protocol_.GetLastError(), 1);
+    EXPECT_EQ(1, protocol_.GetLastError());
 }
 
 TEST_F(Console, TabsAroundAWordDoNotCount) {
-    EXPECT_EQ(answerTo("\thelp\t"), answerTo("help"));
+    EXPECT_EQ(answerTo("help"), answerTo("\thelp\t"));
 }
 
 TEST_F(Console, CommandsWithoutParametersIgnoreFurtherWords) {
     protocol_.SetError(-4, "no response");
     for (const char* command : {"help", "info", "lasterror", "getmaxtm"}) {
         const std::string plain = answerTo(command);
-        EXPECT_EQ(answerTo(std::string(command) + " a b  c"), plain) << command;
-        EXPECT_EQ(answerTo(std::string(command) + " "), plain) << command;
+        EXPECT_EQ(plain, answerTo(std::string(command) + " a b  c")) << command;
+        EXPECT_EQ(plain, answerTo(std::string(command) + " ")) << command;
     }
 }
 
 TEST_F(Console, InfoIsTheProtocolsDescription) {
-    EXPECT_EQ(answerTo("info"),
-              "Protocol: TEST (7) v.12\n"
-              "Implementation: TestProtocol v.34\n"
-              "ProtocolBase v.100\n"
-              "ProtLib v.200\n");
+    EXPECT_EQ(
+        "Protocol: TEST (7) v.12\n"
+        "Implementation: TestProtocol v.34\n"
+        "ProtocolBase v.100\n"
+        "ProtLib v.200\n",
+        answerTo("info"));
 }
 
 TEST_F(Console, XmlEndsAtTheFirstZeroOfTheBlock) {
@@ -63,21 +65,21 @@ TEST_F(Console, XmlEndsAtTheFirstZeroOfTheBlock) {
     };
     Described protocol;
     GuardedText answer(40);
-    EXPECT_EQ(protocol.DoCommand("xml", answer.out(), 40), 1);
-    EXPECT_EQ(answer.content(), std::string("compressedXML=5").append(25, '\0'));
+    EXPECT_EQ(1, protocol.DoCommand("xml", answer.out(), 40));
+    EXPECT_EQ(std::string("compressedXML=5").append(25, '\0'), answer.content());
 }
 
 TEST_F(Console, XmlOfAProtocolWithoutDescriptionIsEmpty) {
     GuardedText answer(40);
-    EXPECT_EQ(protocol_.DoCommand("xml", answer.out(), 40), 1);
-    EXPECT_EQ(answer.content(), std::string(40, '\0'));
+    EXPECT_EQ(1, protocol_.DoCommand("xml", answer.out(), 40));
+    EXPECT_EQ(std::string(40, '\0'), answer.content());
     EXPECT_TRUE(answer.guardsIntact());
 }
 
 TEST_F(Console, LastErrorIsTheTextOfTheLastFailure) {
-    EXPECT_EQ(answerTo("lasterror"), "");
+    EXPECT_EQ("", answerTo("lasterror"));
     protocol_.SetError(-4, "no response");
-    EXPECT_EQ(answerTo("lasterror"), "no response");
+    EXPECT_EQ("no response", answerTo("lasterror"));
 }
 
 TEST_F(Console, MaxTimeIsAskedForNoTagAndSigned) {
@@ -87,7 +89,7 @@ TEST_F(Console, MaxTimeIsAskedForNoTagAndSigned) {
           std::pair{-2147483647 - 1, "maxtm = -2147483648 ms\n"}}) {
         protocol_.maxTm = time;
         protocol_.maxTmAskedForNoTag = false;
-        EXPECT_EQ(answerTo("getmaxtm"), text);
+        EXPECT_EQ(text, answerTo("getmaxtm"));
         EXPECT_TRUE(protocol_.maxTmAskedForNoTag);
     }
 }
@@ -96,32 +98,32 @@ TEST_F(Console, DeleteTagsDestroysTheTagsAndSaysNothing) {
     protocol_.CreateTag("byte");
     protocol_.CreateTag("word");
     GuardedText answer(kSize);
-    EXPECT_EQ(protocol_.DoCommand("deletetags", answer.out(), kSize), 1);
+    EXPECT_EQ(1, protocol_.DoCommand("deletetags", answer.out(), kSize));
     EXPECT_TRUE(answer.untouched());
-    EXPECT_EQ(protocol_.destroyedTags, 2);
+    EXPECT_EQ(2, protocol_.destroyedTags);
 }
 
 TEST_F(Console, ReadNeedsExactlyOneUri) {
     for (const char* command :
          {"read", "read a b", "read byte ", "read  byte", "read byte word dword"}) {
-        EXPECT_EQ(answerTo(command), kNoUri) << '"' << command << '"';
+        EXPECT_EQ(kNoUri, answerTo(command)) << '"' << command << '"';
     }
     EXPECT_TRUE(protocol_.readLengths.empty());
 }
 
 TEST_F(Console, ReadShowsTheBytesInMemoryOrder) {
     protocol_.device = {0xAA, 0x0B, 0xCC, 0xDD};
-    EXPECT_EQ(answerTo("read byte"), "aa\n");
-    EXPECT_EQ(answerTo("read word"), "aa0b\n");
-    EXPECT_EQ(answerTo("read dword"), "aa0bccdd\n");
-    EXPECT_EQ(answerTo("read nothing"), "\n");
+    EXPECT_EQ("aa\n", answerTo("read byte"));
+    EXPECT_EQ("aa0b\n", answerTo("read word"));
+    EXPECT_EQ("aa0bccdd\n", answerTo("read dword"));
+    EXPECT_EQ("\n", answerTo("read nothing"));
 }
 
 TEST_F(Console, ReadShowsTheRunTimeForm) {
     protocol_.device = {0b00001010};
-    EXPECT_EQ(answerTo("read bits"), "010001\n");
+    EXPECT_EQ("010001\n", answerTo("read bits"));
     protocol_.device = {0x34, 0x12};
-    EXPECT_EQ(answerTo("read bcd"), "d204\n");
+    EXPECT_EQ("d204\n", answerTo("read bcd"));
 }
 
 TEST_F(Console, LongValuesAreShownWhole) {
@@ -129,22 +131,22 @@ TEST_F(Console, LongValuesAreShownWhole) {
         protocol_.device.resize(length);
         std::iota(protocol_.device.begin(), protocol_.device.end(), static_cast<unsigned char>(0));
         const std::string answer = answerTo("read b" + std::to_string(length));
-        ASSERT_EQ(answer.size(), 2 * length + 1) << length;
-        EXPECT_EQ(answer.substr(0, 6), "000102");
-        EXPECT_EQ(answer.substr(126, 3), length == 64 ? "3f\n" : "3f4");
+        ASSERT_EQ(2 * length + 1, answer.size()) << length;
+        EXPECT_EQ("000102", answer.substr(0, 6));
+        EXPECT_EQ(length == 64 ? "3f\n" : "3f4", answer.substr(126, 3));
     }
 }
 
 TEST_F(Console, UnknownUriIsAnsweredWithTheDriversText) {
-    EXPECT_EQ(answerTo("read nowhere"), "Tag URI error: no such tag");
-    EXPECT_EQ(answerTo("write nowhere 00"), "Tag URI error: no such tag");
+    EXPECT_EQ("Tag URI error: no such tag", answerTo("read nowhere"));
+    EXPECT_EQ("Tag URI error: no such tag", answerTo("write nowhere 00"));
 }
 
 TEST_F(Console, FailedReadIsAnsweredWithTheLastError) {
     protocol_.readResult = 0;
-    EXPECT_EQ(answerTo("read byte"), "nobody answered the read");
+    EXPECT_EQ("nobody answered the read", answerTo("read byte"));
     protocol_.readResult = 1;
-    EXPECT_EQ(answerTo("read odd"), "read conversion error");
+    EXPECT_EQ("read conversion error", answerTo("read odd"));
 }
 
 TEST_F(Console, ReadOfADerivedProtocolIsTheOneThatIsUsed) {
@@ -158,8 +160,8 @@ TEST_F(Console, ReadOfADerivedProtocolIsTheOneThatIsUsed) {
     OwnRead protocol;
     protocol.knownTags["word"] = {ICU_Type::unsignedShort, ICU_Type::none, 2};
     GuardedText answer(20);
-    EXPECT_EQ(protocol.DoCommand("read word", answer.out(), 20), 1);
-    EXPECT_EQ(answer.text(), std::string("4200\n"));
+    EXPECT_EQ(1, protocol.DoCommand("read word", answer.out(), 20));
+    EXPECT_EQ(std::string("4200\n"), answer.text());
 }
 
 TEST_F(Console, TagsOfTheConsoleAreFreedWhateverTheOutcome) {
@@ -178,19 +180,19 @@ TEST_F(Console, TagsOfTheConsoleAreFreedWhateverTheOutcome) {
         protocol_.writeResult = row.writeResult;
         protocol_.destroyedTags = 0;
         answerTo(row.command);
-        EXPECT_EQ(protocol_.destroyedTags, 1) << row.command;
+        EXPECT_EQ(1, protocol_.destroyedTags) << row.command;
     }
     protocol_.destroyedTags = 0;
     protocol_.DeleteTags();
-    EXPECT_EQ(protocol_.destroyedTags, 0) << "a freed tag was still listed";
+    EXPECT_EQ(0, protocol_.destroyedTags) << "a freed tag was still listed";
 }
 
 TEST_F(Console, TagsOfTheApplicationStay) {
     protocol_.CreateTag("byte");
     answerTo("read byte");
-    EXPECT_EQ(protocol_.destroyedTags, 1);
+    EXPECT_EQ(1, protocol_.destroyedTags);
     protocol_.DeleteTags();
-    EXPECT_EQ(protocol_.destroyedTags, 2);
+    EXPECT_EQ(2, protocol_.destroyedTags);
 }
 
 }  // namespace

@@ -77,28 +77,28 @@ TEST(UnpackBits, MakesOneByteOfEachBit) {
     const Bytes packed = {0x05};
     Bytes bits(3, 0x77);
     ProtUtilsN::UnpackBits(bits.data(), packed.data(), 0, 3);
-    EXPECT_EQ(bits, (Bytes{1, 0, 1}));
+    EXPECT_EQ((Bytes{1, 0, 1}), bits);
 }
 
 TEST(PackBits, CrossesFromTheLastBitOfAByteToTheFirstOfTheNext) {
     const Bytes values = {1, 1};
     Bytes packed = {0x00, 0x00};
     ProtUtilsN::PackBits(packed.data(), values.data(), 7, 2);
-    EXPECT_EQ(packed, (Bytes{0x80, 0x01}));
+    EXPECT_EQ((Bytes{0x80, 0x01}), packed);
 }
 
 TEST(PackBits, TakesAnyValueButZeroForOne) {
     const Bytes values = {2, 0, 0xFF, 0x80};
     Bytes packed = {0xF2};
     ProtUtilsN::PackBits(packed.data(), values.data(), 0, 4);
-    EXPECT_EQ(packed, (Bytes{0xFD}));
+    EXPECT_EQ((Bytes{0xFD}), packed);
 }
 
 TEST(CopyBits, KeepsThePositionWithinTheByte) {
     const Bytes source = {0x00, 0xFF, 0xFF};
     Bytes copy = {0x00, 0x00};
     ProtUtilsN::CopyBits(copy.data(), source.data(), 13, 4);
-    EXPECT_EQ(copy, (Bytes{0xE0, 0x01}));
+    EXPECT_EQ((Bytes{0xE0, 0x01}), copy);
 }
 
 TEST(BitUtils, ACountBelowOneChangesNothing) {
@@ -108,7 +108,7 @@ TEST(BitUtils, ACountBelowOneChangesNothing) {
         ProtUtilsN::UnpackBits(dst.data(), kSource.data(), 5, count);
         ProtUtilsN::PackBits(dst.data(), kSource.data(), 5, count);
         ProtUtilsN::shiftBits(dst.data(), 3, kSource.data(), 5, count);
-        EXPECT_EQ(dst, Bytes(3, 0xA5)) << count;
+        EXPECT_EQ(Bytes(3, 0xA5), dst) << count;
     }
 }
 
@@ -121,7 +121,7 @@ TEST(UnpackBits, AgreesWithTheModelEverywhere) {
             for (int i = 0; i < count; ++i)
                 expected[Index(i) + 1] = source[Index(start + i)];
             ProtUtilsN::UnpackBits(dst.data() + 1, kSource.data(), start, count);
-            ASSERT_EQ(dst, expected) << start << ", " << count;
+            ASSERT_EQ(expected, dst) << start << ", " << count;
         }
     }
 }
@@ -139,7 +139,7 @@ TEST(PackBits, AgreesWithTheModelEverywhere) {
                     expected[Index(8 + start + i)] = values[Index(i)] != 0;
                 }
                 ProtUtilsN::PackBits(dst.data() + 1, values.data(), start, count);
-                ASSERT_EQ(dst, ToBytes(expected)) << start << ", " << count;
+                ASSERT_EQ(ToBytes(expected), dst) << start << ", " << count;
             }
         }
     }
@@ -156,7 +156,7 @@ TEST(CopyBits, AgreesWithTheModelEverywhere) {
                     expected[Index(8 + start % 8 + i)] = source[Index(start + i)];
                 }
                 ProtUtilsN::CopyBits(dst.data() + 1, kSource.data(), start, count);
-                ASSERT_EQ(dst, ToBytes(expected)) << start << ", " << count;
+                ASSERT_EQ(ToBytes(expected), dst) << start << ", " << count;
             }
         }
     }
@@ -174,7 +174,7 @@ TEST(shiftBits, AgreesWithTheModelEverywhere) {
                         expected[Index(8 + to + i)] = source[Index(from + i)];
                     }
                     ProtUtilsN::shiftBits(dst.data() + 1, to, kSource.data(), from, count);
-                    ASSERT_EQ(dst, ToBytes(expected)) << from << " to " << to << ", " << count;
+                    ASSERT_EQ(ToBytes(expected), dst) << from << " to " << to << ", " << count;
                 }
             }
         }
@@ -194,27 +194,27 @@ TEST(BitUtils, StayWithinTheBytesThatTheBitsTouch) {
             ProtUtilsN::PackBits(packed.data(), values.data(), start, count);
             ProtUtilsN::CopyBits(copy.data(), packed.data(), start, count);
             const Bits bits = ToBits(copy);
-            ASSERT_EQ(std::count(bits.begin(), bits.end(), true), count) << start;
+            ASSERT_EQ(count, std::count(bits.begin(), bits.end(), true)) << start;
         }
     }
 }
 
 TEST(TagBits, LocateABitArray) {
     const ValueTag tag("boolean-10", 2, 3);
-    EXPECT_EQ(ProtUtilsN::getStartingBit(&tag), 19);
-    EXPECT_EQ(ProtUtilsN::getEndingBit(&tag), 29);
+    EXPECT_EQ(19, ProtUtilsN::getStartingBit(&tag));
+    EXPECT_EQ(29, ProtUtilsN::getEndingBit(&tag));
 }
 
 TEST(TagBits, LocateASingleBit) {
     const ValueTag tag("boolean", 1, 7);
-    EXPECT_EQ(ProtUtilsN::getStartingBit(&tag), 15);
-    EXPECT_EQ(ProtUtilsN::getEndingBit(&tag), 16);
+    EXPECT_EQ(15, ProtUtilsN::getStartingBit(&tag));
+    EXPECT_EQ(16, ProtUtilsN::getEndingBit(&tag));
 }
 
 TEST(TagBits, IgnoreTheBitIndexOfOtherTypes) {
     const ValueTag tag("int-3", 2, 5);
-    EXPECT_EQ(ProtUtilsN::getStartingBit(&tag), 16);
-    EXPECT_EQ(ProtUtilsN::getEndingBit(&tag), 16 + 12 * 8);
+    EXPECT_EQ(16, ProtUtilsN::getStartingBit(&tag));
+    EXPECT_EQ(16 + 12 * 8, ProtUtilsN::getEndingBit(&tag));
 }
 
 class RegisterTag : public ValueTag {
@@ -225,7 +225,7 @@ class RegisterTag : public ValueTag {
 
 TEST(TagBits, EndBehindTheDeviceFormWhereItIsTheLongerOne) {
     const RegisterTag tag("string-5", 4);
-    EXPECT_EQ(ProtUtilsN::getEndingBit(&tag), 4 * 8 + 6 * 8);
+    EXPECT_EQ(4 * 8 + 6 * 8, ProtUtilsN::getEndingBit(&tag));
 }
 
 }  // namespace

@@ -87,7 +87,7 @@ TEST(CfgItems, LookUpFindsWhatAScanFinds) {
     for (int round = 0; round < 20000; ++round) {
         const std::string body = randomText(random);
         CfgParser parser(("CfgVer=1" + body).c_str());
-        ASSERT_EQ(scannedNodes(body), nodesOf(parser)) << body;
+        ASSERT_EQ(nodesOf(parser), scannedNodes(body)) << body;
         for (const std::string& name : kNames) {
             const Value expected = scanned(body, name);
             ASSERT_EQ(expected, looked(parser, name)) << "'" << name << "' in '" << body << "'";
@@ -103,7 +103,7 @@ TEST(CfgItems, TextWithoutItsMarkerIsLookedUpTheSameWay) {
         const std::string text = randomText(random);
         CfgParser parser(text.c_str());
         for (const std::string& name : kNames)
-            ASSERT_EQ(scanned(text, name), looked(parser, name)) << "'" << name << "' in " << text;
+            ASSERT_EQ(looked(parser, name), scanned(text, name)) << "'" << name << "' in " << text;
     }
 }
 

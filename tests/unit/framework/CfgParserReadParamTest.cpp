@@ -23,14 +23,14 @@ TEST(parseValue, TurnsEveryNbspIntoABlank) {
     for (const auto& [raw, text] : rows) {
         std::string value = "before";
         EXPECT_TRUE(CfgParserN::parseValue(raw, value)) << raw;
-        EXPECT_EQ(value, text) << raw;
+        EXPECT_EQ(text, value) << raw;
     }
 }
 
 TEST(parseValue, MayDecodeInPlace) {
     std::string value = "a&nbsp;b";
     EXPECT_TRUE(CfgParserN::parseValue(value, value));
-    EXPECT_EQ(value, "a b");
+    EXPECT_EQ("a b", value);
 }
 
 TEST(getErrorString, SaysWhatIsWrong) {
@@ -44,8 +44,8 @@ TEST(getErrorString, SaysWhatIsWrong) {
         {6, "Parser: parameter 'uart' has invalid internal specification"},
     };
     for (const auto& [result, text] : rows) {
-        EXPECT_EQ(CfgParserN::getErrorString(static_cast<CfgParser::parseResult>(result), "uart"),
-                  text);
+        EXPECT_EQ(text,
+                  CfgParserN::getErrorString(static_cast<CfgParser::parseResult>(result), "uart"));
     }
 }
 
@@ -72,30 +72,30 @@ TEST(readParam, ReadsIntegersWithAutomaticBase) {
     for (const auto& [body, value] : rows) {
         const Reading reading = ReadInt(body, kNoNode, 0, false);
         EXPECT_TRUE(reading.goOn) << body;
-        EXPECT_EQ(reading.value, value) << body;
-        EXPECT_EQ(reading.error, "") << body;
+        EXPECT_EQ(value, reading.value) << body;
+        EXPECT_EQ("", reading.error) << body;
     }
 }
 
 TEST(readParam, LeavesTheDefaultOfAnOptionalParameter) {
     const Reading reading = ReadInt("repeat=2", kNoNode, 0, true);
     EXPECT_TRUE(reading.goOn);
-    EXPECT_EQ(reading.value, -77);
-    EXPECT_EQ(reading.error, "");
+    EXPECT_EQ(-77, reading.value);
+    EXPECT_EQ("", reading.error);
 }
 
 TEST(readParam, ReportsARequiredParameterThatIsMissing) {
     const Reading reading = ReadInt("repeat=2", kNoNode, 0, false);
     EXPECT_FALSE(reading.goOn);
-    EXPECT_EQ(reading.value, -77);
-    EXPECT_EQ(reading.error, "Parser: parameter 'timeout' is not found");
+    EXPECT_EQ(-77, reading.value);
+    EXPECT_EQ("Parser: parameter 'timeout' is not found", reading.error);
 }
 
 TEST(readParam, GoesOnWithoutANodeParameterWhenNoNodeAsks) {
     const Reading reading = ReadInt("Node1::timeout=5", kNoNode, CfgParser::nodeOnly, false);
     EXPECT_TRUE(reading.goOn);
-    EXPECT_EQ(reading.value, -77);
-    EXPECT_EQ(reading.error, "");
+    EXPECT_EQ(-77, reading.value);
+    EXPECT_EQ("", reading.error);
 }
 
 TEST(readParam, ReportsMisplacedParametersEvenWhenOptional) {
@@ -114,8 +114,8 @@ TEST(readParam, ReportsMisplacedParametersEvenWhenOptional) {
     for (const Row& row : rows) {
         const Reading reading = ReadInt(row.body, row.node, row.flags, true);
         EXPECT_FALSE(reading.goOn) << row.body;
-        EXPECT_EQ(reading.value, -77) << row.body;
-        EXPECT_EQ(reading.error, row.error);
+        EXPECT_EQ(-77, reading.value) << row.body;
+        EXPECT_EQ(row.error, reading.error);
     }
 }
 
@@ -124,12 +124,12 @@ TEST(readParam, DecodesTexts) {
     std::string value = "before";
     std::string error;
     EXPECT_TRUE(readParam<std::string>(parser, "name", kNoNode, value, 0, false, error));
-    EXPECT_EQ(value, "a b");
+    EXPECT_EQ("a b", value);
     EXPECT_TRUE(readParam<std::string>(parser, "name", 2, value, 0, false, error));
-    EXPECT_EQ(value, "c");
+    EXPECT_EQ("c", value);
     EXPECT_FALSE(readParam<std::string>(parser, "other", 2, value, 0, false, error));
-    EXPECT_EQ(value, "c");
-    EXPECT_EQ(error, "Parser: parameter 'other' is not found");
+    EXPECT_EQ("c", value);
+    EXPECT_EQ("Parser: parameter 'other' is not found", error);
 }
 
 }  // namespace

@@ -42,21 +42,21 @@ TEST(CfgParser, NeedsItsMarker) {
         {"CfgVer=12", true},
     };
     for (const Row& row : rows) {
-        EXPECT_EQ(CfgParser(row.text).KnownFormat(), row.known) << row.text;
+        EXPECT_EQ(row.known, CfgParser(row.text).KnownFormat()) << row.text;
     }
 }
 
 TEST(CfgParser, TakesNoTextForAnEmptyOne) {
     CfgParser parser(nullptr);
     EXPECT_FALSE(parser.KnownFormat());
-    EXPECT_EQ(parser.GetParam("a"), nullptr);
+    EXPECT_EQ(nullptr, parser.GetParam("a"));
 }
 
 TEST(CfgParser, KeepsTheWholeTextAndNoNodesWithoutItsMarker) {
     CfgParser parser("timeout=5 Node3::timeout=7");
-    EXPECT_EQ(parser.GetNodeCount(), 0);
-    EXPECT_STREQ(parser.GetParam("timeout"), "5");
-    EXPECT_STREQ(parser.GetParam("Node3::timeout"), "7");
+    EXPECT_EQ(0, parser.GetNodeCount());
+    EXPECT_STREQ("5", parser.GetParam("timeout"));
+    EXPECT_STREQ("7", parser.GetParam("Node3::timeout"));
 }
 
 TEST(CfgParser, IgnoresWhatIsInFrontOfItsMarker) {
@@ -68,9 +68,9 @@ TEST(CfgParser, IgnoresWhatIsInFrontOfItsMarker) {
 TEST(CfgParser, EndsAtTheNextMarkerOfAnyVersion) {
     for (const char* second : {"CfgVer=1", "CfgVer=2", "CfgVer="}) {
         const std::string text = std::string("CfgVer=1 a=1 ") + second + " b=2 Node4::a=3";
-        EXPECT_EQ(ParamOf(text, "a"), "1") << text;
-        EXPECT_EQ(ParamOf(text, "b"), "(none)") << text;
-        EXPECT_EQ(NodesOf(text), std::vector<int>{}) << text;
+        EXPECT_EQ("1", ParamOf(text, "a")) << text;
+        EXPECT_EQ("(none)", ParamOf(text, "b")) << text;
+        EXPECT_EQ(std::vector<int>{}, NodesOf(text)) << text;
     }
 }
 
@@ -95,16 +95,16 @@ TEST(CfgParser, ListsNodesInOrderOfFirstAppearance) {
         {"Node12:", {}},
     };
     for (const auto& [body, nodes] : rows) {
-        EXPECT_EQ(NodesOf("CfgVer=1 " + body), nodes) << body;
+        EXPECT_EQ(nodes, NodesOf("CfgVer=1 " + body)) << body;
     }
 }
 
 TEST(CfgParser, NumbersNodesFromZeroOnly) {
     const CfgParser parser("CfgVer=1 Node3::a=1 Node9::a=1");
-    EXPECT_EQ(parser.GetNodeCount(), 2);
-    EXPECT_EQ(parser.GetNodeID(1), 9);
-    EXPECT_EQ(parser.GetNodeID(2), 0);
-    EXPECT_EQ(parser.GetNodeID(-1), 0);
+    EXPECT_EQ(2, parser.GetNodeCount());
+    EXPECT_EQ(9, parser.GetNodeID(1));
+    EXPECT_EQ(0, parser.GetNodeID(2));
+    EXPECT_EQ(0, parser.GetNodeID(-1));
 }
 
 TEST(GetParam, FindsItemsWhereTheyBegin) {
@@ -145,9 +145,9 @@ TEST(GetParam, FindsItemsWhereTheyBegin) {
 
 TEST(GetParam, KeepsItsValueUntilTheNextCall) {
     CfgParser parser("CfgVer=1 a=first b=second");
-    EXPECT_STREQ(parser.GetParam("a"), "first");
+    EXPECT_STREQ("first", parser.GetParam("a"));
     const char* second = parser.GetParam("b");
-    EXPECT_STREQ(second, "second");
+    EXPECT_STREQ("second", second);
 }
 
 constexpr int kBoth = CfgParser::commonOnly | CfgParser::nodeOnly;
@@ -196,9 +196,9 @@ TEST(getParam, AnswersByPlaceAndFlags) {
     for (const LookupRow& row : kLookups) {
         CfgParser parser((std::string("CfgVer=1 ") + row.body).c_str());
         std::string value = "before";
-        EXPECT_EQ(parser.getParam("uart", row.node, value, row.flags), row.result)
+        EXPECT_EQ(row.result, parser.getParam("uart", row.node, value, row.flags))
             << row.body << " node " << row.node << " flags " << row.flags;
-        EXPECT_EQ(value, row.value) << row.body << " node " << row.node << " flags " << row.flags;
+        EXPECT_EQ(row.value, value) << row.body << " node " << row.node << " flags " << row.flags;
     }
 }
 

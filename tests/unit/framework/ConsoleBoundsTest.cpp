@@ -20,7 +20,7 @@ class ConsoleBounds : public testing::Test {
 
     std::string wholeAnswer(const std::string& command) {
         GuardedText answer(1000);
-        EXPECT_EQ(protocol_.DoCommand(command.c_str(), answer.out(), 1000), 1) << command;
+        EXPECT_EQ(1, protocol_.DoCommand(command.c_str(), answer.out(), 1000)) << command;
         return answer.text();
     }
 
@@ -36,8 +36,8 @@ class ConsoleBounds : public testing::Test {
 
     void tryOne(const std::string& command, int size, const std::string& expected) {
         GuardedText answer(size);
-        EXPECT_EQ(protocol_.DoCommand(command.c_str(), answer.out(), size), 1);
-        EXPECT_EQ(answer.content(), expected) << command << ", size " << size;
+        EXPECT_EQ(1, protocol_.DoCommand(command.c_str(), answer.out(), size));
+        EXPECT_EQ(expected, answer.content()) << command << ", size " << size;
         EXPECT_TRUE(answer.guardsIntact()) << command << ", size " << size;
     }
 
@@ -68,7 +68,7 @@ TEST_F(ConsoleBounds, CopiedAnswersAreCutOrPaddedWithZeroes) {
 TEST_F(ConsoleBounds, FailedReadIsCutOrPaddedToo) {
     protocol_.readResult = 0;
     const std::string whole = wholeAnswer("read dword");
-    ASSERT_EQ(whole, "nobody answered the read");
+    ASSERT_EQ("nobody answered the read", whole);
     tryEverySize("read dword", [&whole](std::size_t size) { return boundedCopy(whole, size); });
 }
 
@@ -82,9 +82,9 @@ TEST_F(ConsoleBounds, XmlIsCutOrPaddedToo) {
     Described protocol;
     for (int size = -1; size <= 17; ++size) {
         GuardedText answer(size);
-        EXPECT_EQ(protocol.DoCommand("xml", answer.out(), size), 1);
+        EXPECT_EQ(1, protocol.DoCommand("xml", answer.out(), size));
         const auto room = static_cast<std::size_t>(std::max(size, 0));
-        EXPECT_EQ(answer.content(), boundedCopy("compressedXML=5", room)) << size;
+        EXPECT_EQ(boundedCopy("compressedXML=5", room), answer.content()) << size;
         EXPECT_TRUE(answer.guardsIntact()) << size;
     }
 }
@@ -136,7 +136,7 @@ TEST_F(ConsoleBounds, NoBufferIsNeededForNoBytes) {
     for (const char* command : {"help", "info", "xml", "lasterror", "getmaxtm", "read dword",
                                 "read", "write dword 01020304", "deletetags"}) {
         for (int size : {0, -1})
-            EXPECT_EQ(protocol_.DoCommand(command, nullptr, size), 1) << command << ' ' << size;
+            EXPECT_EQ(1, protocol_.DoCommand(command, nullptr, size)) << command << ' ' << size;
     }
 }
 

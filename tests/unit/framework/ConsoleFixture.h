@@ -28,14 +28,14 @@ class ConsoleTest : public testing::Test {
     /// The answer to a command that is recognised.
     std::string answerTo(const std::string& command) {
         GuardedText answer(kSize);
-        EXPECT_EQ(protocol_.DoCommand(command.c_str(), answer.out(), kSize), 1) << command;
+        EXPECT_EQ(1, protocol_.DoCommand(command.c_str(), answer.out(), kSize)) << command;
         EXPECT_TRUE(answer.guardsIntact()) << command;
         return answer.text();
     }
 
     void expectUnknown(const char* command) {
         GuardedText answer(kSize);
-        EXPECT_EQ(protocol_.DoCommand(command, answer.out(), kSize), 0);
+        EXPECT_EQ(0, protocol_.DoCommand(command, answer.out(), kSize));
         EXPECT_TRUE(answer.untouched());
     }
 

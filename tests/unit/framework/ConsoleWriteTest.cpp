@@ -18,16 +18,16 @@ constexpr const char* kWrongDigits = "error: incorrect hex data\n";
 TEST_F(ConsoleWrite, WriteNeedsExactlyUriAndData) {
     for (const char* command :
          {"write", "write byte", "write byte 00 00", "write byte  00", "write byte 00 "}) {
-        EXPECT_EQ(answerTo(command), kNoUriOrData) << '"' << command << '"';
+        EXPECT_EQ(kNoUriOrData, answerTo(command)) << '"' << command << '"';
     }
     EXPECT_TRUE(protocol_.written.empty());
 }
 
 TEST_F(ConsoleWrite, WrittenDigitsAreHighNibbleFirstInEitherCase) {
-    EXPECT_EQ(answerTo("write dword 1aB2c3D4"), "written ok\n");
-    EXPECT_EQ(answerTo("write bits 010001"), "written ok\n");
+    EXPECT_EQ("written ok\n", answerTo("write dword 1aB2c3D4"));
+    EXPECT_EQ("written ok\n", answerTo("write bits 010001"));
     const std::vector<Bytes> expected{{0x1A, 0xB2, 0xC3, 0xD4}, {1, 0, 1}};
-    EXPECT_EQ(protocol_.written, expected);
+    EXPECT_EQ(expected, protocol_.written);
 }
 
 TEST_F(ConsoleWrite, LongValuesAreWrittenWhole) {
@@ -35,48 +35,48 @@ TEST_F(ConsoleWrite, LongValuesAreWrittenWhole) {
         std::string digits;
         for (std::size_t i = 0; i < length; ++i)
             digits += i + 1 == length ? "7f" : "a5";
-        EXPECT_EQ(answerTo("write b" + std::to_string(length) + " " + digits), "written ok\n");
+        EXPECT_EQ("written ok\n", answerTo("write b" + std::to_string(length) + " " + digits));
         Bytes expected(length, 0xA5);
         expected.back() = 0x7F;
         ASSERT_FALSE(protocol_.written.empty());
-        EXPECT_EQ(protocol_.written.back(), expected);
+        EXPECT_EQ(expected, protocol_.written.back());
     }
 }
 
 TEST_F(ConsoleWrite, WrongNumberOfDigitsIsRefused) {
     for (const char* data : {"001", "0", "00", "00000", "000000", "0x00f"}) {
-        EXPECT_EQ(answerTo(std::string("write word ") + data), kWrongLength) << data;
+        EXPECT_EQ(kWrongLength, answerTo(std::string("write word ") + data)) << data;
     }
-    EXPECT_EQ(answerTo("write nothing 00"), kWrongLength);
+    EXPECT_EQ(kWrongLength, answerTo("write nothing 00"));
     EXPECT_TRUE(protocol_.written.empty());
 }
 
 TEST_F(ConsoleWrite, WrongLengthIsReportedBeforeWrongDigits) {
-    EXPECT_EQ(answerTo("write word 0g0"), kWrongLength);
+    EXPECT_EQ(kWrongLength, answerTo("write word 0g0"));
 }
 
 TEST_F(ConsoleWrite, EmptyValueTakesEmptyData) {
-    EXPECT_EQ(answerTo("write nothing "), "written ok\n");
-    EXPECT_EQ(protocol_.written, std::vector<Bytes>{Bytes{}});
+    EXPECT_EQ("written ok\n", answerTo("write nothing "));
+    EXPECT_EQ(std::vector<Bytes>{Bytes{}}, protocol_.written);
 }
 
 TEST_F(ConsoleWrite, OnlyHexadecimalDigitsAreTaken) {
-    EXPECT_EQ(answerTo("write byte 0g"), kWrongDigits);
+    EXPECT_EQ(kWrongDigits, answerTo("write byte 0g"));
     const std::string digits = "0123456789ABCDEFabcdef";
     for (int code = 1; code < 256; ++code) {
         const char c = static_cast<char>(code);
         if (c == ' ' || c == '\t') continue;  // these end a word or are trimmed off it
         const bool isDigit = digits.find(c) != std::string::npos;
         const char* expected = isDigit ? "written ok\n" : kWrongDigits;
-        EXPECT_EQ(answerTo(std::string("write byte 0") + c), expected) << code;
-        EXPECT_EQ(answerTo(std::string("write byte ") + c + "0"), expected) << code;
+        EXPECT_EQ(expected, answerTo(std::string("write byte 0") + c)) << code;
+        EXPECT_EQ(expected, answerTo(std::string("write byte ") + c + "0")) << code;
     }
-    EXPECT_EQ(protocol_.written.size(), 2 * digits.size());
+    EXPECT_EQ(2 * digits.size(), protocol_.written.size());
 }
 
 TEST_F(ConsoleWrite, FailedWriteIsAnsweredWithTheLastError) {
     protocol_.writeResult = 0;
-    EXPECT_EQ(answerTo("write byte 00"), "nobody answered the write");
+    EXPECT_EQ("nobody answered the write", answerTo("write byte 00"));
 }
 
 }  // namespace

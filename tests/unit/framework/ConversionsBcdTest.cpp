@@ -38,21 +38,21 @@ TEST(Bcd, TurnsDigitsIntoNumbersAndBack) {
     for (const BcdRow& row : kBcd) {
         const Bytes digits = LittleEndian(row.digits, row.size);
         const Bytes value = LittleEndian(row.value, row.size);
-        EXPECT_EQ(Converted(digits, "bcd", Items(row.size), kRead), value) << row.digits;
-        EXPECT_EQ(Converted(value, "bcd", Items(row.size), kWrite), digits) << row.value;
+        EXPECT_EQ(value, Converted(digits, "bcd", Items(row.size), kRead)) << row.digits;
+        EXPECT_EQ(digits, Converted(value, "bcd", Items(row.size), kWrite)) << row.value;
     }
 }
 
 TEST(Bcd, ReadsLowByteFirst) {
-    EXPECT_EQ(Converted({0x34, 0x12}, "bcd", Shape(ICU_Type::short_), kRead), (Bytes{0xD2, 0x04}));
+    EXPECT_EQ((Bytes{0xD2, 0x04}), Converted({0x34, 0x12}, "bcd", Shape(ICU_Type::short_), kRead));
 }
 
 TEST(Bcd, ReadsEightBytesAndTheTenOfATime) {
-    EXPECT_EQ(Converted(LittleEndian(0x9876543210123456U, 8), "bcd", Items(8), kRead),
-              LittleEndian(9876543210123456U, 8));
+    EXPECT_EQ(LittleEndian(9876543210123456U, 8),
+              Converted(LittleEndian(0x9876543210123456U, 8), "bcd", Items(8), kRead));
     // 99999999999999999999 = 0x56BC75E2D630FFFFF has 67 bits
-    EXPECT_EQ(Converted(Bytes(10, 0x99), "bcd", Shape(ICU_Type::time), kRead),
-              (Bytes{0xFF, 0xFF, 0x0F, 0x63, 0x2D, 0x5E, 0xC7, 0x6B, 0x05, 0x00}));
+    EXPECT_EQ((Bytes{0xFF, 0xFF, 0x0F, 0x63, 0x2D, 0x5E, 0xC7, 0x6B, 0x05, 0x00}),
+              Converted(Bytes(10, 0x99), "bcd", Shape(ICU_Type::time), kRead));
 }
 
 TEST(Bcd, RefusesEveryNibbleAboveNine) {
@@ -61,7 +61,7 @@ TEST(Bcd, RefusesEveryNibbleAboveNine) {
         for (std::size_t place = 0; place < 4; ++place) {
             Bytes bytes(4, 0x11);
             bytes[place] = static_cast<unsigned char>(byte);
-            EXPECT_EQ(!Converted(bytes, "bcd", Items(4), kRead).empty(), digits) << byte;
+            EXPECT_EQ(digits, !Converted(bytes, "bcd", Items(4), kRead).empty()) << byte;
         }
     }
 }
@@ -72,36 +72,36 @@ TEST(Bcd, RefusesValuesOfMoreDigits) {
         {3, 1000000}, {3, 0xFFFFFF}, {4, 100000000}, {4, 0xFFFFFFFF},
     };
     for (const auto& [size, value] : rows) {
-        EXPECT_EQ(Converted(LittleEndian(value, size), "bcd", Items(size), kWrite), Bytes{})
+        EXPECT_EQ(Bytes{}, Converted(LittleEndian(value, size), "bcd", Items(size), kWrite))
             << value;
     }
 }
 
 TEST(Bcd, WritesItemsOfFourBytesAtMost) {
     for (int size = 1; size <= 10; ++size) {
-        EXPECT_EQ(Refuses("bcd", Items(size), kWrite), size > 4) << size;
+        EXPECT_EQ(size > 4, Refuses("bcd", Items(size), kWrite)) << size;
         EXPECT_FALSE(Refuses("bcd", Items(size), kRead)) << size;
     }
 }
 
 TEST(Bcd, ConvertsEveryItem) {
-    EXPECT_EQ(Converted({0x34, 0x12, 0x78, 0x56}, "bcd", Items(2, 2), kRead),
-              (Bytes{0xD2, 0x04, 0x2E, 0x16}));
-    EXPECT_EQ(Converted({0xD2, 0x04, 0x2E, 0x16}, "bcd", Items(2, 2), kWrite),
-              (Bytes{0x34, 0x12, 0x78, 0x56}));
-    EXPECT_EQ(Converted({0x34, 0x12, 0x7A, 0x56}, "bcd", Items(2, 2), kRead), Bytes{});
+    EXPECT_EQ((Bytes{0xD2, 0x04, 0x2E, 0x16}),
+              Converted({0x34, 0x12, 0x78, 0x56}, "bcd", Items(2, 2), kRead));
+    EXPECT_EQ((Bytes{0x34, 0x12, 0x78, 0x56}),
+              Converted({0xD2, 0x04, 0x2E, 0x16}, "bcd", Items(2, 2), kWrite));
+    EXPECT_EQ(Bytes{}, Converted({0x34, 0x12, 0x7A, 0x56}, "bcd", Items(2, 2), kRead));
 }
 
 TEST(Bcd, LeavesAnItemWithoutLengthAlone) {
-    EXPECT_EQ(Converted({0xFF, 0xFF}, "bcd", {2, 0, 1, ICU_Type::object}, kRead),
-              (Bytes{0xFF, 0xFF}));
+    EXPECT_EQ((Bytes{0xFF, 0xFF}),
+              Converted({0xFF, 0xFF}, "bcd", {2, 0, 1, ICU_Type::object}, kRead));
 }
 
 TEST(Bcd, RoundTripsEveryTwoByteNumber) {
     for (unsigned value = 0; value <= 9999; ++value) {
         const Bytes written = Converted(LittleEndian(value, 2), "bcd", Items(2), kWrite);
-        ASSERT_EQ(written.size(), 2U) << value;
-        ASSERT_EQ(Converted(written, "bcd", Items(2), kRead), LittleEndian(value, 2)) << value;
+        ASSERT_EQ(2U, written.size()) << value;
+        ASSERT_EQ(LittleEndian(value, 2), Converted(written, "bcd", Items(2), kRead)) << value;
     }
 }
 

@@ -37,23 +37,23 @@ TEST(Neg, ComplementsIntegers) {
         const Bytes from = LittleEndian(static_cast<std::uint64_t>(row.from), size);
         const Bytes to = LittleEndian(static_cast<std::uint64_t>(row.to), size);
         for (const bool toDevice : {kRead, kWrite}) {
-            EXPECT_EQ(Converted(from, "neg", Shape(row.type), toDevice), to) << row.from;
-            EXPECT_EQ(Converted(to, "neg", Shape(row.type), toDevice), from) << row.from;
+            EXPECT_EQ(to, Converted(from, "neg", Shape(row.type), toDevice)) << row.from;
+            EXPECT_EQ(from, Converted(to, "neg", Shape(row.type), toDevice)) << row.from;
         }
     }
 }
 
 TEST(Neg, FlipsTheSignOfFloatsAndDoubles) {
     for (const float value : {1.5F, 0.0F, -3.25e30F, std::numeric_limits<float>::infinity()}) {
-        EXPECT_EQ(Converted(LittleEndian(std::bit_cast<std::uint32_t>(value), 4), "neg",
-                            Shape(ICU_Type::float_), kRead),
-                  LittleEndian(std::bit_cast<std::uint32_t>(-value), 4))
+        EXPECT_EQ(LittleEndian(std::bit_cast<std::uint32_t>(-value), 4),
+                  Converted(LittleEndian(std::bit_cast<std::uint32_t>(value), 4), "neg",
+                            Shape(ICU_Type::float_), kRead))
             << value;
     }
     for (const double value : {1.5, 0.0, -3.25e300, std::numeric_limits<double>::denorm_min()}) {
-        EXPECT_EQ(Converted(LittleEndian(std::bit_cast<std::uint64_t>(value), 8), "neg",
-                            Shape(ICU_Type::double_), kWrite),
-                  LittleEndian(std::bit_cast<std::uint64_t>(-value), 8))
+        EXPECT_EQ(LittleEndian(std::bit_cast<std::uint64_t>(-value), 8),
+                  Converted(LittleEndian(std::bit_cast<std::uint64_t>(value), 8), "neg",
+                            Shape(ICU_Type::double_), kWrite))
             << value;
     }
 }
@@ -71,7 +71,7 @@ int NegatedItems(ICU_Type type, int items) {
     int negated = 0;
     for (auto item = array.begin(); item != array.end(); item += size) {
         if (std::equal(minusOne.begin(), minusOne.end(), item)) {
-            EXPECT_EQ(item - array.begin(), negated * size) << "not at the front";
+            EXPECT_EQ(negated * size, item - array.begin()) << "not at the front";
             ++negated;
         } else {
             EXPECT_TRUE(std::equal(one.begin(), one.end(), item));
@@ -102,12 +102,12 @@ TEST(Neg, ReachesTheFrontPartOfArraysOfWiderItems) {
 TEST(Neg, ReachesTheFrontPartOfFloatAndDoubleArrays) {
     Bytes floats(std::size_t{10} * 4, 0);
     floats = Converted(floats, "neg", Shape(ICU_Type::float_, 10), kRead);
-    EXPECT_EQ(std::count(floats.begin(), floats.end(), 0x80), 3);
+    EXPECT_EQ(3, std::count(floats.begin(), floats.end(), 0x80));
     Bytes doubles(std::size_t{10} * 8, 0);
     doubles = Converted(doubles, "neg", Shape(ICU_Type::double_, 10), kRead);
-    EXPECT_EQ(std::count(doubles.begin(), doubles.end(), 0x80), 2);
-    EXPECT_EQ(doubles[7], 0x80);
-    EXPECT_EQ(doubles[15], 0x80);
+    EXPECT_EQ(2, std::count(doubles.begin(), doubles.end(), 0x80));
+    EXPECT_EQ(0x80, doubles[7]);
+    EXPECT_EQ(0x80, doubles[15]);
 }
 
 TEST(Neg, IsForSignedTypesOnly) {
@@ -115,13 +115,13 @@ TEST(Neg, IsForSignedTypesOnly) {
     for (int code = 0; code <= 28; ++code) {
         const ConversionShape shape{16, 1, 1, static_cast<ICU_Type>(code)};
         const bool known = std::find(allowed.begin(), allowed.end(), code) != allowed.end();
-        EXPECT_EQ(Refuses("neg", shape, kRead), !known) << code;
+        EXPECT_EQ(!known, Refuses("neg", shape, kRead)) << code;
     }
 }
 
 TEST(Neg, StaysWithinTheValue) {
-    EXPECT_EQ(Converted({1, 2, 3, 4}, "neg", {3, 4, 1, ICU_Type::int_}, kRead),
-              (Bytes{1, 2, 3, 4}));
+    EXPECT_EQ((Bytes{1, 2, 3, 4}),
+              Converted({1, 2, 3, 4}, "neg", {3, 4, 1, ICU_Type::int_}, kRead));
 }
 
 }  // namespace

@@ -37,8 +37,8 @@ TEST(Swaps, ReorderBytesInTheirGroups) {
     for (const Row& row : rows) {
         const ConversionShape shape = Raw(static_cast<int>(row.from.size()));
         for (const bool toDevice : {kRead, kWrite}) {
-            EXPECT_EQ(Converted(row.from, row.name, shape, toDevice), row.to) << row.name;
-            EXPECT_EQ(Converted(row.to, row.name, shape, toDevice), row.from) << row.name;
+            EXPECT_EQ(row.to, Converted(row.from, row.name, shape, toDevice)) << row.name;
+            EXPECT_EQ(row.from, Converted(row.to, row.name, shape, toDevice)) << row.name;
         }
     }
 }
@@ -48,7 +48,7 @@ TEST(Swaps, RefuseLengthsThatAreNoMultiple) {
         {"swapnibble", 1}, {"swap2", 2}, {"swap4", 4}, {"swap8", 8}};
     for (const auto& [name, group] : groups) {
         for (int length = 1; length <= 24; ++length) {
-            EXPECT_EQ(Refuses(name, Raw(length), kRead), length % group != 0)
+            EXPECT_EQ(length % group != 0, Refuses(name, Raw(length), kRead))
                 << name << ' ' << length;
         }
     }
@@ -57,9 +57,9 @@ TEST(Swaps, RefuseLengthsThatAreNoMultiple) {
 TEST(Conversions, WithoutALengthChangeNothing) {
     for (const char* name : {"swapnibble", "swap2", "swap4", "swap8", "inv", "bcd"}) {
         for (const int length : {0, -1, -3, std::numeric_limits<int>::min()}) {
-            EXPECT_EQ(Converted({0x12}, name, Raw(length), kRead), Bytes{0x12})
+            EXPECT_EQ(Bytes{0x12}, Converted({0x12}, name, Raw(length), kRead))
                 << name << ' ' << length;
-            EXPECT_EQ(Converted({0x12}, name, Raw(length), kWrite), Bytes{0x12})
+            EXPECT_EQ(Bytes{0x12}, Converted({0x12}, name, Raw(length), kWrite))
                 << name << ' ' << length;
         }
     }
@@ -67,8 +67,8 @@ TEST(Conversions, WithoutALengthChangeNothing) {
 
 TEST(Inv, TogglesBits) {
     for (const ICU_Type type : {ICU_Type::boolean, ICU_Type::booleanArray}) {
-        EXPECT_EQ(Converted({1, 0, 1, 7}, "inv", {4, 1, 4, type}, kRead), (Bytes{0, 1, 0, 0}));
-        EXPECT_EQ(Converted({1, 0, 1}, "inv", {3, 1, 3, type}, kWrite), (Bytes{0, 1, 0}));
+        EXPECT_EQ((Bytes{0, 1, 0, 0}), Converted({1, 0, 1, 7}, "inv", {4, 1, 4, type}, kRead));
+        EXPECT_EQ((Bytes{0, 1, 0}), Converted({1, 0, 1}, "inv", {3, 1, 3, type}, kWrite));
     }
 }
 
@@ -78,8 +78,8 @@ TEST(Inv, ComplementsUnsignedTypes) {
         if (code == 1 || code == 13) continue;
         const ConversionShape shape{3, 1, 3, static_cast<ICU_Type>(code)};
         const bool known = std::find(bitwise.begin(), bitwise.end(), code) != bitwise.end();
-        EXPECT_EQ(Converted({0x00, 0xFF, 0x5A}, "inv", shape, kRead),
-                  known ? Bytes({0xFF, 0x00, 0xA5}) : Bytes{})
+        EXPECT_EQ(known ? Bytes({0xFF, 0x00, 0xA5}) : Bytes{},
+                  Converted({0x00, 0xFF, 0x5A}, "inv", shape, kRead))
             << code;
     }
 }

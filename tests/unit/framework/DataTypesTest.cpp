@@ -88,7 +88,7 @@ Parsed Refused(Names conversions = {}) {
 }
 
 TEST(DataTypeTable, HasTheTwentySevenRows) {
-    ASSERT_EQ(ProtUtilsN::DataTypes.size(), std::size(kKnown));
+    ASSERT_EQ(std::size(kKnown), ProtUtilsN::DataTypes.size());
     for (std::size_t i = 0; i < std::size(kKnown); ++i) {
         const ProtUtilsN::DataType& row = ProtUtilsN::DataTypes[i];
         EXPECT_EQ(row.typeString, kKnown[i].text) << i;
@@ -104,7 +104,7 @@ TEST(GetICOMType, ReadsEveryRow) {
         const std::string text = row.text;
         const bool array = text.back() == '-';
         const int length = array ? 3 * ProtUtilsN::GetDataLength(Code(row.element)) : row.length;
-        EXPECT_EQ(Parse(array ? text + "3" : text), Accepted(row.code, row.element, length))
+        EXPECT_EQ(Accepted(row.code, row.element, length), Parse(array ? text + "3" : text))
             << text;
     }
 }
@@ -137,7 +137,7 @@ TEST(GetICOMType, TakesTextsApart) {
         {"int-3)(swap2", Accepted(16, 4, 12, {""})},
     };
     for (const auto& [text, expected] : rows) {
-        EXPECT_EQ(Parse(text), expected) << '"' << text << '"';
+        EXPECT_EQ(expected, Parse(text)) << '"' << text << '"';
     }
 }
 
@@ -159,7 +159,7 @@ TEST(GetICOMType, RefusesWhatIsNoType) {
         {"wrong(swap2,bcd)", Refused({"swap2", "bcd"})},
     };
     for (const auto& [text, expected] : rows) {
-        EXPECT_EQ(Parse(text), expected) << '"' << text << '"';
+        EXPECT_EQ(expected, Parse(text)) << '"' << text << '"';
     }
 }
 
@@ -175,7 +175,7 @@ TEST(GetICOMType, AppendsToTheConversions) {
     int length = 0;
     Names conversions = {"first"};
     EXPECT_TRUE(ProtUtilsN::GetICOMType("int(neg)", type, element, length, conversions));
-    EXPECT_EQ(conversions, (Names{"first", "neg"}));
+    EXPECT_EQ((Names{"first", "neg"}), conversions);
 }
 
 TEST(GetICOMType, KeepsLengthsToThirtyTwoBits) {
@@ -188,7 +188,7 @@ TEST(GetICOMType, KeepsLengthsToThirtyTwoBits) {
     for (const auto& [text, length] : rows) {
         const Parsed parsed = Parse(text);
         EXPECT_TRUE(parsed.ok) << text;
-        EXPECT_EQ(parsed.length, length) << text;
+        EXPECT_EQ(length, parsed.length) << text;
     }
 }
 
@@ -215,7 +215,7 @@ TEST(GetICOMName, IsReadBackAsTheSameType) {
         const int itemLength = ProtUtilsN::GetDataLength(Code(row.element));
         const int length = row.length != 0 ? row.length : 5 * itemLength;
         const std::string name = ProtUtilsN::GetICOMName(Code(row.code), length);
-        EXPECT_EQ(Parse(name), Accepted(row.code, row.element, length)) << name;
+        EXPECT_EQ(Accepted(row.code, row.element, length), Parse(name)) << name;
     }
 }
 
@@ -223,10 +223,10 @@ TEST(GetDataLength, CoversScalarsOnly) {
     const int lengths[] = {0, 1, 1, 2, 4, 1, 2, 4, 4, 8, 0, 0, 10, 0, 0,
                            0, 0, 0, 0, 0, 0, 0, 0, 8, 8, 0, 0, 0,  0};
     for (int code = 0; code < static_cast<int>(std::size(lengths)); ++code) {
-        EXPECT_EQ(ProtUtilsN::GetDataLength(Code(code)), lengths[code]) << code;
+        EXPECT_EQ(lengths[code], ProtUtilsN::GetDataLength(Code(code))) << code;
     }
     for (const int code : {-1, 1000, INT32_MIN, INT32_MAX}) {
-        EXPECT_EQ(ProtUtilsN::GetDataLength(Code(code)), 0) << code;
+        EXPECT_EQ(0, ProtUtilsN::GetDataLength(Code(code))) << code;
     }
 }
 
@@ -238,7 +238,7 @@ TEST(GetItemCount, DividesTheLength) {
 
 TEST(GetItemCount, IsOneWhereItemsHaveNoLength) {
     for (const int code : {0, 10, 16, 25, 27, 28, -1}) {
-        EXPECT_EQ(ProtUtilsN::GetItemCount(40, Code(code)), 1) << code;
+        EXPECT_EQ(1, ProtUtilsN::GetItemCount(40, Code(code))) << code;
     }
 }
 
@@ -258,22 +258,22 @@ TEST(TagQueries, TellItemsOfATag) {
     };
     for (const Row& row : rows) {
         const ValueTag tag(row.text);
-        EXPECT_EQ(ProtUtilsN::GetItemCount(&tag), row.items) << row.text;
-        EXPECT_EQ(static_cast<int>(ProtUtilsN::GetBasicType(&tag)), row.basicType) << row.text;
-        EXPECT_EQ(ProtUtilsN::GetBasicLength(&tag), row.basicLength) << row.text;
-        EXPECT_EQ(ProtUtilsN::IsBitType(&tag), row.bits) << row.text;
+        EXPECT_EQ(row.items, ProtUtilsN::GetItemCount(&tag)) << row.text;
+        EXPECT_EQ(row.basicType, static_cast<int>(ProtUtilsN::GetBasicType(&tag))) << row.text;
+        EXPECT_EQ(row.basicLength, ProtUtilsN::GetBasicLength(&tag)) << row.text;
+        EXPECT_EQ(row.bits, ProtUtilsN::IsBitType(&tag)) << row.text;
     }
 }
 
 TEST(TagQueries, CountOneItemWhereTheItemTypeHasNoLength) {
     ValueTag tag("int-10");
     tag.setType(Code(16), Code(16), 40);
-    EXPECT_EQ(ProtUtilsN::GetItemCount(&tag), 1);
+    EXPECT_EQ(1, ProtUtilsN::GetItemCount(&tag));
 }
 
 TEST(IsBitType, HoldsForBooleanAndItsArrayOnly) {
     for (int code = -1; code < 30; ++code) {
-        EXPECT_EQ(ProtUtilsN::IsBitType(Code(code)), code == 1 || code == 13) << code;
+        EXPECT_EQ(code == 1 || code == 13, ProtUtilsN::IsBitType(Code(code))) << code;
     }
 }
 
@@ -282,7 +282,7 @@ TEST(GetTypeFlag, IsOneBitPerType) {
         EXPECT_EQ(ProtUtilsN::GetTypeFlag(Code(row.code)), 1 << (row.code - 1)) << row.text;
     }
     for (const int code : {0, 28, -1, INT32_MIN}) {
-        EXPECT_EQ(ProtUtilsN::GetTypeFlag(Code(code)), 0) << code;
+        EXPECT_EQ(0, ProtUtilsN::GetTypeFlag(Code(code))) << code;
     }
 }
 

@@ -60,18 +60,18 @@ TEST(HostileTexts, NeverMakeADataTypeOfNoRow) {
         int length = -77;
         Pieces conversions;
         if (!ProtUtilsN::GetICOMType(text, type, element, length, conversions)) {
-            ASSERT_EQ(type, ICU_Type::none) << text;
-            ASSERT_EQ(length, -77) << text;
+            ASSERT_EQ(ICU_Type::none, type) << text;
+            ASSERT_EQ(-77, length) << text;
             continue;
         }
         ++accepted;
         const auto code = static_cast<std::size_t>(type);
         ASSERT_TRUE(code >= 1 && code <= ProtUtilsN::DataTypes.size()) << text;
         const ProtUtilsN::DataType& row = ProtUtilsN::DataTypes[code - 1];
-        ASSERT_EQ(element, row.elementType) << text;
+        ASSERT_EQ(row.elementType, element) << text;
         ASSERT_NE(text.find(row.typeString), std::string::npos) << text;
         if (row.fixedLength != 0) {
-            ASSERT_EQ(length, row.fixedLength) << text;
+            ASSERT_EQ(row.fixedLength, length) << text;
         }
     }
     EXPECT_GT(accepted, 100) << "the texts no longer reach the table";
@@ -101,13 +101,13 @@ TEST(HostileTexts, NeverLeadATagOutOfItsBuffers) {
         std::vector<unsigned char> value(AtLeastZero(tag.GetVarLength()), 0);
         const bool ok = tag.Convert(device.data(), value.data(), false);
         if (!ok) {
-            ASSERT_EQ(std::count(value.begin(), value.end(), 0), std::ssize(value));
-            ASSERT_EQ(std::string(tag.GetError()).rfind("Conversion error at: ", 0), 0U);
+            ASSERT_EQ(std::ssize(value), std::count(value.begin(), value.end(), 0));
+            ASSERT_EQ(0U, std::string(tag.GetError()).rfind("Conversion error at: ", 0));
             continue;
         }
         if (!tag.Convert(value.data(), device.data(), true)) continue;
         ++converted;
-        ASSERT_EQ(device, std::vector<unsigned char>(device.size(), 0x21)) << tag.GetVarName();
+        ASSERT_EQ(std::vector<unsigned char>(device.size(), 0x21), device) << tag.GetVarName();
     }
     EXPECT_GT(converted, 100);
 }
@@ -120,7 +120,7 @@ TEST(HostileTexts, NeverMakeAParameterOfAnotherOne) {
     for (int round = 0; round < kRounds; ++round) {
         const std::string text = texts.next();
         CfgParser parser(text.c_str());
-        ASSERT_EQ(parser.KnownFormat(), text.find("CfgVer=1") != std::string::npos) << text;
+        ASSERT_EQ(text.find("CfgVer=1") != std::string::npos, parser.KnownFormat()) << text;
 
         std::set<int> nodes;
         for (int i = 0; i < parser.GetNodeCount(); ++i) {
@@ -131,8 +131,8 @@ TEST(HostileTexts, NeverMakeAParameterOfAnotherOne) {
         std::string value = "before";
         const int result = parser.getParam("timeout", 2, value, CfgParser::anyPlace);
         if (result != CfgParser::found) {
-            ASSERT_EQ(result, CfgParser::notFound) << text;
-            ASSERT_EQ(value, "before") << text;
+            ASSERT_EQ(CfgParser::notFound, result) << text;
+            ASSERT_EQ("before", value) << text;
             continue;
         }
         ++found;
@@ -149,8 +149,8 @@ TEST(HostileTexts, NodesWithoutEndAreCollectedOnce) {
         text += "Node";
     text += "4::x=1";
     const CfgParser parser(text.c_str());
-    ASSERT_EQ(parser.GetNodeCount(), 1);
-    EXPECT_EQ(parser.GetNodeID(0), 4);
+    ASSERT_EQ(1, parser.GetNodeCount());
+    EXPECT_EQ(4, parser.GetNodeID(0));
 }
 
 }  // namespace

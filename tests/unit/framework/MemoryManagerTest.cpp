@@ -21,13 +21,13 @@ Model ModelWith(const char* name, const MemoryType& area) {
 
 TEST(MemoryType, StartsAsAnEmptyBitArea) {
     const MemoryType area;
-    EXPECT_EQ(area.getName(), "");
-    EXPECT_EQ(static_cast<int>(area.getNaturalType()), 1);
-    EXPECT_EQ(area.getIcomTypes(), 0x3fffff);
-    EXPECT_EQ(area.getMinIndex(), 0);
-    EXPECT_EQ(area.getMaxIndex(), 0);
-    EXPECT_EQ(area.getBlockReadCount(), 0);
-    EXPECT_EQ(area.getBlockWriteCount(), 0);
+    EXPECT_EQ("", area.getName());
+    EXPECT_EQ(1, static_cast<int>(area.getNaturalType()));
+    EXPECT_EQ(0x3fffff, area.getIcomTypes());
+    EXPECT_EQ(0, area.getMinIndex());
+    EXPECT_EQ(0, area.getMaxIndex());
+    EXPECT_EQ(0, area.getBlockReadCount());
+    EXPECT_EQ(0, area.getBlockWriteCount());
     for (const bool flag : {area.isSwap2(), area.isSwap4(), area.isSwap8(), area.isBitWrite(),
                             area.isBitArrayWrite(), area.isReadOnly(), area.isWriteOnly(),
                             area.isInDatagram(), area.hasInternalConversion(), area.isBitRead()}) {
@@ -44,14 +44,14 @@ TEST(MemoryType, KeepsEveryNumber) {
     area.setBlockWriteCount(123);
     area.setMinIndex(1);
     area.setMaxIndex(65536);
-    EXPECT_EQ(area.getName(), "HREG");
-    EXPECT_EQ(area.nameRef(), "HREG");
-    EXPECT_EQ(area.getNaturalType(), ICU_Type::unsignedShort);
-    EXPECT_EQ(area.getIcomTypes(), 0x10);
-    EXPECT_EQ(area.getBlockReadCount(), 125);
-    EXPECT_EQ(area.getBlockWriteCount(), 123);
-    EXPECT_EQ(area.getMinIndex(), 1);
-    EXPECT_EQ(area.getMaxIndex(), 65536);
+    EXPECT_EQ("HREG", area.getName());
+    EXPECT_EQ("HREG", area.nameRef());
+    EXPECT_EQ(ICU_Type::unsignedShort, area.getNaturalType());
+    EXPECT_EQ(0x10, area.getIcomTypes());
+    EXPECT_EQ(125, area.getBlockReadCount());
+    EXPECT_EQ(123, area.getBlockWriteCount());
+    EXPECT_EQ(1, area.getMinIndex());
+    EXPECT_EQ(65536, area.getMaxIndex());
 }
 
 // One setter at a time: no flag may move another one.
@@ -73,7 +73,7 @@ TEST(MemoryType, KeepsEachFlagApart) {
         MemoryType area;
         (area.*set)(true);
         for (const auto& [unused, get] : flags) {
-            EXPECT_EQ((area.*get)(), get == own);
+            EXPECT_EQ(get == own, (area.*get)());
         }
         EXPECT_FALSE(area.isWriteOnly());
     }
@@ -81,9 +81,9 @@ TEST(MemoryType, KeepsEachFlagApart) {
 
 TEST(Model, StartsEmpty) {
     const Model model("Modicon");
-    EXPECT_EQ(model.getName(), "Modicon");
-    EXPECT_EQ(model.getMaxDatagramItems(), 0);
-    EXPECT_EQ(model.getMaxDatagramLength(), 0);
+    EXPECT_EQ("Modicon", model.getName());
+    EXPECT_EQ(0, model.getMaxDatagramItems());
+    EXPECT_EQ(0, model.getMaxDatagramLength());
     EXPECT_TRUE(model.getMemoryTypes().empty());
 }
 
@@ -91,8 +91,8 @@ TEST(Model, KeepsItsDatagramLimitsApart) {
     Model model("Modicon");
     model.setMaxDatagramItems(3);
     model.setMaxDatagramLength(200);
-    EXPECT_EQ(model.getMaxDatagramItems(), 3);
-    EXPECT_EQ(model.getMaxDatagramLength(), 200);
+    EXPECT_EQ(3, model.getMaxDatagramItems());
+    EXPECT_EQ(200, model.getMaxDatagramLength());
 }
 
 TEST(Model, KeepsMemoryTypesInTheOrderAdded) {
@@ -100,32 +100,32 @@ TEST(Model, KeepsMemoryTypesInTheOrderAdded) {
     model.addMemoryType(Area("HREG"));
     model.addMemoryType(Area("COIL"));
     model.addMemoryType(Area("hreg"));
-    ASSERT_EQ(model.getMemoryTypes().size(), 3U);
-    EXPECT_EQ(model.getMemoryTypes()[0].getName(), "HREG");
-    EXPECT_EQ(model.getMemoryTypes()[1].getName(), "COIL");
-    EXPECT_EQ(model.getMemoryTypes()[2].getName(), "hreg");
+    ASSERT_EQ(3U, model.getMemoryTypes().size());
+    EXPECT_EQ("HREG", model.getMemoryTypes()[0].getName());
+    EXPECT_EQ("COIL", model.getMemoryTypes()[1].getName());
+    EXPECT_EQ("hreg", model.getMemoryTypes()[2].getName());
 }
 
 TEST(Model, KeepsTheFirstMemoryTypeOfAName) {
     Model model("Modicon");
     model.addMemoryType(Area("HREG", 10));
     model.addMemoryType(Area("HREG", 20));
-    ASSERT_EQ(model.getMemoryTypes().size(), 1U);
-    EXPECT_EQ(model.getMemoryTypes()[0].getMaxIndex(), 10);
+    ASSERT_EQ(1U, model.getMemoryTypes().size());
+    EXPECT_EQ(10, model.getMemoryTypes()[0].getMaxIndex());
 }
 
 TEST(MemoryManager, IsEmptyAtFirst) {
     const MemoryManager manager;
-    EXPECT_EQ(manager.getModel("Modicon"), nullptr);
-    EXPECT_EQ(manager.getMemoryType("Modicon", "HREG"), nullptr);
+    EXPECT_EQ(nullptr, manager.getModel("Modicon"));
+    EXPECT_EQ(nullptr, manager.getMemoryType("Modicon", "HREG"));
 }
 
 TEST(MemoryManager, FindsModelsByTheirExactName) {
     MemoryManager manager;
     manager.addModel(Model("Modicon"));
     manager.addModel(Model("Enron"));
-    EXPECT_EQ(manager.getModel("Enron"), &manager.getModels()[1]);
-    EXPECT_EQ(manager.getModel("Modicon"), &manager.getModels()[0]);
+    EXPECT_EQ(&manager.getModels()[1], manager.getModel("Enron"));
+    EXPECT_EQ(&manager.getModels()[0], manager.getModel("Modicon"));
 }
 
 TEST(MemoryManager, TakesTheFirstModelForAnUnknownOne) {
@@ -133,7 +133,7 @@ TEST(MemoryManager, TakesTheFirstModelForAnUnknownOne) {
     manager.addModel(Model("Modicon"));
     manager.addModel(Model("Enron"));
     for (const char* name : {"", "enron", "Enron ", "Unknown"}) {
-        EXPECT_EQ(manager.getModel(name), &manager.getModels()[0]) << name;
+        EXPECT_EQ(&manager.getModels()[0], manager.getModel(name)) << name;
     }
 }
 
@@ -141,9 +141,9 @@ TEST(MemoryManager, KeepsModelsOfTheSameNameAndFindsTheFirst) {
     MemoryManager manager;
     manager.addModel(ModelWith("Modicon", Area("HREG", 10)));
     manager.addModel(ModelWith("Modicon", Area("COIL", 20)));
-    EXPECT_EQ(manager.getModels().size(), 2U);
-    EXPECT_EQ(manager.getModel("Modicon"), &manager.getModels()[0]);
-    EXPECT_EQ(manager.getMemoryType("Modicon", "COIL"), nullptr);
+    EXPECT_EQ(2U, manager.getModels().size());
+    EXPECT_EQ(&manager.getModels()[0], manager.getModel("Modicon"));
+    EXPECT_EQ(nullptr, manager.getMemoryType("Modicon", "COIL"));
 }
 
 TEST(MemoryManager, HoldsCopies) {
@@ -151,9 +151,9 @@ TEST(MemoryManager, HoldsCopies) {
     Model model = ModelWith("Modicon", Area("HREG", 10));
     manager.addModel(model);
     model.addMemoryType(Area("COIL"));
-    EXPECT_EQ(manager.getMemoryType("Modicon", "COIL"), nullptr);
+    EXPECT_EQ(nullptr, manager.getMemoryType("Modicon", "COIL"));
     ASSERT_NE(manager.getMemoryType("Modicon", "HREG"), nullptr);
-    EXPECT_EQ(manager.getMemoryType("Modicon", "HREG")->getMaxIndex(), 10);
+    EXPECT_EQ(10, manager.getMemoryType("Modicon", "HREG")->getMaxIndex());
 }
 
 TEST(MemoryManager, LooksForMemoryTypesInTheNamedModelOnly) {
@@ -161,10 +161,10 @@ TEST(MemoryManager, LooksForMemoryTypesInTheNamedModelOnly) {
     manager.addModel(ModelWith("Modicon", Area("HREG", 10)));
     manager.addModel(ModelWith("Enron", Area("COIL", 20)));
     ASSERT_NE(manager.getMemoryType("Enron", "COIL"), nullptr);
-    EXPECT_EQ(manager.getMemoryType("Enron", "COIL")->getMaxIndex(), 20);
-    EXPECT_EQ(manager.getMemoryType("Enron", "HREG"), nullptr);
-    EXPECT_EQ(manager.getMemoryType("Unknown", "HREG"), nullptr);
-    EXPECT_EQ(manager.getMemoryType("Modicon", "hreg"), nullptr);
+    EXPECT_EQ(20, manager.getMemoryType("Enron", "COIL")->getMaxIndex());
+    EXPECT_EQ(nullptr, manager.getMemoryType("Enron", "HREG"));
+    EXPECT_EQ(nullptr, manager.getMemoryType("Unknown", "HREG"));
+    EXPECT_EQ(nullptr, manager.getMemoryType("Modicon", "hreg"));
 }
 
 }  // namespace

@@ -22,11 +22,11 @@ TEST(ProtocolBaseArray, ItemIsCutOutOfTheWholeArray) {
     for (int index : {0, 1, 2}) {
         unsigned char item[3] = {0xEE, 0xEE, 0xEE};
         EXPECT_NE(protocol.readArrayItem(&tag, index, item), 0) << index;
-        EXPECT_EQ(item[0], 2 * index + 1) << index;
-        EXPECT_EQ(item[1], 2 * index + 2) << index;
-        EXPECT_EQ(item[2], 0xEE) << index;
+        EXPECT_EQ(2 * index + 1, item[0]) << index;
+        EXPECT_EQ(2 * index + 2, item[1]) << index;
+        EXPECT_EQ(0xEE, item[2]) << index;
     }
-    EXPECT_EQ(protocol.readLengths, (std::vector<int>{6, 6, 6}));
+    EXPECT_EQ((std::vector<int>{6, 6, 6}), protocol.readLengths);
 }
 
 TEST(ProtocolBaseArray, WrittenItemTravelsWithTheWholeArray) {
@@ -35,8 +35,8 @@ TEST(ProtocolBaseArray, WrittenItemTravelsWithTheWholeArray) {
     const TestTag tag("1", kThreeShorts);
     const unsigned char item[] = {0xAA, 0xBB};
     EXPECT_NE(protocol.writeArrayItem(&tag, 1, item), 0);
-    ASSERT_EQ(protocol.written.size(), 1u);
-    EXPECT_EQ(protocol.written[0], (Bytes{1, 2, 0xAA, 0xBB, 5, 6}));
+    ASSERT_EQ(1u, protocol.written.size());
+    EXPECT_EQ((Bytes{1, 2, 0xAA, 0xBB, 5, 6}), protocol.written[0]);
 }
 
 TEST(ProtocolBaseArray, ItemsOfLongArraysAreReachedToTheLast) {
@@ -47,14 +47,14 @@ TEST(ProtocolBaseArray, ItemsOfLongArraysAreReachedToTheLast) {
         const TestTag tag("1", bytesShape(length));
         unsigned char item = 0xEE;
         EXPECT_NE(protocol.readArrayItem(&tag, length - 1, &item), 0) << length;
-        EXPECT_EQ(item, protocol.device.back()) << length;
+        EXPECT_EQ(protocol.device.back(), item) << length;
 
         Bytes expected = protocol.device;
         expected.back() = 0x77;
         item = 0x77;
         EXPECT_NE(protocol.writeArrayItem(&tag, length - 1, &item), 0) << length;
-        ASSERT_EQ(protocol.written.size(), 1u) << length;
-        EXPECT_EQ(protocol.written[0], expected) << length;
+        ASSERT_EQ(1u, protocol.written.size()) << length;
+        EXPECT_EQ(expected, protocol.written[0]) << length;
     }
 }
 
@@ -64,14 +64,14 @@ TEST(ProtocolBaseArray, BitItemsAreOneByteEach) {
     const TestTag tag("1", {ICU_Type::booleanArray, ICU_Type::boolean, 4, 0, 2});
     unsigned char item = 0xEE;
     EXPECT_NE(protocol.readArrayItem(&tag, 2, &item), 0);
-    EXPECT_EQ(item, 1);
+    EXPECT_EQ(1, item);
     EXPECT_NE(protocol.readArrayItem(&tag, 3, &item), 0);
-    EXPECT_EQ(item, 0);
+    EXPECT_EQ(0, item);
 
     item = 1;
     EXPECT_NE(protocol.writeArrayItem(&tag, 3, &item), 0);
-    ASSERT_EQ(protocol.written.size(), 1u);
-    EXPECT_EQ(protocol.written[0], (Bytes{1, 0, 1, 1}));
+    ASSERT_EQ(1u, protocol.written.size());
+    EXPECT_EQ((Bytes{1, 0, 1, 1}), protocol.written[0]);
 }
 
 TEST(ProtocolBaseArray, ScalarsHaveNoItems) {
@@ -81,15 +81,15 @@ TEST(ProtocolBaseArray, ScalarsHaveNoItems) {
     // The missing array is reported even where the index is wrong too.
     for (int index : {0, -1, 99}) {
         protocol.SetError(1, "");
-        EXPECT_EQ(protocol.readArrayItem(&tag, index, item), 0) << index;
-        EXPECT_EQ(protocol.GetLastError(), -1);
-        EXPECT_STREQ(protocol.GetLastErrorString(), kNoArray) << index;
+        EXPECT_EQ(0, protocol.readArrayItem(&tag, index, item)) << index;
+        EXPECT_EQ(-1, protocol.GetLastError());
+        EXPECT_STREQ(kNoArray, protocol.GetLastErrorString()) << index;
         protocol.SetError(1, "");
-        EXPECT_EQ(protocol.writeArrayItem(&tag, index, item), 0) << index;
-        EXPECT_EQ(protocol.GetLastError(), -1);
-        EXPECT_STREQ(protocol.GetLastErrorString(), kNoArray) << index;
+        EXPECT_EQ(0, protocol.writeArrayItem(&tag, index, item)) << index;
+        EXPECT_EQ(-1, protocol.GetLastError());
+        EXPECT_STREQ(kNoArray, protocol.GetLastErrorString()) << index;
     }
-    EXPECT_EQ(item[0], 0xEE);
+    EXPECT_EQ(0xEE, item[0]);
     EXPECT_TRUE(protocol.readLengths.empty());
     EXPECT_TRUE(protocol.written.empty());
 }
@@ -100,14 +100,14 @@ TEST(ProtocolBaseArray, IndexOutsideTheArrayReachesNoDevice) {
     unsigned char item[2] = {0xEE, 0xEE};
     for (int index : {-1, 3, 4, -2147483647 - 1, 2147483647}) {
         protocol.SetError(1, "");
-        EXPECT_EQ(protocol.readArrayItem(&tag, index, item), 0) << index;
-        EXPECT_EQ(protocol.GetLastError(), -1);
-        EXPECT_STREQ(protocol.GetLastErrorString(), kOutOfRange) << index;
+        EXPECT_EQ(0, protocol.readArrayItem(&tag, index, item)) << index;
+        EXPECT_EQ(-1, protocol.GetLastError());
+        EXPECT_STREQ(kOutOfRange, protocol.GetLastErrorString()) << index;
         protocol.SetError(1, "");
-        EXPECT_EQ(protocol.writeArrayItem(&tag, index, item), 0) << index;
-        EXPECT_STREQ(protocol.GetLastErrorString(), kOutOfRange) << index;
+        EXPECT_EQ(0, protocol.writeArrayItem(&tag, index, item)) << index;
+        EXPECT_STREQ(kOutOfRange, protocol.GetLastErrorString()) << index;
     }
-    EXPECT_EQ(item[0], 0xEE);
+    EXPECT_EQ(0xEE, item[0]);
     EXPECT_TRUE(protocol.readLengths.empty());
     EXPECT_TRUE(protocol.written.empty());
 }
@@ -117,11 +117,11 @@ TEST(ProtocolBaseArray, EmptyAndNegativeArraysHaveNoItems) {
     unsigned char item = 0xEE;
     for (int length : {0, -1, -300}) {
         const TestTag tag("1", bytesShape(length));
-        EXPECT_EQ(protocol.readArrayItem(&tag, 0, &item), 0) << length;
-        EXPECT_EQ(protocol.writeArrayItem(&tag, 0, &item), 0) << length;
-        EXPECT_STREQ(protocol.GetLastErrorString(), kOutOfRange) << length;
+        EXPECT_EQ(0, protocol.readArrayItem(&tag, 0, &item)) << length;
+        EXPECT_EQ(0, protocol.writeArrayItem(&tag, 0, &item)) << length;
+        EXPECT_STREQ(kOutOfRange, protocol.GetLastErrorString()) << length;
     }
-    EXPECT_EQ(item, 0xEE);
+    EXPECT_EQ(0xEE, item);
 }
 
 TEST(ProtocolBaseArray, FailedReadStopsBothReadAndWrite) {
@@ -129,11 +129,11 @@ TEST(ProtocolBaseArray, FailedReadStopsBothReadAndWrite) {
     protocol.readResult = 0;
     const TestTag tag("1", kThreeShorts);
     unsigned char item[2] = {0xEE, 0xEE};
-    EXPECT_EQ(protocol.readArrayItem(&tag, 1, item), 0);
-    EXPECT_EQ(item[0], 0xEE);
-    EXPECT_EQ(protocol.writeArrayItem(&tag, 1, item), 0);
+    EXPECT_EQ(0, protocol.readArrayItem(&tag, 1, item));
+    EXPECT_EQ(0xEE, item[0]);
+    EXPECT_EQ(0, protocol.writeArrayItem(&tag, 1, item));
     EXPECT_TRUE(protocol.written.empty());
-    EXPECT_STREQ(protocol.GetLastErrorString(), "nobody answered the read");
+    EXPECT_STREQ("nobody answered the read", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseArray, FailedWriteIsReported) {
@@ -141,8 +141,8 @@ TEST(ProtocolBaseArray, FailedWriteIsReported) {
     protocol.writeResult = 0;
     const TestTag tag("1", kThreeShorts);
     const unsigned char item[2] = {1, 2};
-    EXPECT_EQ(protocol.writeArrayItem(&tag, 1, item), 0);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "nobody answered the write");
+    EXPECT_EQ(0, protocol.writeArrayItem(&tag, 1, item));
+    EXPECT_STREQ("nobody answered the write", protocol.GetLastErrorString());
 }
 
 }  // namespace

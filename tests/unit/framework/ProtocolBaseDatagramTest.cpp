@@ -64,7 +64,7 @@ TEST_F(ProtocolBaseDatagram, OnlyTheFirstTagIsComparedWithTheCandidate) {
     protocol_.refused = {&three_};
     EXPECT_TRUE(protocol_.CanAddToDatagram(list_, 2, &five_));
     const std::vector<std::pair<const ITag*, const ITag*>> compared{{&two_, &five_}};
-    EXPECT_EQ(protocol_.compared, compared);
+    EXPECT_EQ(compared, protocol_.compared);
     protocol_.refused = {&two_};
     EXPECT_FALSE(protocol_.CanAddToDatagram(list_, 2, &five_));
 }
@@ -98,21 +98,21 @@ TEST_F(ProtocolBaseDatagram, HugeTagsDoNotWrapTheSum) {
 TEST_F(ProtocolBaseDatagram, EveryItemOfASuccessfulReadIsDone) {
     idal_error_t status[3] = {-8, -8, -8};
     EXPECT_NE(protocol_.ReadDatagramWithStatus(list_, 2, data_, status), 0);
-    EXPECT_EQ(status[0], 1);
-    EXPECT_EQ(status[1], 1);
-    EXPECT_EQ(status[2], -8);
-    EXPECT_EQ(protocol_.counts, std::vector<int>{2});
+    EXPECT_EQ(1, status[0]);
+    EXPECT_EQ(1, status[1]);
+    EXPECT_EQ(-8, status[2]);
+    EXPECT_EQ(std::vector<int>{2}, protocol_.counts);
 }
 
 TEST_F(ProtocolBaseDatagram, FailedReadLeavesStatusAndStamps) {
     protocol_.readResult = 0;
     idal_error_t status[2] = {-8, -8};
     unsigned long long stamps[2] = {4711, 4711};
-    EXPECT_EQ(protocol_.ReadDatagramWithStatus(list_, 2, data_, status), 0);
-    EXPECT_EQ(protocol_.readDatagramWithTimestamp(list_, 2, data_, status, stamps), 0);
+    EXPECT_EQ(0, protocol_.ReadDatagramWithStatus(list_, 2, data_, status));
+    EXPECT_EQ(0, protocol_.readDatagramWithTimestamp(list_, 2, data_, status, stamps));
     for (int i : {0, 1}) {
-        EXPECT_EQ(status[i], -8);
-        EXPECT_EQ(stamps[i], 4711u);
+        EXPECT_EQ(-8, status[i]);
+        EXPECT_EQ(4711u, stamps[i]);
     }
 }
 
@@ -120,32 +120,32 @@ TEST_F(ProtocolBaseDatagram, ProtocolWithoutDatagramsLeavesStatusAndStamps) {
     TestProtocol protocol;
     idal_error_t status[2] = {-8, -8};
     unsigned long long stamps[2] = {4711, 4711};
-    EXPECT_EQ(protocol.ReadDatagramWithStatus(list_, 2, data_, status), 0);
-    EXPECT_EQ(protocol.readDatagramWithTimestamp(list_, 2, data_, status, stamps), 0);
-    EXPECT_EQ(status[0], -8);
-    EXPECT_EQ(stamps[0], 4711u);
+    EXPECT_EQ(0, protocol.ReadDatagramWithStatus(list_, 2, data_, status));
+    EXPECT_EQ(0, protocol.readDatagramWithTimestamp(list_, 2, data_, status, stamps));
+    EXPECT_EQ(-8, status[0]);
+    EXPECT_EQ(4711u, stamps[0]);
 }
 
 TEST_F(ProtocolBaseDatagram, AllItemsCarryOneStamp) {
     idal_error_t status[2] = {-8, -8};
     unsigned long long stamps[3] = {4711, 4712, 4713};
     const unsigned long long before = currentTimeStamp();
-    EXPECT_EQ(protocol_.readDatagramWithTimestamp(list_, 2, data_, status, stamps), 1);
+    EXPECT_EQ(1, protocol_.readDatagramWithTimestamp(list_, 2, data_, status, stamps));
     EXPECT_LE(before, stamps[0]);
     EXPECT_LE(stamps[0], currentTimeStamp());
-    EXPECT_EQ(stamps[1], stamps[0]);
-    EXPECT_EQ(stamps[2], 4713u);
-    EXPECT_EQ(status[0], 1);
-    EXPECT_EQ(status[1], 1);
+    EXPECT_EQ(stamps[0], stamps[1]);
+    EXPECT_EQ(4713u, stamps[2]);
+    EXPECT_EQ(1, status[0]);
+    EXPECT_EQ(1, status[1]);
 }
 
 TEST_F(ProtocolBaseDatagram, NoItemsStoreNothing) {
     for (int count : {0, -1}) {
         idal_error_t status[1] = {-8};
         unsigned long long stamps[1] = {4711};
-        EXPECT_EQ(protocol_.readDatagramWithTimestamp(list_, count, data_, status, stamps), 1);
-        EXPECT_EQ(status[0], -8) << count;
-        EXPECT_EQ(stamps[0], 4711u) << count;
+        EXPECT_EQ(1, protocol_.readDatagramWithTimestamp(list_, count, data_, status, stamps));
+        EXPECT_EQ(-8, status[0]) << count;
+        EXPECT_EQ(4711u, stamps[0]) << count;
     }
 }
 
@@ -162,11 +162,11 @@ TEST_F(ProtocolBaseDatagram, DriversOwnStatusesAreStampedAsTheyAre) {
     OwnStatus protocol;
     idal_error_t status[2] = {-8, -8};
     unsigned long long stamps[2] = {4711, 4711};
-    EXPECT_EQ(protocol.readDatagramWithTimestamp(list_, 2, data_, status, stamps), 1);
-    EXPECT_EQ(status[0], 1);
-    EXPECT_EQ(status[1], -6);
+    EXPECT_EQ(1, protocol.readDatagramWithTimestamp(list_, 2, data_, status, stamps));
+    EXPECT_EQ(1, status[0]);
+    EXPECT_EQ(-6, status[1]);
     EXPECT_NE(stamps[0], 4711u);
-    EXPECT_EQ(stamps[1], stamps[0]);
+    EXPECT_EQ(stamps[0], stamps[1]);
 }
 
 }  // namespace

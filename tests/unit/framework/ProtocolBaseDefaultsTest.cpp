@@ -129,8 +129,8 @@ void expectDefaults(const std::vector<DefaultRow>& rows) {
         TestProtocol protocol;
         protocol.SetError(kUntouched, "an earlier failure");
         EXPECT_TRUE(row.answersAsExpected(protocol, &tag));
-        EXPECT_EQ(protocol.GetLastError(), row.errorCode);
-        EXPECT_STREQ(protocol.GetLastErrorString(), row.errorText);
+        EXPECT_EQ(row.errorCode, protocol.GetLastError());
+        EXPECT_STREQ(row.errorText, protocol.GetLastErrorString());
     }
 }
 
@@ -162,7 +162,7 @@ TEST(ProtocolBaseOrder, OffsetsAreComparedUnsigned) {
         shapeB.byteOffset = row.b;
         const TestTag a("a", shapeA);
         const TestTag b("b", shapeB);
-        EXPECT_EQ(protocol.IsBefore(&a, &b), row.before) << row.a << " " << row.b;
+        EXPECT_EQ(row.before, protocol.IsBefore(&a, &b)) << row.a << " " << row.b;
     }
 }
 

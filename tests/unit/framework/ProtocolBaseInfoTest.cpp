@@ -53,27 +53,27 @@ class ProtocolBaseInfo : public testing::Test {
 };
 
 TEST_F(ProtocolBaseInfo, WithoutServicesItDescribesTheProtocolAlone) {
-    EXPECT_EQ(infoOf(protocol_), kIdentityLines);
+    EXPECT_EQ(kIdentityLines, infoOf(protocol_));
 }
 
 TEST_F(ProtocolBaseInfo, PresentServicesFollowInFixedOrder) {
     piSocketFactory = &sockets_;
     piMultiTask = &tasks_;
     piSerialFactory = &serial_;
-    EXPECT_EQ(infoOf(protocol_), std::string(kIdentityLines) +
-                                     "PanelTasks v.2\nPanelSerial v.31\nPanelSockets v.-4\n");
+    EXPECT_EQ(std::string(kIdentityLines) + "PanelTasks v.2\nPanelSerial v.31\nPanelSockets v.-4\n",
+              infoOf(protocol_));
 }
 
 TEST_F(ProtocolBaseInfo, MissingServiceIsPassedOver) {
     piMultiTask = &tasks_;
     piSocketFactory = &sockets_;
-    EXPECT_EQ(infoOf(protocol_),
-              std::string(kIdentityLines) + "PanelTasks v.2\nPanelSockets v.-4\n");
+    EXPECT_EQ(std::string(kIdentityLines) + "PanelTasks v.2\nPanelSockets v.-4\n",
+              infoOf(protocol_));
 }
 
 TEST_F(ProtocolBaseInfo, OtherServicesAreNotNamed) {
     piDiag = &tasks_;
-    EXPECT_EQ(infoOf(protocol_), kIdentityLines);
+    EXPECT_EQ(kIdentityLines, infoOf(protocol_));
 }
 
 TEST_F(ProtocolBaseInfo, ConvertedProtocolKeepsQuietAboutServices) {
@@ -81,7 +81,7 @@ TEST_F(ProtocolBaseInfo, ConvertedProtocolKeepsQuietAboutServices) {
         bool IsConverted() const override { return true; }
     };
     piMultiTask = &tasks_;
-    EXPECT_EQ(infoOf(Converted()), kIdentityLines);
+    EXPECT_EQ(kIdentityLines, infoOf(Converted()));
 }
 
 TEST_F(ProtocolBaseInfo, EverySizeCutsTheTextWithoutATerminator) {
@@ -92,33 +92,33 @@ TEST_F(ProtocolBaseInfo, EverySizeCutsTheTextWithoutATerminator) {
         const int written = protocol_.GetInfo(text.out(), size);
         const auto room = static_cast<std::size_t>(std::max(size, 0));
         const std::string expected = whole.substr(0, room);
-        EXPECT_EQ(written, static_cast<int>(expected.size())) << "size " << size;
-        EXPECT_EQ(text.content(),
-                  expected + std::string(room - expected.size(), GuardedText::kFill))
+        EXPECT_EQ(static_cast<int>(expected.size()), written) << "size " << size;
+        EXPECT_EQ(expected + std::string(room - expected.size(), GuardedText::kFill),
+                  text.content())
             << "size " << size;
         EXPECT_TRUE(text.guardsIntact()) << "size " << size;
     }
 }
 
 TEST_F(ProtocolBaseInfo, TenByteBufferGivesTenBytesAndNoZero) {
-    EXPECT_EQ(infoOf(protocol_, 10), "Protocol: ");
+    EXPECT_EQ("Protocol: ", infoOf(protocol_, 10));
 }
 
 TEST_F(ProtocolBaseInfo, NoBufferIsNeededForNoBytes) {
-    EXPECT_EQ(protocol_.GetInfo(nullptr, 0), 0);
-    EXPECT_EQ(protocol_.GetInfo(nullptr, -5), 0);
+    EXPECT_EQ(0, protocol_.GetInfo(nullptr, 0));
+    EXPECT_EQ(0, protocol_.GetInfo(nullptr, -5));
 }
 
 TEST_F(ProtocolBaseInfo, NullProtocolNameSuppressesEverythingBehindIt) {
     piMultiTask = &tasks_;
     protocol_.name = nullptr;
-    EXPECT_EQ(infoOf(protocol_), "Protocol: ");
+    EXPECT_EQ("Protocol: ", infoOf(protocol_));
 }
 
 TEST_F(ProtocolBaseInfo, NullImplementationNameSuppressesEverythingBehindIt) {
     piMultiTask = &tasks_;
     protocol_.implementation = nullptr;
-    EXPECT_EQ(infoOf(protocol_), "Protocol: TEST (7) v.12\nImplementation: ");
+    EXPECT_EQ("Protocol: TEST (7) v.12\nImplementation: ", infoOf(protocol_));
 }
 
 TEST_F(ProtocolBaseInfo, NullServiceNameSuppressesTheServicesBehindIt) {
@@ -126,7 +126,7 @@ TEST_F(ProtocolBaseInfo, NullServiceNameSuppressesTheServicesBehindIt) {
     piMultiTask = &tasks_;
     piSerialFactory = &nameless;
     piSocketFactory = &sockets_;
-    EXPECT_EQ(infoOf(protocol_), std::string(kIdentityLines) + "PanelTasks v.2\n");
+    EXPECT_EQ(std::string(kIdentityLines) + "PanelTasks v.2\n", infoOf(protocol_));
 }
 
 TEST_F(ProtocolBaseInfo, WidestNumbersAreWrittenWhole) {
@@ -134,8 +134,8 @@ TEST_F(ProtocolBaseInfo, WidestNumbersAreWrittenWhole) {
     NamedService high("High", 2147483647);
     piMultiTask = &low;
     piSerialFactory = &high;
-    EXPECT_EQ(infoOf(protocol_),
-              std::string(kIdentityLines) + "Low v.-2147483648\nHigh v.2147483647\n");
+    EXPECT_EQ(std::string(kIdentityLines) + "Low v.-2147483648\nHigh v.2147483647\n",
+              infoOf(protocol_));
 }
 
 }  // namespace

@@ -37,8 +37,8 @@ class FrugalProtocol : public TestProtocol {
 class ProtocolBaseMemory : public testing::Test {
   protected:
     void expectOutOfMemory() const {
-        EXPECT_EQ(protocol_.GetLastError(), -1);
-        EXPECT_STREQ(protocol_.GetLastErrorString(), "Out of memory");
+        EXPECT_EQ(-1, protocol_.GetLastError());
+        EXPECT_STREQ("Out of memory", protocol_.GetLastErrorString());
     }
 
     FrugalProtocol protocol_;
@@ -52,10 +52,10 @@ TEST_F(ProtocolBaseMemory, LongTagIsNotReadWithoutMemory) {
         const MemoryShortage shortage;
         ok = protocol_.Read(&tag, value_.data());
     }
-    EXPECT_EQ(ok, 0);
+    EXPECT_EQ(0, ok);
     expectOutOfMemory();
-    EXPECT_EQ(protocol_.transfers, 0);
-    EXPECT_EQ(value_[0], 0xEE);
+    EXPECT_EQ(0, protocol_.transfers);
+    EXPECT_EQ(0xEE, value_[0]);
 }
 
 TEST_F(ProtocolBaseMemory, ShortTagNeedsNoMemory) {
@@ -66,9 +66,9 @@ TEST_F(ProtocolBaseMemory, ShortTagNeedsNoMemory) {
         const MemoryShortage shortage;
         ok = protocol_.Read(&tag, value_.data());
     }
-    EXPECT_EQ(ok, 1);
-    EXPECT_EQ(value_[0], 1);
-    EXPECT_EQ(value_[63], 0);
+    EXPECT_EQ(1, ok);
+    EXPECT_EQ(1, value_[0]);
+    EXPECT_EQ(0, value_[63]);
 }
 
 TEST_F(ProtocolBaseMemory, LongArrayIsNeitherReadNorWrittenWithoutMemory) {
@@ -80,10 +80,10 @@ TEST_F(ProtocolBaseMemory, LongArrayIsNeitherReadNorWrittenWithoutMemory) {
         read = protocol_.readArrayItem(&tag, 0, value_.data());
         written = protocol_.writeArrayItem(&tag, 0, value_.data());
     }
-    EXPECT_EQ(read, 0);
-    EXPECT_EQ(written, 0);
+    EXPECT_EQ(0, read);
+    EXPECT_EQ(0, written);
     expectOutOfMemory();
-    EXPECT_EQ(protocol_.transfers, 0);
+    EXPECT_EQ(0, protocol_.transfers);
 }
 
 TEST_F(ProtocolBaseMemory, TagThatCannotBeListedIsDestroyed) {
@@ -94,8 +94,8 @@ TEST_F(ProtocolBaseMemory, TagThatCannotBeListedIsDestroyed) {
         const MemoryShortage shortage;
         tag = protocol_.CreateTag("1");
     }
-    EXPECT_EQ(tag, nullptr);
-    EXPECT_EQ(destroyed, 1);
+    EXPECT_EQ(nullptr, tag);
+    EXPECT_EQ(1, destroyed);
     expectOutOfMemory();
 }
 
@@ -105,7 +105,7 @@ TEST_F(ProtocolBaseMemory, CommonErrorTextsNeedNoMemory) {
         const MemoryShortage shortage;
         protocol_.SetError(-6, text.c_str());
     }
-    EXPECT_EQ(protocol_.GetLastErrorString(), text);
+    EXPECT_EQ(text, protocol_.GetLastErrorString());
 }
 
 TEST_F(ProtocolBaseMemory, LongErrorTextIsCutWithoutMemory) {
@@ -114,10 +114,10 @@ TEST_F(ProtocolBaseMemory, LongErrorTextIsCutWithoutMemory) {
         const MemoryShortage shortage;
         protocol_.SetError(-6, text.c_str());
     }
-    EXPECT_EQ(protocol_.GetLastError(), -6);
+    EXPECT_EQ(-6, protocol_.GetLastError());
     const std::string kept = protocol_.GetLastErrorString();
     EXPECT_GE(kept.size(), 256u);
-    EXPECT_EQ(kept, text.substr(0, kept.size()));
+    EXPECT_EQ(text.substr(0, kept.size()), kept);
 }
 
 TEST_F(ProtocolBaseMemory, IdentStaysWithoutMemory) {
@@ -127,7 +127,7 @@ TEST_F(ProtocolBaseMemory, IdentStaysWithoutMemory) {
         const MemoryShortage shortage;
         protocol_.SetIdent(ident.c_str());
     }
-    EXPECT_STREQ(protocol_.GetIdent(), "line");
+    EXPECT_STREQ("line", protocol_.GetIdent());
     expectOutOfMemory();
 }
 
@@ -137,8 +137,8 @@ TEST_F(ProtocolBaseMemory, CommonTagErrorsNeedNoMemory) {
         const MemoryShortage shortage;
         protocol_.SetTagError(&tag);
     }
-    EXPECT_STREQ(protocol_.GetLastErrorString(),
-                 "Tag URI error: a URI that is longer than a short string - ");
+    EXPECT_STREQ("Tag URI error: a URI that is longer than a short string - ",
+                 protocol_.GetLastErrorString());
 }
 
 TEST_F(ProtocolBaseMemory, LongTagErrorIsReplacedByTheShortage) {
@@ -171,14 +171,14 @@ Outcome runShort(const std::string& command, int requests) {
     }
     const bool tagWasTaken = protocol.ready == nullptr;
     if (tagWasTaken) static_cast<void>(tag.release());
-    EXPECT_EQ(destroyed, tagWasTaken ? 1 : 0);
+    EXPECT_EQ(tagWasTaken ? 1 : 0, destroyed);
 
     outcome.ranShort = protocol.GetLastError() == -1;
-    EXPECT_STREQ(protocol.GetLastErrorString(), outcome.ranShort ? "Out of memory" : "");
+    EXPECT_STREQ(outcome.ranShort ? "Out of memory" : "", protocol.GetLastErrorString());
     EXPECT_TRUE(answer.guardsIntact());
     EXPECT_EQ(1, outcome.result);
     if (outcome.ranShort) {
-        EXPECT_EQ(answer.text(), "Out of memory");
+        EXPECT_EQ("Out of memory", answer.text());
     }
     return outcome;
 }

@@ -39,9 +39,9 @@ TEST(ProtocolBaseRead, ValueArrivesAtEveryLength) {
         std::iota(protocol.device.begin(), protocol.device.end(), static_cast<unsigned char>(1));
         const TestTag tag("1", bytesShape(length));
         std::vector<unsigned char> value(static_cast<std::size_t>(length), 0xEE);
-        EXPECT_EQ(protocol.Read(&tag, value.data()), 1) << length;
-        EXPECT_EQ(protocol.readLengths, std::vector<int>{length});
-        EXPECT_EQ(value, protocol.device) << length;
+        EXPECT_EQ(1, protocol.Read(&tag, value.data())) << length;
+        EXPECT_EQ(std::vector<int>{length}, protocol.readLengths);
+        EXPECT_EQ(protocol.device, value) << length;
     }
 }
 
@@ -50,8 +50,8 @@ TEST(ProtocolBaseRead, BytesThatTheDeviceDoesNotFillAreZero) {
         TestProtocol protocol;
         const TestTag tag("1", bytesShape(length));
         std::vector<unsigned char> value(static_cast<std::size_t>(length), 0xEE);
-        ASSERT_EQ(protocol.Read(&tag, value.data()), 1) << length;
-        EXPECT_EQ(value, std::vector<unsigned char>(static_cast<std::size_t>(length), 0)) << length;
+        ASSERT_EQ(1, protocol.Read(&tag, value.data())) << length;
+        EXPECT_EQ(std::vector<unsigned char>(static_cast<std::size_t>(length), 0), value) << length;
     }
 }
 
@@ -61,9 +61,9 @@ TEST(ProtocolBaseRead, EmptyAndNegativeLengthsTouchNothing) {
         protocol.device = {1, 2, 3};
         const TestTag tag("1", bytesShape(length));
         unsigned char value = 0xEE;
-        EXPECT_EQ(protocol.Read(&tag, &value), 1) << length;
-        EXPECT_EQ(protocol.readLengths, std::vector<int>{length});
-        EXPECT_EQ(value, 0xEE) << length;
+        EXPECT_EQ(1, protocol.Read(&tag, &value)) << length;
+        EXPECT_EQ(std::vector<int>{length}, protocol.readLengths);
+        EXPECT_EQ(0xEE, value) << length;
     }
 }
 
@@ -73,10 +73,10 @@ TEST(ProtocolBaseRead, FailureLeavesTheValueAndKeepsTheDriversError) {
     protocol.readResult = 0;
     const TestTag tag("1", bytesShape(1));
     unsigned char value = 0xEE;
-    EXPECT_EQ(protocol.Read(&tag, &value), 0);
-    EXPECT_EQ(value, 0xEE);
-    EXPECT_EQ(protocol.GetLastError(), -4);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "nobody answered the read");
+    EXPECT_EQ(0, protocol.Read(&tag, &value));
+    EXPECT_EQ(0xEE, value);
+    EXPECT_EQ(-4, protocol.GetLastError());
+    EXPECT_STREQ("nobody answered the read", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseRead, RefusedConversionIsReportedAndLeavesTheValue) {
@@ -86,11 +86,11 @@ TEST(ProtocolBaseRead, RefusedConversionIsReportedAndLeavesTheValue) {
     shape.conversions = {"swap2"};
     const TestTag tag("1", shape);
     unsigned char value[3] = {0xEE, 0xEE, 0xEE};
-    EXPECT_EQ(protocol.Read(&tag, value), 0);
-    EXPECT_EQ(protocol.GetLastError(), -9);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "read conversion error");
+    EXPECT_EQ(0, protocol.Read(&tag, value));
+    EXPECT_EQ(-9, protocol.GetLastError());
+    EXPECT_STREQ("read conversion error", protocol.GetLastErrorString());
     for (unsigned char byte : value)
-        EXPECT_EQ(byte, 0xEE);
+        EXPECT_EQ(0xEE, byte);
 }
 
 TEST(ProtocolBaseRead, ConversionsRunInTheReadDirection) {
@@ -98,9 +98,9 @@ TEST(ProtocolBaseRead, ConversionsRunInTheReadDirection) {
     protocol.device = {0x34, 0x12};
     const TestTag tag("1", {ICU_Type::unsignedShort, ICU_Type::none, 2, 0, 0, {"bcd"}});
     unsigned char value[2] = {};
-    ASSERT_EQ(protocol.Read(&tag, value), 1);
-    EXPECT_EQ(value[0], 0xD2);
-    EXPECT_EQ(value[1], 0x04);
+    ASSERT_EQ(1, protocol.Read(&tag, value));
+    EXPECT_EQ(0xD2, value[0]);
+    EXPECT_EQ(0x04, value[1]);
 }
 
 TEST(ProtocolBaseRead, BitTagsAskForTheirBits) {
@@ -108,11 +108,11 @@ TEST(ProtocolBaseRead, BitTagsAskForTheirBits) {
     protocol.device = {0b10101000, 0b00000011};
     const TestTag tag("1", {ICU_Type::booleanArray, ICU_Type::boolean, 7, 0, 3});
     unsigned char value[7] = {};
-    ASSERT_EQ(protocol.Read(&tag, value), 1);
-    EXPECT_EQ(protocol.bitCounts, std::vector<int>{7});
+    ASSERT_EQ(1, protocol.Read(&tag, value));
+    EXPECT_EQ(std::vector<int>{7}, protocol.bitCounts);
     EXPECT_TRUE(protocol.readLengths.empty());
     const std::vector<unsigned char> expected{1, 0, 1, 0, 1, 1, 1};
-    EXPECT_EQ(std::vector<unsigned char>(value, value + 7), expected);
+    EXPECT_EQ(expected, std::vector<unsigned char>(value, value + 7));
 }
 
 TEST(ProtocolBaseRead, SingleBitAsksForOneBit) {
@@ -120,9 +120,9 @@ TEST(ProtocolBaseRead, SingleBitAsksForOneBit) {
     protocol.device = {0x80};
     const TestTag tag("1", {ICU_Type::boolean, ICU_Type::none, 1, 0, 7});
     unsigned char value = 0xEE;
-    ASSERT_EQ(protocol.Read(&tag, &value), 1);
-    EXPECT_EQ(protocol.bitCounts, std::vector<int>{1});
-    EXPECT_EQ(value, 1);
+    ASSERT_EQ(1, protocol.Read(&tag, &value));
+    EXPECT_EQ(std::vector<int>{1}, protocol.bitCounts);
+    EXPECT_EQ(1, value);
 }
 
 TEST(ProtocolBaseRead, OtherTagsInBitMemoryAskForEightBitsAByte) {
@@ -130,20 +130,20 @@ TEST(ProtocolBaseRead, OtherTagsInBitMemoryAskForEightBitsAByte) {
     protocol.device = {0x34, 0x12};
     const TestTag tag("1", {ICU_Type::short_, ICU_Type::none, 2});
     unsigned char value[2] = {};
-    ASSERT_EQ(protocol.Read(&tag, value), 1);
-    EXPECT_EQ(protocol.bitCounts, std::vector<int>{16});
-    EXPECT_EQ(value[0], 0x34);
-    EXPECT_EQ(value[1], 0x12);
+    ASSERT_EQ(1, protocol.Read(&tag, value));
+    EXPECT_EQ(std::vector<int>{16}, protocol.bitCounts);
+    EXPECT_EQ(0x34, value[0]);
+    EXPECT_EQ(0x12, value[1]);
 }
 
 TEST(ProtocolBaseRead, BitMemoryWithoutBitReadsFailsAndReadsNoBytes) {
     BitsWithoutBlock protocol;
     const TestTag tag("1", {ICU_Type::boolean, ICU_Type::none, 1});
     unsigned char value = 0xEE;
-    EXPECT_EQ(protocol.Read(&tag, &value), 0);
-    EXPECT_EQ(value, 0xEE);
+    EXPECT_EQ(0, protocol.Read(&tag, &value));
+    EXPECT_EQ(0xEE, value);
     EXPECT_TRUE(protocol.readLengths.empty());
-    EXPECT_EQ(protocol.GetLastError(), 1);
+    EXPECT_EQ(1, protocol.GetLastError());
 }
 
 TEST(CurrentTimeStamp, CountsMillisecondsOfTheSystemClock) {
@@ -173,11 +173,11 @@ TEST_F(ProtocolBaseTimestamp, SuccessfulReadsAreStamped) {
     protocol.device = {1, 2, 3, 4};
     EXPECT_NE(protocol.readWithTimestamp(&tag_, data_, &stamp_), 0);
     expectFresh();
-    EXPECT_EQ(data_[3], 4);
+    EXPECT_EQ(4, data_[3]);
     stamp_ = kUnstored;
     EXPECT_NE(protocol.readBlockWithTimestamp(&tag_, data_, 3, &stamp_), 0);
     expectFresh();
-    EXPECT_EQ(protocol.readLengths, (std::vector<int>{4, 3}));
+    EXPECT_EQ((std::vector<int>{4, 3}), protocol.readLengths);
 }
 
 TEST_F(ProtocolBaseTimestamp, SuccessfulBitReadIsStamped) {
@@ -185,24 +185,24 @@ TEST_F(ProtocolBaseTimestamp, SuccessfulBitReadIsStamped) {
     protocol.device = {0x05};
     EXPECT_NE(protocol.readBitBlockWithTimestamp(&tag_, data_, 3, &stamp_), 0);
     expectFresh();
-    EXPECT_EQ(protocol.bitCounts, std::vector<int>{3});
-    EXPECT_EQ(data_[0], 0x05);
+    EXPECT_EQ(std::vector<int>{3}, protocol.bitCounts);
+    EXPECT_EQ(0x05, data_[0]);
 }
 
 TEST_F(ProtocolBaseTimestamp, FailedReadsStoreNoStamp) {
     BitProtocol protocol;
     protocol.readResult = 0;
-    EXPECT_EQ(protocol.readWithTimestamp(&tag_, data_, &stamp_), 0);
-    EXPECT_EQ(protocol.readBlockWithTimestamp(&tag_, data_, 4, &stamp_), 0);
-    EXPECT_EQ(protocol.readBitBlockWithTimestamp(&tag_, data_, 4, &stamp_), 0);
-    EXPECT_EQ(stamp_, kUnstored);
+    EXPECT_EQ(0, protocol.readWithTimestamp(&tag_, data_, &stamp_));
+    EXPECT_EQ(0, protocol.readBlockWithTimestamp(&tag_, data_, 4, &stamp_));
+    EXPECT_EQ(0, protocol.readBitBlockWithTimestamp(&tag_, data_, 4, &stamp_));
+    EXPECT_EQ(kUnstored, stamp_);
 }
 
 TEST_F(ProtocolBaseTimestamp, BitReadFailsWhereThereAreNoBitReads) {
     TestProtocol protocol;
-    EXPECT_EQ(protocol.readBitBlockWithTimestamp(&tag_, data_, 4, &stamp_), 0);
-    EXPECT_EQ(stamp_, kUnstored);
-    EXPECT_EQ(protocol.GetLastError(), 1);
+    EXPECT_EQ(0, protocol.readBitBlockWithTimestamp(&tag_, data_, 4, &stamp_));
+    EXPECT_EQ(kUnstored, stamp_);
+    EXPECT_EQ(1, protocol.GetLastError());
 }
 
 TEST_F(ProtocolBaseTimestamp, RefusedConversionStoresNoStamp) {
@@ -210,9 +210,9 @@ TEST_F(ProtocolBaseTimestamp, RefusedConversionStoresNoStamp) {
     TagShape shape = bytesShape(3);
     shape.conversions = {"swap2"};
     const TestTag odd("1", shape);
-    EXPECT_EQ(protocol.readWithTimestamp(&odd, data_, &stamp_), 0);
-    EXPECT_EQ(stamp_, kUnstored);
-    EXPECT_EQ(protocol.GetLastError(), -9);
+    EXPECT_EQ(0, protocol.readWithTimestamp(&odd, data_, &stamp_));
+    EXPECT_EQ(kUnstored, stamp_);
+    EXPECT_EQ(-9, protocol.GetLastError());
 }
 
 TEST_F(ProtocolBaseTimestamp, ReadOfADerivedProtocolIsTheOneThatIsStamped) {
@@ -226,7 +226,7 @@ TEST_F(ProtocolBaseTimestamp, ReadOfADerivedProtocolIsTheOneThatIsStamped) {
     OwnRead protocol;
     EXPECT_NE(protocol.readWithTimestamp(&tag_, data_, &stamp_), 0);
     expectFresh();
-    EXPECT_EQ(data_[0], 0x42);
+    EXPECT_EQ(0x42, data_[0]);
     EXPECT_TRUE(protocol.readLengths.empty());
 }
 

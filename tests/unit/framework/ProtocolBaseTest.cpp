@@ -13,7 +13,7 @@ TEST(ProtocolBaseIdentity, EveryGenerationOfTheFamilyIsTheSameObject) {
     TestProtocol protocol;
     for (const char* face : {"ProtocolBase", "IProtocol7", "IProtocol6", "IProtocol5", "IProtocol4",
                              "IProtocol3", "IProtocol2", "IProtocol"}) {
-        EXPECT_EQ(protocol.ConvertTo(face), &protocol) << face;
+        EXPECT_EQ(&protocol, protocol.ConvertTo(face)) << face;
     }
 }
 
@@ -21,18 +21,18 @@ TEST(ProtocolBaseIdentity, OtherNamesConvertToNothing) {
     TestProtocol protocol;
     for (const char* face : {"IProtocol1", "IProtocol8", "iprotocol", "IProtocol ", " IProtocol",
                              "IInterface", "ProtgenProtocol", "TestProtocol", ""}) {
-        EXPECT_EQ(protocol.ConvertTo(face), nullptr) << '"' << face << '"';
+        EXPECT_EQ(nullptr, protocol.ConvertTo(face)) << '"' << face << '"';
     }
-    EXPECT_EQ(protocol.ConvertTo(nullptr), nullptr);
+    EXPECT_EQ(nullptr, protocol.ConvertTo(nullptr));
 }
 
 TEST(ProtocolBaseIdentity, IdentIsTheProtocolNameUntilOneIsSet) {
     TestProtocol protocol;
-    EXPECT_STREQ(protocol.GetIdent(), "TEST");
+    EXPECT_STREQ("TEST", protocol.GetIdent());
     protocol.SetIdent("line 2");
-    EXPECT_STREQ(protocol.GetIdent(), "line 2");
+    EXPECT_STREQ("line 2", protocol.GetIdent());
     protocol.SetIdent("");
-    EXPECT_STREQ(protocol.GetIdent(), "TEST");
+    EXPECT_STREQ("TEST", protocol.GetIdent());
 }
 
 TEST(ProtocolBaseIdentity, IdentIsACopyAndANullOneIsEmpty) {
@@ -40,29 +40,29 @@ TEST(ProtocolBaseIdentity, IdentIsACopyAndANullOneIsEmpty) {
     std::string ident = "panel";
     protocol.SetIdent(ident.c_str());
     ident = "other";
-    EXPECT_STREQ(protocol.GetIdent(), "panel");
+    EXPECT_STREQ("panel", protocol.GetIdent());
     protocol.SetIdent(nullptr);
-    EXPECT_STREQ(protocol.GetIdent(), "TEST");
+    EXPECT_STREQ("TEST", protocol.GetIdent());
 }
 
 TEST(ProtocolBaseIdentity, NextInstanceHasTheSameName) {
     TestProtocol protocol;
     protocol.SetIdent("line 2");
-    EXPECT_STREQ(protocol.GetNextInstanceName(), "TEST");
+    EXPECT_STREQ("TEST", protocol.GetNextInstanceName());
 }
 
 TEST(ProtocolBaseErrors, NewObjectHasCodeOneAndNoText) {
     const TestProtocol protocol;
-    EXPECT_EQ(protocol.GetLastError(), 1);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "");
+    EXPECT_EQ(1, protocol.GetLastError());
+    EXPECT_STREQ("", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseErrors, LastFailureReplacesTheOneBefore) {
     TestProtocol protocol;
     protocol.SetError(-4, "no response");
     protocol.SetError(-6, "bad reply");
-    EXPECT_EQ(protocol.GetLastError(), -6);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "bad reply");
+    EXPECT_EQ(-6, protocol.GetLastError());
+    EXPECT_STREQ("bad reply", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseErrors, SuccessLeavesTheLastFailureInPlace) {
@@ -71,8 +71,8 @@ TEST(ProtocolBaseErrors, SuccessLeavesTheLastFailureInPlace) {
     const TestTag tag("1", bytesShape(1));
     unsigned char value = 0;
     ASSERT_NE(protocol.Read(&tag, &value), 0);
-    EXPECT_EQ(protocol.GetLastError(), -4);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "no response");
+    EXPECT_EQ(-4, protocol.GetLastError());
+    EXPECT_STREQ("no response", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseErrors, TextIsACopyAndANullOneIsEmpty) {
@@ -80,24 +80,24 @@ TEST(ProtocolBaseErrors, TextIsACopyAndANullOneIsEmpty) {
     std::string text = "first";
     protocol.SetError(-1, text.c_str());
     text = "other";
-    EXPECT_STREQ(protocol.GetLastErrorString(), "first");
+    EXPECT_STREQ("first", protocol.GetLastErrorString());
     protocol.SetError(-3, nullptr);
-    EXPECT_EQ(protocol.GetLastError(), -3);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "");
+    EXPECT_EQ(-3, protocol.GetLastError());
+    EXPECT_STREQ("", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseErrors, OwnTextMayBeSetAgain) {
     TestProtocol protocol;
     protocol.SetError(-4, "no response");
     protocol.SetError(-6, protocol.GetLastErrorString());
-    EXPECT_STREQ(protocol.GetLastErrorString(), "no response");
+    EXPECT_STREQ("no response", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseErrors, LongTextIsKeptWhole) {
     TestProtocol protocol;
     const std::string text(5000, 'x');
     protocol.SetError(-1, text.c_str());
-    EXPECT_EQ(protocol.GetLastErrorString(), text);
+    EXPECT_EQ(text, protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseErrors, TagErrorNamesTheUriAndTheTagsOwnText) {
@@ -106,9 +106,9 @@ TEST(ProtocolBaseErrors, TagErrorNamesTheUriAndTheTagsOwnText) {
     tag.SetError("unknown data type");
     protocol.SetError(-4, "no response");
     protocol.SetTagError(&tag);
-    EXPECT_EQ(protocol.GetLastError(), -1);
-    EXPECT_STREQ(protocol.GetLastErrorString(),
-                 "Tag URI error: 1?HREG?400001?nonsense - unknown data type");
+    EXPECT_EQ(-1, protocol.GetLastError());
+    EXPECT_STREQ("Tag URI error: 1?HREG?400001?nonsense - unknown data type",
+                 protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseErrors, TagErrorOfATagWithoutUriLeavesItsPlaceEmpty) {
@@ -117,14 +117,14 @@ TEST(ProtocolBaseErrors, TagErrorOfATagWithoutUriLeavesItsPlaceEmpty) {
     tag.forgetUri();
     tag.SetError("broken");
     protocol.SetTagError(&tag);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "Tag URI error:  - broken");
+    EXPECT_STREQ("Tag URI error:  - broken", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseTags, UnknownUriGivesNoTagAndTheDriversError) {
     TestProtocol protocol;
-    EXPECT_EQ(protocol.CreateTag("nowhere"), nullptr);
-    EXPECT_EQ(protocol.GetLastError(), -1);
-    EXPECT_STREQ(protocol.GetLastErrorString(), "Tag URI error: no such tag");
+    EXPECT_EQ(nullptr, protocol.CreateTag("nowhere"));
+    EXPECT_EQ(-1, protocol.GetLastError());
+    EXPECT_STREQ("Tag URI error: no such tag", protocol.GetLastErrorString());
 }
 
 TEST(ProtocolBaseTags, FreedTagIsDestroyedOnceAndNotAgainWithTheObject) {
@@ -134,11 +134,11 @@ TEST(ProtocolBaseTags, FreedTagIsDestroyedOnceAndNotAgainWithTheObject) {
         protocol.knownTags["a"] = bytesShape(1);
         ITag* tag = protocol.CreateTag("a");
         ASSERT_NE(tag, nullptr);
-        EXPECT_STREQ(tag->GetVarName(), "a");
+        EXPECT_STREQ("a", tag->GetVarName());
         protocol.FreeTag(tag);
         destroyed = protocol.destroyedTags;
     }
-    EXPECT_EQ(destroyed, 1);
+    EXPECT_EQ(1, destroyed);
 }
 
 /// Counts into a place that outlives the protocol.
@@ -161,9 +161,9 @@ TEST(ProtocolBaseTags, TagsStillHeldDieWithTheObjectEachOnce) {
         protocol.CreateTag("b");
         protocol.CreateTag("c");
         protocol.FreeTag(first);
-        EXPECT_EQ(destroyed, 1);
+        EXPECT_EQ(1, destroyed);
     }
-    EXPECT_EQ(destroyed, 3);
+    EXPECT_EQ(3, destroyed);
 }
 
 TEST(ProtocolBaseTags, DeletedTagsAreDestroyedOnceAndTheObjectGoesOn) {
@@ -173,12 +173,12 @@ TEST(ProtocolBaseTags, DeletedTagsAreDestroyedOnceAndTheObjectGoesOn) {
         protocol.CreateTag("a");
         protocol.CreateTag("b");
         protocol.DeleteTags();
-        EXPECT_EQ(destroyed, 2);
+        EXPECT_EQ(2, destroyed);
         protocol.DeleteTags();
-        EXPECT_EQ(destroyed, 2);
+        EXPECT_EQ(2, destroyed);
         ASSERT_NE(protocol.CreateTag("c"), nullptr);
     }
-    EXPECT_EQ(destroyed, 3);
+    EXPECT_EQ(3, destroyed);
 }
 
 TEST(ProtocolBaseTags, TagsMayBeFreedAfterStopping) {
@@ -187,9 +187,9 @@ TEST(ProtocolBaseTags, TagsMayBeFreedAfterStopping) {
     ITag* tag = protocol.CreateTag("a");
     ASSERT_NE(protocol.Start(), 0);
     ASSERT_NE(protocol.Stop(), 0);
-    EXPECT_EQ(destroyed, 0);
+    EXPECT_EQ(0, destroyed);
     protocol.FreeTag(tag);
-    EXPECT_EQ(destroyed, 1);
+    EXPECT_EQ(1, destroyed);
 }
 
 TEST(ProtocolBaseTags, FreeingNothingIsHarmless) {
@@ -197,7 +197,7 @@ TEST(ProtocolBaseTags, FreeingNothingIsHarmless) {
     OutlivedProtocol protocol(&destroyed);
     protocol.CreateTag("a");
     protocol.FreeTag(nullptr);
-    EXPECT_EQ(destroyed, 0);
+    EXPECT_EQ(0, destroyed);
 }
 
 TEST(ProtocolBaseTags, CloneIsDestroyedByFreeTagWithoutTouchingTheOriginal) {
@@ -206,9 +206,9 @@ TEST(ProtocolBaseTags, CloneIsDestroyedByFreeTagWithoutTouchingTheOriginal) {
         OutlivedProtocol protocol(&destroyed);
         const ITag* tag = protocol.CreateTag("a");
         protocol.FreeTag(tag->Clone());
-        EXPECT_EQ(destroyed, 1);
+        EXPECT_EQ(1, destroyed);
     }
-    EXPECT_EQ(destroyed, 2);
+    EXPECT_EQ(2, destroyed);
 }
 
 }  // namespace

@@ -18,20 +18,20 @@ class NamedFields : public TestProtocol {
 TEST(ProtocolBaseUri, ProtocolWithoutNamesHasNoFields) {
     const TestProtocol protocol;
     ASSERT_NE(protocol.tagUriNames(), nullptr);
-    EXPECT_EQ(protocol.tagUriNames()[0], nullptr);
-    EXPECT_EQ(protocol.getTagUriFieldCount(), 0);
-    EXPECT_EQ(protocol.getTagUriFieldName(0), nullptr);
-    EXPECT_EQ(protocol.getTagUriFieldPosition("nodeid"), -1);
+    EXPECT_EQ(nullptr, protocol.tagUriNames()[0]);
+    EXPECT_EQ(0, protocol.getTagUriFieldCount());
+    EXPECT_EQ(nullptr, protocol.getTagUriFieldName(0));
+    EXPECT_EQ(-1, protocol.getTagUriFieldPosition("nodeid"));
 }
 
 TEST(ProtocolBaseUri, FieldNamesEndAtTheirCount) {
     const NamedFields protocol;
-    EXPECT_EQ(protocol.getTagUriFieldCount(), 3);
-    EXPECT_STREQ(protocol.getTagUriFieldName(0), "nodeid");
-    EXPECT_STREQ(protocol.getTagUriFieldName(1), "area");
-    EXPECT_STREQ(protocol.getTagUriFieldName(2), "offset");
+    EXPECT_EQ(3, protocol.getTagUriFieldCount());
+    EXPECT_STREQ("nodeid", protocol.getTagUriFieldName(0));
+    EXPECT_STREQ("area", protocol.getTagUriFieldName(1));
+    EXPECT_STREQ("offset", protocol.getTagUriFieldName(2));
     for (int index : {-1, 3, 4, 1000, -2147483647 - 1, 2147483647})
-        EXPECT_EQ(protocol.getTagUriFieldName(index), nullptr) << index;
+        EXPECT_EQ(nullptr, protocol.getTagUriFieldName(index)) << index;
 }
 
 TEST(ProtocolBaseUri, FieldPositionsComeFromExactNames) {
@@ -41,7 +41,7 @@ TEST(ProtocolBaseUri, FieldPositionsComeFromExactNames) {
         {"node", -1},  {"nodeid2", -1}, {"", -1},      {nullptr, -1},
     };
     for (const auto& [name, position] : rows)
-        EXPECT_EQ(protocol.getTagUriFieldPosition(name), position) << (name ? name : "null");
+        EXPECT_EQ(position, protocol.getTagUriFieldPosition(name)) << (name ? name : "null");
 }
 
 struct UriRow {
@@ -76,12 +76,12 @@ TEST(ProtocolBaseUri, FieldsAreCutAtEveryQuestionMark) {
         const char* field = protocol.getTagUriField(&tag, row.index, &length);
         SCOPED_TRACE(std::string(row.uri) + " field " + std::to_string(row.index));
         if (row.field == nullptr) {
-            EXPECT_EQ(field, nullptr);
-            EXPECT_EQ(length, -77);
+            EXPECT_EQ(nullptr, field);
+            EXPECT_EQ(-77, length);
             continue;
         }
         ASSERT_NE(field, nullptr);
-        EXPECT_EQ(std::string(field, static_cast<std::size_t>(length)), row.field);
+        EXPECT_EQ(row.field, std::string(field, static_cast<std::size_t>(length)));
     }
 }
 
@@ -89,8 +89,8 @@ TEST(ProtocolBaseUri, FieldPointsIntoTheTagsOwnText) {
     const NamedFields protocol;
     const TestTag tag("1?HREG?400001", bytesShape(1));
     int length = 0;
-    EXPECT_EQ(protocol.getTagUriField(&tag, 1, &length), tag.GetVarName() + 2);
-    EXPECT_EQ(length, 4);
+    EXPECT_EQ(tag.GetVarName() + 2, protocol.getTagUriField(&tag, 1, &length));
+    EXPECT_EQ(4, length);
 }
 
 TEST(ProtocolBaseUri, TagWithoutUriHasNoFields) {
@@ -98,8 +98,8 @@ TEST(ProtocolBaseUri, TagWithoutUriHasNoFields) {
     TestTag tag("1?HREG", bytesShape(1));
     tag.forgetUri();
     int length = -77;
-    EXPECT_EQ(protocol.getTagUriField(&tag, 0, &length), nullptr);
-    EXPECT_EQ(length, -77);
+    EXPECT_EQ(nullptr, protocol.getTagUriField(&tag, 0, &length));
+    EXPECT_EQ(-77, length);
 }
 
 }  // namespace

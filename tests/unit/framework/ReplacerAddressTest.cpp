@@ -17,14 +17,14 @@ class ReplacerAddress : public ReplacerTest {
 };
 
 TEST_F(ReplacerAddress, KeysBeginWithTheirPrefix) {
-    EXPECT_EQ(replacer_.getPrefix(), "tempNode");
+    EXPECT_EQ("tempNode", replacer_.getPrefix());
 }
 
 TEST_F(ReplacerAddress, AddressesAreWrittenInDecimal) {
-    EXPECT_EQ(replacer_.toString(0), "0");
-    EXPECT_EQ(replacer_.toString(247), "247");
-    EXPECT_EQ(replacer_.toString(-5), "-5");
-    EXPECT_EQ(replacer_.toString(std::numeric_limits<int>::min()), "-2147483648");
+    EXPECT_EQ("0", replacer_.toString(0));
+    EXPECT_EQ("247", replacer_.toString(247));
+    EXPECT_EQ("-5", replacer_.toString(-5));
+    EXPECT_EQ("-2147483648", replacer_.toString(std::numeric_limits<int>::min()));
 }
 
 TEST_F(ReplacerAddress, TextsAreReadWithAutomaticBase) {
@@ -46,22 +46,22 @@ TEST_F(ReplacerAddress, TextsAreReadWithAutomaticBase) {
         {"-99999999999", -2147483647 - 1},
     };
     for (const auto& [text, value] : rows)
-        EXPECT_EQ(replacer_.fromString(text), value) << text;
+        EXPECT_EQ(value, replacer_.fromString(text)) << text;
 }
 
 TEST_F(ReplacerAddress, UnlistedAddressesStandForThemselves) {
-    EXPECT_EQ(replacer_.replacementOf(5), 5);
+    EXPECT_EQ(5, replacer_.replacementOf(5));
     replacer_.setValue(5, 9, nullptr);
-    EXPECT_EQ(replacer_.replacementOf(5), 9);
-    EXPECT_EQ(replacer_.replacementOf(9), 9);
-    EXPECT_EQ(replacer_.replacementOf(6), 6);
+    EXPECT_EQ(9, replacer_.replacementOf(5));
+    EXPECT_EQ(9, replacer_.replacementOf(9));
+    EXPECT_EQ(6, replacer_.replacementOf(6));
 }
 
 TEST_F(ReplacerAddress, OverrideIsRecordedAndPersisted) {
     replacer_.setValue(12, 7, "MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{12, 7}}));
-    EXPECT_EQ(storage_.calls(), std::vector<std::string>{"writeString(MRTU, tempNode12, 7)"});
-    EXPECT_EQ(stored("tempNode12"), "text:7");
+    EXPECT_EQ((Pairs{{12, 7}}), replacer_.replacements());
+    EXPECT_EQ(std::vector<std::string>{"writeString(MRTU, tempNode12, 7)"}, storage_.calls());
+    EXPECT_EQ("text:7", stored("tempNode12"));
 }
 
 TEST_F(ReplacerAddress, PairsStandInOrderOfInsertionOneForEachAddress) {
@@ -69,29 +69,29 @@ TEST_F(ReplacerAddress, PairsStandInOrderOfInsertionOneForEachAddress) {
     replacer_.setValue(3, 2, "MRTU");
     replacer_.setValue(9, 4, "MRTU");
     replacer_.setValue(1, 9, "MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{9, 4}, {3, 2}, {1, 9}}));
-    EXPECT_EQ(stored("tempNode9"), "text:4");
+    EXPECT_EQ((Pairs{{9, 4}, {3, 2}, {1, 9}}), replacer_.replacements());
+    EXPECT_EQ("text:4", stored("tempNode9"));
 }
 
 TEST_F(ReplacerAddress, ReplacingAnAddressByItselfRemovesTheKeyAndKeepsThePair) {
     replacer_.setValue(7, 9, "MRTU");
-    ASSERT_EQ(stored("tempNode7"), "text:9");
+    ASSERT_EQ("text:9", stored("tempNode7"));
     replacer_.setValue(7, 7, "MRTU");
-    EXPECT_EQ(stored("tempNode7"), "none");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{7, 7}}));
-    EXPECT_EQ(storage_.count("removeKey"), 1);
+    EXPECT_EQ("none", stored("tempNode7"));
+    EXPECT_EQ((Pairs{{7, 7}}), replacer_.replacements());
+    EXPECT_EQ(1, storage_.count("removeKey"));
 }
 
 TEST_F(ReplacerAddress, ReplacingANewAddressByItselfIsListedToo) {
     replacer_.setValue(5, 5, "MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{5, 5}}));
-    EXPECT_EQ(storage_.calls(), std::vector<std::string>{"removeKey(MRTU, tempNode5)"});
+    EXPECT_EQ((Pairs{{5, 5}}), replacer_.replacements());
+    EXPECT_EQ(std::vector<std::string>{"removeKey(MRTU, tempNode5)"}, storage_.calls());
 }
 
 TEST_F(ReplacerAddress, WithoutSectionTheOverrideLivesInMemoryOnly) {
     replacer_.setValue(5, 9, nullptr);
     replacer_.setValue(6, 6, nullptr);
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{5, 9}, {6, 6}}));
+    EXPECT_EQ((Pairs{{5, 9}, {6, 6}}), replacer_.replacements());
     EXPECT_TRUE(storage_.calls().empty());
 }
 
@@ -100,7 +100,7 @@ TEST_F(ReplacerAddress, WithoutStorageTheOverrideLivesInMemoryOnly) {
     replacer_.setValue(5, 9, "MRTU");
     replacer_.setValue(6, 6, "MRTU");
     replacer_.restore("MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{5, 9}, {6, 6}}));
+    EXPECT_EQ((Pairs{{5, 9}, {6, 6}}), replacer_.replacements());
 }
 
 }  // namespace

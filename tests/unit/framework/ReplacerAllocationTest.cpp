@@ -27,9 +27,9 @@ TEST_F(ReplacerAllocation, CachedParametersAreFoundWithoutTheHeap) {
         replacer.get(kName, 247, true, modicon);
         replacer.get("baud", -1, 9600, baud);
     }
-    EXPECT_EQ(cached.allocations(), 0u);
+    EXPECT_EQ(0u, cached.allocations());
     EXPECT_TRUE(modicon);
-    EXPECT_EQ(baud, 9600);
+    EXPECT_EQ(9600, baud);
 }
 
 TEST_F(ReplacerAllocation, ReplacedAddressesAreFoundWithoutTheHeap) {
@@ -38,8 +38,8 @@ TEST_F(ReplacerAllocation, ReplacedAddressesAreFoundWithoutTheHeap) {
         replacer.setValue(node, node + 1, nullptr);
     AllocationCounter counter;
     for (int node = 1; node < 248; ++node)
-        EXPECT_EQ(replacer.replacementOf(node), node + 1);
-    EXPECT_EQ(counter.allocations(), 0u);
+        EXPECT_EQ(node + 1, replacer.replacementOf(node));
+    EXPECT_EQ(0u, counter.allocations());
 }
 
 }  // namespace

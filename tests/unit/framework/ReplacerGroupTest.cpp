@@ -12,7 +12,7 @@ TEST(ReplacerGroup, NothingStagedLeavesTheOutputUntouched) {
     const GroupParameterReplacer staging;
     int value = 4711;
     EXPECT_FALSE(staging.get("baud", -1, value));
-    EXPECT_EQ(value, 4711);
+    EXPECT_EQ(4711, value);
 }
 
 TEST(ReplacerGroup, StagedValueIsRead) {
@@ -20,7 +20,7 @@ TEST(ReplacerGroup, StagedValueIsRead) {
     staging.set("baud", -1, 38400);
     int value = 0;
     EXPECT_TRUE(staging.get("baud", -1, value));
-    EXPECT_EQ(value, 38400);
+    EXPECT_EQ(38400, value);
 }
 
 TEST(ReplacerGroup, LaterValueReplacesTheEarlier) {
@@ -29,22 +29,22 @@ TEST(ReplacerGroup, LaterValueReplacesTheEarlier) {
     staging.set("baud", -1, 1200);
     int value = 0;
     EXPECT_TRUE(staging.get("baud", -1, value));
-    EXPECT_EQ(value, 1200);
-    EXPECT_EQ(staging.staged().size(), 1u);
+    EXPECT_EQ(1200, value);
+    EXPECT_EQ(1u, staging.staged().size());
 }
 
 TEST(ReplacerGroup, GroupStandsBehindTheNameWithoutSeparator) {
     GroupParameterReplacer staging;
     staging.set("baud", 3, 1200);
-    ASSERT_EQ(staging.staged().count("baud3"), 1u);
+    ASSERT_EQ(1u, staging.staged().count("baud3"));
     int value = 0;
     EXPECT_TRUE(staging.get("baud", 3, value));
-    EXPECT_EQ(value, 1200);
+    EXPECT_EQ(1200, value);
     EXPECT_TRUE(staging.get("baud3", -1, value));
     value = 4711;
     EXPECT_FALSE(staging.get("baud", -1, value));
     EXPECT_FALSE(staging.get("baud", 4, value));
-    EXPECT_EQ(value, 4711);
+    EXPECT_EQ(4711, value);
 }
 
 TEST(ReplacerGroup, EntryKeepsThePlainNameAndTheGroup) {
@@ -52,14 +52,14 @@ TEST(ReplacerGroup, EntryKeepsThePlainNameAndTheGroup) {
     staging.set("stop", 12, 2);
     staging.set("mode", -1, 1);
     const GroupParameterReplacer::Variant grouped = staging.staged().at("stop12");
-    EXPECT_EQ(grouped.type, ParameterReplacer::integer);
-    EXPECT_EQ(grouped.name, "stop");
+    EXPECT_EQ(ParameterReplacer::integer, grouped.type);
+    EXPECT_EQ("stop", grouped.name);
     EXPECT_FALSE(grouped.boolValue);
-    EXPECT_EQ(grouped.intValue, 2);
-    EXPECT_EQ(grouped.stringValue, "");
-    EXPECT_EQ(grouped.group, 12);
-    EXPECT_EQ(staging.staged().at("mode").name, "mode");
-    EXPECT_EQ(staging.staged().at("mode").group, -1);
+    EXPECT_EQ(2, grouped.intValue);
+    EXPECT_EQ("", grouped.stringValue);
+    EXPECT_EQ(12, grouped.group);
+    EXPECT_EQ("mode", staging.staged().at("mode").name);
+    EXPECT_EQ(-1, staging.staged().at("mode").group);
 }
 
 TEST(ReplacerGroup, EntriesStandInKeyOrder) {
@@ -69,7 +69,7 @@ TEST(ReplacerGroup, EntriesStandInKeyOrder) {
     std::vector<std::string> keys;
     for (const auto& [key, value] : staging.staged())
         keys.push_back(key);
-    EXPECT_EQ(keys, (std::vector<std::string>{"Baud", "baud", "mode", "parity", "stop"}));
+    EXPECT_EQ((std::vector<std::string>{"Baud", "baud", "mode", "parity", "stop"}), keys);
 }
 
 }  // namespace

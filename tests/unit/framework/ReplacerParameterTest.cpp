@@ -52,24 +52,24 @@ TEST_F(ReplacerParameter, FullNameCarriesTheNodeUnlessItIsMinusOne) {
         {"", -1, ""},
     };
     for (const Row& row : rows)
-        EXPECT_EQ(ParameterReplacer::makeFullName(row.name, row.node), row.full);
+        EXPECT_EQ(row.full, ParameterReplacer::makeFullName(row.name, row.node));
 }
 
 TEST_F(ReplacerParameter, NewVariantIsAFalseBoolean) {
     const ParameterReplacer::Variant value;
-    EXPECT_EQ(value.type, 0);
+    EXPECT_EQ(0, value.type);
     EXPECT_FALSE(value.boolValue);
-    EXPECT_EQ(value.intValue, 0);
-    EXPECT_EQ(value.stringValue, "");
+    EXPECT_EQ(0, value.intValue);
+    EXPECT_EQ("", value.stringValue);
 }
 
 TEST_F(ReplacerParameter, SectionIsKept) {
-    EXPECT_EQ(replacer_.section(), "MRTU");
+    EXPECT_EQ("MRTU", replacer_.section());
 }
 
 TEST_F(ReplacerParameter, FirstDefaultDecidesWhereNothingIsStored) {
-    EXPECT_EQ(number("baud", 9600), 9600);
-    EXPECT_EQ(number("baud", 19200), 9600);
+    EXPECT_EQ(9600, number("baud", 9600));
+    EXPECT_EQ(9600, number("baud", 19200));
     EXPECT_TRUE(flag("ModiconMode", 3, true));
     EXPECT_TRUE(flag("ModiconMode", 3, false));
 }
@@ -77,26 +77,26 @@ TEST_F(ReplacerParameter, FirstDefaultDecidesWhereNothingIsStored) {
 TEST_F(ReplacerParameter, StoredValueWinsOverTheDefault) {
     contents_.put("MRTU", "baud", 38400);
     contents_.put("MRTU", "node3_ModiconMode", false);
-    EXPECT_EQ(number("baud", 9600), 38400);
+    EXPECT_EQ(38400, number("baud", 9600));
     EXPECT_FALSE(flag("ModiconMode", 3, true));
 }
 
 TEST_F(ReplacerParameter, StorageIsConsultedOnce) {
     contents_.put("MRTU", "baud", 38400);
-    EXPECT_EQ(number("baud", 9600), 38400);
+    EXPECT_EQ(38400, number("baud", 9600));
     contents_.put("MRTU", "baud", 1200);
     storage_.forget();
-    EXPECT_EQ(number("baud", 9600), 38400);
+    EXPECT_EQ(38400, number("baud", 9600));
     EXPECT_TRUE(storage_.calls().empty());
 }
 
 TEST_F(ReplacerParameter, MissingKeyIsAskedForOnceAndNotRead) {
-    EXPECT_EQ(number("stop", 2), 2);
+    EXPECT_EQ(2, number("stop", 2));
     const std::vector<std::string> calls{"hasKey(MRTU, stop)"};
-    EXPECT_EQ(storage_.calls(), calls);
+    EXPECT_EQ(calls, storage_.calls());
     contents_.put("MRTU", "stop", 1);
-    EXPECT_EQ(number("stop", 2), 2);
-    EXPECT_EQ(storage_.calls(), calls);
+    EXPECT_EQ(2, number("stop", 2));
+    EXPECT_EQ(calls, storage_.calls());
 }
 
 TEST_F(ReplacerParameter, EachFormReadsItsOwnType) {
@@ -104,10 +104,10 @@ TEST_F(ReplacerParameter, EachFormReadsItsOwnType) {
     contents_.put("MRTU", "node5_ModiconMode", true);
     number("baud", 9600);
     flag("ModiconMode", 5, false);
-    EXPECT_EQ(storage_.calls(),
-              (std::vector<std::string>{"hasKey(MRTU, baud)", "readInt(MRTU, baud)",
+    EXPECT_EQ((std::vector<std::string>{"hasKey(MRTU, baud)", "readInt(MRTU, baud)",
                                         "hasKey(MRTU, node5_ModiconMode)",
-                                        "readBool(MRTU, node5_ModiconMode)"}));
+                                        "readBool(MRTU, node5_ModiconMode)"}),
+              storage_.calls());
 }
 
 TEST_F(ReplacerParameter, NodesHaveValuesOfTheirOwn) {
@@ -119,34 +119,34 @@ TEST_F(ReplacerParameter, NodesHaveValuesOfTheirOwn) {
 
 TEST_F(ReplacerParameter, SectionsAreTakenFromTheReplacer) {
     contents_.put("other", "baud", 1200);
-    EXPECT_EQ(number("baud", 9600), 9600);
+    EXPECT_EQ(9600, number("baud", 9600));
     ParameterReplacer other;
     other.setSection("other");
     int value = 0;
     other.get("baud", -1, 9600, value);
-    EXPECT_EQ(value, 1200);
+    EXPECT_EQ(1200, value);
 }
 
 TEST_F(ReplacerParameter, NewSectionKeepsCachedValues) {
-    EXPECT_EQ(number("baud", 9600), 9600);
+    EXPECT_EQ(9600, number("baud", 9600));
     contents_.put("other", "baud", 1200);
     replacer_.setSection("other");
-    EXPECT_EQ(number("baud", 300), 9600);
+    EXPECT_EQ(9600, number("baud", 300));
 }
 
 TEST_F(ReplacerParameter, WithoutStorageDefaultsAreCached) {
     useNoStorage();
-    EXPECT_EQ(number("baud", 9600), 9600);
+    EXPECT_EQ(9600, number("baud", 9600));
     piPermanentStorage = &storage_;
     contents_.put("MRTU", "baud", 1200);
-    EXPECT_EQ(number("baud", 300), 9600);
+    EXPECT_EQ(9600, number("baud", 300));
 }
 
 TEST_F(ReplacerParameter, ExplicitValueReplacesTheCachedOneInMemoryOnly) {
-    EXPECT_EQ(number("baud", 9600), 9600);
+    EXPECT_EQ(9600, number("baud", 9600));
     storage_.forget();
     replacer_.set("baud", ofType(ParameterReplacer::integer));
-    EXPECT_EQ(number("baud", 9600), 42);
+    EXPECT_EQ(42, number("baud", 9600));
     EXPECT_TRUE(storage_.calls().empty());
 }
 
@@ -161,7 +161,7 @@ TEST_F(ReplacerParameter, EachFormTakesItsOwnFieldOfAnEntry) {
     value.type = ParameterReplacer::boolean;
     value.boolValue = true;
     replacer_.set("mixed", value);
-    EXPECT_EQ(number("mixed", 9600), 0);
+    EXPECT_EQ(0, number("mixed", 9600));
     EXPECT_TRUE(flag("mixed", -1, false));
 }
 
@@ -169,10 +169,10 @@ TEST_F(ReplacerParameter, ValuesArePersistedByType) {
     replacer_.persist("flag", ofType(ParameterReplacer::boolean));
     replacer_.persist("number", ofType(ParameterReplacer::integer));
     replacer_.persist("name", ofType(ParameterReplacer::text));
-    EXPECT_EQ(stored("flag"), "bool:true");
-    EXPECT_EQ(stored("number"), "int:42");
-    EXPECT_EQ(stored("name"), "text:text");
-    EXPECT_EQ(storage_.calls().size(), 3u);
+    EXPECT_EQ("bool:true", stored("flag"));
+    EXPECT_EQ("int:42", stored("number"));
+    EXPECT_EQ("text:text", stored("name"));
+    EXPECT_EQ(3u, storage_.calls().size());
 }
 
 TEST_F(ReplacerParameter, OtherTypesAreNotPersisted) {
@@ -183,31 +183,31 @@ TEST_F(ReplacerParameter, OtherTypesAreNotPersisted) {
 
 TEST_F(ReplacerParameter, PersistedValueIsNotCached) {
     replacer_.persist("baud", ofType(ParameterReplacer::integer));
-    EXPECT_EQ(number("baud", 9600), 42);  // found in the storage at the first look-up
+    EXPECT_EQ(42, number("baud", 9600));  // found in the storage at the first look-up
     replacer_.persist("baud", ofType(ParameterReplacer::text));
-    EXPECT_EQ(number("baud", 9600), 42);
+    EXPECT_EQ(42, number("baud", 9600));
 }
 
 TEST_F(ReplacerParameter, PersistingWithoutStorageIsHarmless) {
     useNoStorage();
     replacer_.persist("baud", ofType(ParameterReplacer::integer));
-    EXPECT_EQ(stored("baud"), "none");
+    EXPECT_EQ("none", stored("baud"));
 }
 
 TEST_F(ReplacerParameter, NamesOfAnyLengthAreKeptApart) {
     for (std::size_t length : {1u, 111u, 112u, 113u, 128u, 500u}) {
         const std::string name(length, 'n');
         contents_.put("MRTU", "node-2147483648_" + name, static_cast<int>(length));
-        EXPECT_EQ(number(name, -1, std::numeric_limits<int>::min()), static_cast<int>(length));
-        EXPECT_EQ(number(name, -7), -7) << length;
-        EXPECT_EQ(number(name, -8, std::numeric_limits<int>::min()), static_cast<int>(length));
+        EXPECT_EQ(static_cast<int>(length), number(name, -1, std::numeric_limits<int>::min()));
+        EXPECT_EQ(-7, number(name, -7)) << length;
+        EXPECT_EQ(static_cast<int>(length), number(name, -8, std::numeric_limits<int>::min()));
     }
 }
 
 TEST_F(ReplacerParameter, PlainStorageServesAsWell) {
     usePlainStorage();
     contents_.put("MRTU", "baud", 38400);
-    EXPECT_EQ(number("baud", 9600), 38400);
+    EXPECT_EQ(38400, number("baud", 9600));
 }
 
 }  // namespace

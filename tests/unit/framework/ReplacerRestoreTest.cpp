@@ -33,13 +33,13 @@ TEST_P(ReplacerRestore, EveryOverrideOfTheSectionIsRecorded) {
     contents_.put("MRTU", "tempNode3", std::string("255"));
     contents_.put("other", "tempNode4", std::string("9"));
     replacer_.restore("MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{12, 7}, {3, 255}}));
+    EXPECT_EQ((Pairs{{12, 7}, {3, 255}}), replacer_.replacements());
 }
 
 TEST_P(ReplacerRestore, AddressAndReplacementHaveAutomaticBase) {
     contents_.put("MRTU", "tempNode0x0A", std::string("017"));
     replacer_.restore("MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{10, 15}}));
+    EXPECT_EQ((Pairs{{10, 15}}), replacer_.replacements());
 }
 
 TEST_P(ReplacerRestore, KeysWithoutThePrefixAreIgnoredAndNotRead) {
@@ -50,7 +50,7 @@ TEST_P(ReplacerRestore, KeysWithoutThePrefixAreIgnoredAndNotRead) {
     contents_.put("MRTU", " tempNode4", std::string("1"));
     replacer_.restore("MRTU");
     EXPECT_TRUE(replacer_.replacements().empty());
-    EXPECT_EQ(storage_.count("readStringInto") + plainStorage_.count("readString"), 0);
+    EXPECT_EQ(0, storage_.count("readStringInto") + plainStorage_.count("readString"));
 }
 
 TEST_P(ReplacerRestore, UnreadableNumbersAreZero) {
@@ -58,7 +58,7 @@ TEST_P(ReplacerRestore, UnreadableNumbersAreZero) {
     contents_.put("MRTU", "tempNode8", std::string("abc"));
     contents_.put("MRTU", "tempNode9", 7);  // no text
     replacer_.restore("MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{0, 5}, {8, 0}, {9, 0}}));
+    EXPECT_EQ((Pairs{{0, 5}, {8, 0}, {9, 0}}), replacer_.replacements());
 }
 
 TEST_P(ReplacerRestore, StoredValuesOverwriteAndOtherPairsStay) {
@@ -66,7 +66,7 @@ TEST_P(ReplacerRestore, StoredValuesOverwriteAndOtherPairsStay) {
     replacer_.setValue(6, 2, nullptr);
     contents_.put("MRTU", "tempNode6", std::string("9"));
     replacer_.restore("MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{5, 1}, {6, 9}}));
+    EXPECT_EQ((Pairs{{5, 1}, {6, 9}}), replacer_.replacements());
 }
 
 TEST_P(ReplacerRestore, NothingIsWrittenBack) {
@@ -74,8 +74,8 @@ TEST_P(ReplacerRestore, NothingIsWrittenBack) {
     contents_.put("MRTU", "tempNode7", std::string("8"));
     replacer_.restore("MRTU");
     for (const char* operation : {"writeString", "writeInt", "writeBool", "removeKey"})
-        EXPECT_EQ(storage_.count(operation) + plainStorage_.count(operation), 0) << operation;
-    EXPECT_EQ(stored("tempNode6"), "text:6");
+        EXPECT_EQ(0, storage_.count(operation) + plainStorage_.count(operation)) << operation;
+    EXPECT_EQ("text:6", stored("tempNode6"));
 }
 
 TEST_P(ReplacerRestore, WithoutSectionNothingHappens) {
@@ -90,15 +90,15 @@ TEST_P(ReplacerRestore, PersistedOverridesComeBack) {
     replacer_.setValue(14, 14, "MRTU");
     AddressReplacerID restarted;
     restarted.restore("MRTU");
-    EXPECT_EQ(restarted.replacements(), (Pairs{{12, 7}, {13, 0}}));
+    EXPECT_EQ((Pairs{{12, 7}, {13, 0}}), restarted.replacements());
 }
 
 TEST_F(ReplacerRestoreDetail, CopyingReadsGet256BytesEach) {
     contents_.put("MRTU", "tempNode6", std::string("9"));
     replacer_.restore("MRTU");
-    EXPECT_EQ(storage_.calls(),
-              (std::vector<std::string>{"keyCount(MRTU)", "keyNameInto(MRTU, 0, 256)",
-                                        "readStringInto(MRTU, tempNode6, 256)"}));
+    EXPECT_EQ((std::vector<std::string>{"keyCount(MRTU)", "keyNameInto(MRTU, 0, 256)",
+                                        "readStringInto(MRTU, tempNode6, 256)"}),
+              storage_.calls());
 }
 
 TEST_F(ReplacerRestoreDetail, RefusedKeyNamesAreEmptyAndSkipped) {
@@ -113,7 +113,7 @@ TEST_F(ReplacerRestoreDetail, TextTooLongForTheBufferIsEmpty) {
     contents_.put("MRTU", "tempNode7", std::string(254, ' ') + "9");
     contents_.put("MRTU", "tempNode8" + std::string(300, '8'), std::string("9"));
     replacer_.restore("MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{6, 0}, {7, 9}}));
+    EXPECT_EQ((Pairs{{6, 0}, {7, 9}}), replacer_.replacements());
 }
 
 /// A storage that offers its copying reads with every other query only. A copy that fails leaves
@@ -149,11 +149,11 @@ TEST_F(ReplacerRestoreDetail, ExtensionIsAskedForWithEveryKey) {
     for (int node : {1, 2, 3, 4})
         contents_.put("MRTU", "tempNode" + std::to_string(node), std::string("9"));
     replacer_.restore("MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{1, 9}, {2, 9}, {3, 9}, {4, 9}}));
-    EXPECT_EQ(moody.queries, 4);
-    EXPECT_EQ(moody.copiedKeys, 2);
-    EXPECT_EQ(moody.count("keyName"), 2);
-    EXPECT_EQ(moody.count("readString"), 2);
+    EXPECT_EQ((Pairs{{1, 9}, {2, 9}, {3, 9}, {4, 9}}), replacer_.replacements());
+    EXPECT_EQ(4, moody.queries);
+    EXPECT_EQ(2, moody.copiedKeys);
+    EXPECT_EQ(2, moody.count("keyName"));
+    EXPECT_EQ(2, moody.count("readString"));
 }
 
 TEST_F(ReplacerRestoreDetail, CutTextOfAFailedCopyIsNotUsed) {
@@ -162,8 +162,8 @@ TEST_F(ReplacerRestoreDetail, CutTextOfAFailedCopyIsNotUsed) {
     contents_.put("MRTU", "tempNode1", std::string("9"));
     contents_.put("MRTU", "tempNode2", "9" + std::string(300, ' '));
     replacer_.restore("MRTU");
-    EXPECT_EQ(moody.copiedKeys, 1);
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{1, 9}, {2, 0}}));
+    EXPECT_EQ(1, moody.copiedKeys);
+    EXPECT_EQ((Pairs{{1, 9}, {2, 0}}), replacer_.replacements());
 }
 
 /// Answers null where a text is due.
@@ -184,7 +184,7 @@ TEST_F(ReplacerRestoreDetail, NullTextsCountAsEmpty) {
     contents_.put("MRTU", "tempNode1", std::string("9"));
     contents_.put("MRTU", "tempNode2", std::string("9"));
     replacer_.restore("MRTU");
-    EXPECT_EQ(replacer_.replacements(), (Pairs{{2, 0}}));
+    EXPECT_EQ((Pairs{{2, 0}}), replacer_.replacements());
 }
 
 }  // namespace

@@ -33,14 +33,14 @@ TEST(TagBase, IsReadAndWritable) {
     const ValueTag tag("int");
     EXPECT_FALSE(tag.IsReadOnly());
     EXPECT_FALSE(tag.IsWriteOnly());
-    EXPECT_STREQ(tag.GetError(), "");
+    EXPECT_STREQ("", tag.GetError());
 }
 
 TEST(TagBase, KeepsAnErrorTextThoughConstant) {
     const ValueTag tag("int");
     tag.SetError("first");
     tag.SetError("second");
-    EXPECT_STREQ(tag.GetError(), "second");
+    EXPECT_STREQ("second", tag.GetError());
 }
 
 TEST(PackedLen, IsTheLengthExceptForBits) {
@@ -55,31 +55,31 @@ TEST(PackedLen, IsTheLengthExceptForBits) {
         {"boolean-2", 7, 2}, {"boolean-0", 3, 1}, {"object", 0, 0},
     };
     for (const Row& row : rows) {
-        EXPECT_EQ(ValueTag(row.type, 0, row.bitIndex).PackedLen(), row.packed) << row.type;
+        EXPECT_EQ(row.packed, ValueTag(row.type, 0, row.bitIndex).PackedLen()) << row.type;
     }
 }
 
 TEST(Convert, CopiesBytesWithoutConversions) {
     const ValueTag tag("int");
-    EXPECT_EQ(Convert(tag, {1, 2, 3, 4}, kRead, Bytes(5, 0xEE)), (Bytes{1, 2, 3, 4, 0xEE}));
-    EXPECT_EQ(Convert(tag, {1, 2, 3, 4}, kWrite, Bytes(5, 0xEE)), (Bytes{1, 2, 3, 4, 0xEE}));
+    EXPECT_EQ((Bytes{1, 2, 3, 4, 0xEE}), Convert(tag, {1, 2, 3, 4}, kRead, Bytes(5, 0xEE)));
+    EXPECT_EQ((Bytes{1, 2, 3, 4, 0xEE}), Convert(tag, {1, 2, 3, 4}, kWrite, Bytes(5, 0xEE)));
 }
 
 TEST(Convert, UnpacksBitsOnARead) {
     const ValueTag tag("boolean-5", 0, 6);
-    EXPECT_EQ(Convert(tag, {0x40, 0x05}, kRead, Bytes(6, 0xEE)), (Bytes{1, 0, 1, 0, 1, 0xEE}));
+    EXPECT_EQ((Bytes{1, 0, 1, 0, 1, 0xEE}), Convert(tag, {0x40, 0x05}, kRead, Bytes(6, 0xEE)));
 }
 
 TEST(Convert, LeavesOtherBitsOnAWrite) {
     const ValueTag tag("boolean-3", 0, 6);
-    EXPECT_EQ(Convert(tag, {1, 0, 9}, kWrite, {0x00, 0x00}), (Bytes{0x40, 0x01}));
-    EXPECT_EQ(Convert(tag, {1, 0, 9}, kWrite, {0xFF, 0xFF}), (Bytes{0x7F, 0xFF}));
+    EXPECT_EQ((Bytes{0x40, 0x01}), Convert(tag, {1, 0, 9}, kWrite, {0x00, 0x00}));
+    EXPECT_EQ((Bytes{0x7F, 0xFF}), Convert(tag, {1, 0, 9}, kWrite, {0xFF, 0xFF}));
 }
 
 TEST(Convert, InvertsBits) {
     const ValueTag tag("boolean-3(inv)");
-    EXPECT_EQ(Convert(tag, {0x05}, kRead, Bytes(3, 0xEE)), (Bytes{0, 1, 0}));
-    EXPECT_EQ(Convert(tag, {1, 0, 1}, kWrite, {0xF8}), (Bytes{0xFA}));
+    EXPECT_EQ((Bytes{0, 1, 0}), Convert(tag, {0x05}, kRead, Bytes(3, 0xEE)));
+    EXPECT_EQ((Bytes{0xFA}), Convert(tag, {1, 0, 1}, kWrite, {0xF8}));
 }
 
 // Records the order of the conversions.
@@ -98,22 +98,22 @@ class RecordingTag : public ValueTag {
 
 TEST(Convert, GoesThroughTheListBackwardsOnARead) {
     const RecordingTag tag("int(swap2,swap4)");
-    EXPECT_EQ(Convert(tag, {1, 2, 3, 4}, kRead, Bytes(4)), (Bytes{3, 4, 1, 2}));
-    EXPECT_EQ(tag.calls(), "<swap4<swap2");
+    EXPECT_EQ((Bytes{3, 4, 1, 2}), Convert(tag, {1, 2, 3, 4}, kRead, Bytes(4)));
+    EXPECT_EQ("<swap4<swap2", tag.calls());
 }
 
 TEST(Convert, GoesThroughTheListForwardsOnAWrite) {
     const RecordingTag tag("short(bcd,swap2)");
-    EXPECT_EQ(Convert(tag, {0xD2, 0x04}, kWrite, Bytes(2)), (Bytes{0x12, 0x34}));
-    EXPECT_EQ(tag.calls(), ">bcd>swap2");
+    EXPECT_EQ((Bytes{0x12, 0x34}), Convert(tag, {0xD2, 0x04}, kWrite, Bytes(2)));
+    EXPECT_EQ(">bcd>swap2", tag.calls());
 }
 
 TEST(Convert, ReadsBackWhatItWrote) {
     const ValueTag tag("unsignedShort-2(bcd,swapnibble,swap4)");
     const Bytes value = {0xD2, 0x04, 0x2E, 0x16};
     const Bytes device = Convert(tag, value, kWrite, Bytes(4));
-    EXPECT_EQ(device, (Bytes{0x65, 0x87, 0x21, 0x43}));
-    EXPECT_EQ(Convert(tag, device, kRead, Bytes(4)), value);
+    EXPECT_EQ((Bytes{0x65, 0x87, 0x21, 0x43}), device);
+    EXPECT_EQ(value, Convert(tag, device, kRead, Bytes(4)));
 }
 
 TEST(Convert, NamesTheConversionThatFailsAndLeavesTheDestination) {
@@ -145,8 +145,8 @@ TEST(Convert, NamesTheConversionThatFailsAndLeavesTheDestination) {
         const ValueTag tag(row.type);
         Bytes dst = kUntouched;
         EXPECT_FALSE(tag.Convert(row.src.data(), dst.data(), row.toDevice)) << row.type;
-        EXPECT_STREQ(tag.GetError(), row.error) << row.type;
-        EXPECT_EQ(dst, kUntouched) << row.type;
+        EXPECT_STREQ(row.error, tag.GetError()) << row.type;
+        EXPECT_EQ(kUntouched, dst) << row.type;
     }
 }
 
@@ -155,20 +155,20 @@ TEST(Convert, LeavesTheErrorTextOfAnEarlierFailure) {
     Bytes dst(2);
     EXPECT_FALSE(tag.Convert(Bytes{0x3A, 0x12}.data(), dst.data(), kRead));
     EXPECT_TRUE(tag.Convert(Bytes{0x34, 0x12}.data(), dst.data(), kRead));
-    EXPECT_STREQ(tag.GetError(), "Conversion error at: bcd");
+    EXPECT_STREQ("Conversion error at: bcd", tag.GetError());
 }
 
 TEST(Convert, NegatesTheFrontPartOfAnArray) {
     const ValueTag tag("short-4(neg)");
-    EXPECT_EQ(Convert(tag, {1, 0, 1, 0, 1, 0, 1, 0}, kRead, Bytes(8)),
-              (Bytes{0xFF, 0xFF, 0xFF, 0xFF, 1, 0, 1, 0}));
-    EXPECT_EQ(Convert(ValueTag("string-3(neg)"), {1, 2, 3}, kRead, Bytes(3)),
-              (Bytes{0xFF, 0xFE, 0xFD}));
+    EXPECT_EQ((Bytes{0xFF, 0xFF, 0xFF, 0xFF, 1, 0, 1, 0}),
+              Convert(tag, {1, 0, 1, 0, 1, 0, 1, 0}, kRead, Bytes(8)));
+    EXPECT_EQ((Bytes{0xFF, 0xFE, 0xFD}),
+              Convert(ValueTag("string-3(neg)"), {1, 2, 3}, kRead, Bytes(3)));
 }
 
 TEST(Convert, TakesTheItemsOfBinaryForUnsignedBytes) {
-    EXPECT_EQ(Convert(ValueTag("binary-2(inv)"), {0x0F, 0xF0}, kRead, Bytes(2)),
-              (Bytes{0xF0, 0x0F}));
+    EXPECT_EQ((Bytes{0xF0, 0x0F}),
+              Convert(ValueTag("binary-2(inv)"), {0x0F, 0xF0}, kRead, Bytes(2)));
 }
 
 // The device form may cover more than the value, as with odd texts in 16-bit registers.
@@ -183,16 +183,16 @@ class PaddedTag : public ValueTag {
 
 TEST(Convert, FillsALongerDeviceFormWithZeroes) {
     const PaddedTag tag("string-3", 4);
-    EXPECT_EQ(Convert(tag, {'a', 'b', 'c'}, kWrite, Bytes(5, 0xEE)),
-              (Bytes{'a', 'b', 'c', 0, 0xEE}));
-    EXPECT_EQ(Convert(tag, {'a', 'b', 'c', 'd'}, kRead, Bytes(4, 0xEE)),
-              (Bytes{'a', 'b', 'c', 0xEE}));
+    EXPECT_EQ((Bytes{'a', 'b', 'c', 0, 0xEE}),
+              Convert(tag, {'a', 'b', 'c'}, kWrite, Bytes(5, 0xEE)));
+    EXPECT_EQ((Bytes{'a', 'b', 'c', 0xEE}),
+              Convert(tag, {'a', 'b', 'c', 'd'}, kRead, Bytes(4, 0xEE)));
 }
 
 TEST(Convert, FillsALongerValueWithZeroes) {
     const PaddedTag tag("string-4", 2);
-    EXPECT_EQ(Convert(tag, {'a', 'b'}, kRead, Bytes(5, 0xEE)), (Bytes{'a', 'b', 0, 0, 0xEE}));
-    EXPECT_EQ(Convert(tag, {'a', 'b', 'c', 'd'}, kWrite, Bytes(3, 0xEE)), (Bytes{'a', 'b', 0xEE}));
+    EXPECT_EQ((Bytes{'a', 'b', 0, 0, 0xEE}), Convert(tag, {'a', 'b'}, kRead, Bytes(5, 0xEE)));
+    EXPECT_EQ((Bytes{'a', 'b', 0xEE}), Convert(tag, {'a', 'b', 'c', 'd'}, kWrite, Bytes(3, 0xEE)));
 }
 
 // On both sides of the size up to which the work is done without the heap.
@@ -202,7 +202,7 @@ TEST(Convert, CarriesValuesOfAnySize) {
         const Bytes value = Counted(static_cast<std::size_t>(size));
         const Bytes device = Convert(tag, value, kWrite, Bytes(value.size()));
         EXPECT_NE(device, value) << size;
-        EXPECT_EQ(Convert(tag, device, kRead, Bytes(value.size())), value) << size;
+        EXPECT_EQ(value, Convert(tag, device, kRead, Bytes(value.size()))) << size;
     }
 }
 
@@ -212,14 +212,14 @@ TEST(Convert, CarriesMoreBitsThanTheLocalBuffer) {
     for (std::size_t i = 0; i < value.size(); ++i)
         value[i] = i % 3 == 0;
     const Bytes device = Convert(tag, value, kWrite, Bytes(251, 0));
-    EXPECT_EQ(Convert(tag, device, kRead, Bytes(2000, 0xEE)), value);
+    EXPECT_EQ(value, Convert(tag, device, kRead, Bytes(2000, 0xEE)));
 }
 
 TEST(Convert, DoesNothingWithoutALength) {
     for (const char* type : {"object", "int-0", "int--3", "boolean-0", "boolean--9", "wrong"}) {
         const ValueTag tag(type);
-        EXPECT_EQ(Convert(tag, kUntouched, kRead, Bytes(2, 0x11)), Bytes(2, 0x11)) << type;
-        EXPECT_EQ(Convert(tag, kUntouched, kWrite, Bytes(2, 0x11)), Bytes(2, 0x11)) << type;
+        EXPECT_EQ(Bytes(2, 0x11), Convert(tag, kUntouched, kRead, Bytes(2, 0x11))) << type;
+        EXPECT_EQ(Bytes(2, 0x11), Convert(tag, kUntouched, kWrite, Bytes(2, 0x11))) << type;
     }
 }
 
@@ -236,14 +236,14 @@ TEST(ConvertVariable, IsConvertUnlessATagOverridesIt) {
     const ScaledTag tag("byte");
     unsigned char dst = 0;
     EXPECT_TRUE(tag.ConvertVariable(nullptr, &dst, kWrite));
-    EXPECT_EQ(dst, 'w');
+    EXPECT_EQ('w', dst);
     EXPECT_FALSE(tag.ConvertVariable(nullptr, &dst, kRead));
-    EXPECT_EQ(dst, 'r');
+    EXPECT_EQ('r', dst);
 }
 
 TEST(Clone, HasConversionsOfItsOwn) {
     const std::unique_ptr<ITag> copy(ValueTag("short(swap2)").Clone());
-    EXPECT_EQ(Convert(*copy, {1, 2}, kRead, Bytes(2)), (Bytes{2, 1}));
+    EXPECT_EQ((Bytes{2, 1}), Convert(*copy, {1, 2}, kRead, Bytes(2)));
 }
 
 }  // namespace

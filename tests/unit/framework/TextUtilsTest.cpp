@@ -28,14 +28,14 @@ TEST(Trim, RemovesBlanksAndTabsFromBothEndsOnly) {
     for (const auto& [text, expected] : rows) {
         std::string trimmed = text;
         ProtUtilsN::Trim(trimmed);
-        EXPECT_EQ(trimmed, expected) << '"' << text << '"';
-        EXPECT_EQ(ProtUtilsN::GetTrim(text), expected) << '"' << text << '"';
+        EXPECT_EQ(expected, trimmed) << '"' << text << '"';
+        EXPECT_EQ(expected, ProtUtilsN::GetTrim(text)) << '"' << text << '"';
     }
 }
 
 TEST(Trim, KeepsZeroBytes) {
     const std::string text(" a\0b ", 5);
-    EXPECT_EQ(ProtUtilsN::GetTrim(text), std::string("a\0b", 3));
+    EXPECT_EQ(std::string("a\0b", 3), ProtUtilsN::GetTrim(text));
 }
 
 TEST(ParseSubstrings, SplitsTrimsAndKeepsEmptyPieces) {
@@ -51,20 +51,20 @@ TEST(ParseSubstrings, SplitsTrimsAndKeepsEmptyPieces) {
     for (const auto& [text, expected] : rows) {
         Pieces pieces;
         ProtUtilsN::ParseSubstrings(text, pieces, ',');
-        EXPECT_EQ(pieces, expected) << '"' << text << '"';
+        EXPECT_EQ(expected, pieces) << '"' << text << '"';
     }
 }
 
 TEST(ParseSubstrings, AppendsToWhatIsThere) {
     Pieces pieces = {"first"};
     ProtUtilsN::ParseSubstrings("1?HREG?4.0?int", pieces, '?');
-    EXPECT_EQ(pieces, (Pieces{"first", "1", "HREG", "4.0", "int"}));
+    EXPECT_EQ((Pieces{"first", "1", "HREG", "4.0", "int"}), pieces);
 }
 
 TEST(ParseSubstrings, TakesABlankAsDelimiter) {
     Pieces pieces;
     ProtUtilsN::ParseSubstrings("a b", pieces, ' ');
-    EXPECT_EQ(pieces, (Pieces{"a", "b"}));
+    EXPECT_EQ((Pieces{"a", "b"}), pieces);
 }
 
 TEST(GetConfigValue, TakesTheLettersAndDigitsBehindTheFirstKey) {
@@ -87,7 +87,7 @@ TEST(GetConfigValue, TakesTheLettersAndDigitsBehindTheFirstKey) {
     for (const Row& row : rows) {
         std::string value = "before";
         EXPECT_TRUE(ProtUtilsN::GetConfigValue(row.text, row.key, value)) << row.text;
-        EXPECT_EQ(value, row.value) << row.text;
+        EXPECT_EQ(row.value, value) << row.text;
     }
 }
 
@@ -95,7 +95,7 @@ TEST(GetConfigValue, LeavesTheValueWhenTheKeyIsMissing) {
     for (const char* text : {"", "baud", "baud 9600", "Baud=9600", "bau=9600"}) {
         std::string value = "before";
         EXPECT_FALSE(ProtUtilsN::GetConfigValue(text, "baud", value)) << text;
-        EXPECT_EQ(value, "before") << text;
+        EXPECT_EQ("before", value) << text;
     }
 }
 
@@ -152,8 +152,8 @@ TEST(ParseDecimal, IgnoresPrefixes) {
 TEST(CharacterClasses, AreThoseOfTheStandardLocale) {
     for (int code = 0; code < 256; ++code) {
         const char c = static_cast<char>(code);
-        EXPECT_EQ(ProtUtilsN::IsWhiteSpace(c), std::isspace(code) != 0) << code;
-        EXPECT_EQ(ProtUtilsN::IsDecimalDigit(c), std::isdigit(code) != 0) << code;
+        EXPECT_EQ(std::isspace(code) != 0, ProtUtilsN::IsWhiteSpace(c)) << code;
+        EXPECT_EQ(std::isdigit(code) != 0, ProtUtilsN::IsDecimalDigit(c)) << code;
     }
 }
 
@@ -176,7 +176,7 @@ TEST(CopyBounded, LeavesOutTheEndWhenItDoesNotFit) {
 
 TEST(CopyBounded, WritesNothingWithoutRoom) {
     for (const int size : {0, -1, INT32_MIN}) {
-        EXPECT_EQ(CopiedInto("abc", size), "########") << size;
+        EXPECT_EQ("########", CopiedInto("abc", size)) << size;
     }
 }
 
@@ -204,9 +204,9 @@ TEST(Itoa, WritesDigitsAndReturnsTheBuffer) {
     for (const Row& row : rows) {
         char buffer[40];
         std::memset(buffer, '#', sizeof buffer);
-        EXPECT_EQ(itoa(row.value, buffer, row.base), buffer);
-        EXPECT_STREQ(buffer, row.text) << row.value << " in base " << row.base;
-        EXPECT_EQ(buffer[std::strlen(row.text) + 1], '#') << row.value;
+        EXPECT_EQ(buffer, itoa(row.value, buffer, row.base));
+        EXPECT_STREQ(row.text, buffer) << row.value << " in base " << row.base;
+        EXPECT_EQ('#', buffer[std::strlen(row.text) + 1]) << row.value;
     }
 }
 
