@@ -63,7 +63,7 @@ void ArrayItem::expectItemsEqualTheWhole(const std::string& uri) {
     Bytes whole(static_cast<std::size_t>(tag->GetVarLength()), kUntouched);
     if (driver_.Read(tag, whole.data()) == 0) return;
     for (int i = 0; i < ProtUtilsN::GetItemCount(tag); ++i)
-        EXPECT_EQ(readItem(tag, i), itemOf(tag, whole, i)) << uri << " item " << i;
+        EXPECT_EQ(itemOf(tag, whole, i), readItem(tag, i)) << uri << " item " << i;
 }
 
 // The framework's own way, the whole array read and written, is the model.
@@ -145,59 +145,59 @@ TEST_F(ArrayItem, OnlyTheItemsOwnPartOfTheMemoryTravels) {
     for (const Row& row : kRows) {
         const ITag* tag = driver_.tag(row.uri);
         readItem(tag, row.index);
-        EXPECT_EQ(driver_.calls(), row.readCalls) << row.uri;
+        EXPECT_EQ(row.readCalls, driver_.calls()) << row.uri;
         EXPECT_NE(driver_.writeArrayItem(tag, row.index, newItem(tag, 0).data()), 0) << row.uri;
-        EXPECT_EQ(driver_.calls(), row.writeCalls) << row.uri;
+        EXPECT_EQ(row.writeCalls, driver_.calls()) << row.uri;
     }
 }
 
 TEST_F(ArrayItem, NegationKeepsItsBoundOnBytes) {
     driver_.memory("REG").setBytes(0, Bytes(20, 0x01));
     const ITag* tag = driver_.tag("1?REG?0?short-10(neg)");
-    EXPECT_EQ(readItem(tag, 4), (Bytes{0xFF, 0xFE}));
-    EXPECT_EQ(readItem(tag, 5), (Bytes{0x01, 0x01}));
+    EXPECT_EQ((Bytes{0xFF, 0xFE}), readItem(tag, 4));
+    EXPECT_EQ((Bytes{0x01, 0x01}), readItem(tag, 5));
 }
 
 TEST_F(ArrayItem, NeighbourThatConvertsBadlyDoesNotMatter) {
     driver_.memory("REG").setBytes(0, {0x12, 0xFF, 0x34, 0xFF});
     const ITag* tag = driver_.tag("1?REG?0?unsignedByte-4(bcd)");
-    EXPECT_EQ(readItem(tag, 0), (Bytes{12}));
+    EXPECT_EQ((Bytes{12}), readItem(tag, 0));
     const unsigned char value = 56;
     EXPECT_NE(driver_.writeArrayItem(tag, 2, &value), 0);
-    EXPECT_EQ(driver_.memory("REG").bytes(0, 4), (Bytes{0x12, 0xFF, 0x56, 0xFF}));
+    EXPECT_EQ((Bytes{0x12, 0xFF, 0x56, 0xFF}), driver_.memory("REG").bytes(0, 4));
 }
 
 TEST_F(ArrayItem, BadConversionIsReported) {
     driver_.memory("REG").setBytes(0, {0x1A, 0x00, 0x12, 0x00});
     const ITag* bcd = driver_.tag("1?REG?0?short-2(bcd)");
     Bytes item(2, kUntouched);
-    EXPECT_EQ(driver_.readArrayItem(bcd, 0, item.data()), 0);
-    EXPECT_EQ(driver_.GetLastError(), -9);
-    EXPECT_STREQ(driver_.GetLastErrorString(), "read conversion error");
-    EXPECT_EQ(item, Bytes(2, kUntouched));
+    EXPECT_EQ(0, driver_.readArrayItem(bcd, 0, item.data()));
+    EXPECT_EQ(-9, driver_.GetLastError());
+    EXPECT_STREQ("read conversion error", driver_.GetLastErrorString());
+    EXPECT_EQ(Bytes(2, kUntouched), item);
 
     const unsigned char tooLarge[] = {0xFF, 0xFF};
-    EXPECT_EQ(driver_.writeArrayItem(bcd, 1, tooLarge), 0);
-    EXPECT_EQ(driver_.GetLastError(), -9);
-    EXPECT_STREQ(driver_.GetLastErrorString(), "write conversion error");
+    EXPECT_EQ(0, driver_.writeArrayItem(bcd, 1, tooLarge));
+    EXPECT_EQ(-9, driver_.GetLastError());
+    EXPECT_STREQ("write conversion error", driver_.GetLastErrorString());
 
     const ITag* swapped = driver_.tag("1?REG?0?short-2(bcd,swap4)");
-    EXPECT_EQ(driver_.writeArrayItem(swapped, 0, item.data()), 0);
-    EXPECT_STREQ(driver_.GetLastErrorString(), "read conversion error") << "its partner is no BCD";
-    EXPECT_EQ(driver_.calls(), "read 0+1, read 0+2");
+    EXPECT_EQ(0, driver_.writeArrayItem(swapped, 0, item.data()));
+    EXPECT_STREQ("read conversion error", driver_.GetLastErrorString()) << "its partner is no BCD";
+    EXPECT_EQ("read 0+1, read 0+2", driver_.calls());
 }
 
 TEST_F(ArrayItem, FailedReadWritesNothing) {
     const Bytes before = driver_.memory("REG").image();
     driver_.failCall(1);
     const unsigned char value = 1;
-    EXPECT_EQ(driver_.writeArrayItem(driver_.tag("1?REG?0?byte-4"), 2, &value), 0);
-    EXPECT_EQ(driver_.GetLastError(), -4);
+    EXPECT_EQ(0, driver_.writeArrayItem(driver_.tag("1?REG?0?byte-4"), 2, &value));
+    EXPECT_EQ(-4, driver_.GetLastError());
     EXPECT_TRUE(driver_.memory("REG").image() == before);
     driver_.failCall(1);
     unsigned char item = kUntouched;
-    EXPECT_EQ(driver_.readArrayItem(driver_.tag("1?REG?0?byte-4"), 2, &item), 0);
-    EXPECT_EQ(item, kUntouched);
+    EXPECT_EQ(0, driver_.readArrayItem(driver_.tag("1?REG?0?byte-4"), 2, &item));
+    EXPECT_EQ(kUntouched, item);
 }
 
 TEST_F(ArrayItem, ScalarsAndStrangeItemsAreRefused) {
@@ -218,38 +218,38 @@ TEST_F(ArrayItem, ScalarsAndStrangeItemsAreRefused) {
     for (const Row& row : kRows) {
         const ITag* tag = driver_.tag(row.uri);
         unsigned char item[2] = {kUntouched, kUntouched};
-        EXPECT_EQ(driver_.readArrayItem(tag, row.index, item), 0) << row.uri;
-        EXPECT_EQ(driver_.GetLastError(), -1) << row.uri;
-        EXPECT_STREQ(driver_.GetLastErrorString(), row.text) << row.uri;
-        EXPECT_EQ(item[0], kUntouched) << row.uri;
-        EXPECT_EQ(driver_.writeArrayItem(tag, row.index, item), 0) << row.uri;
-        EXPECT_STREQ(driver_.GetLastErrorString(), row.text) << row.uri;
+        EXPECT_EQ(0, driver_.readArrayItem(tag, row.index, item)) << row.uri;
+        EXPECT_EQ(-1, driver_.GetLastError()) << row.uri;
+        EXPECT_STREQ(row.text, driver_.GetLastErrorString()) << row.uri;
+        EXPECT_EQ(kUntouched, item[0]) << row.uri;
+        EXPECT_EQ(0, driver_.writeArrayItem(tag, row.index, item)) << row.uri;
+        EXPECT_STREQ(row.text, driver_.GetLastErrorString()) << row.uri;
     }
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ("", driver_.calls());
 }
 
 TEST_F(ArrayItem, ReadOnlyMemoryIsReadButNotWritten) {
     const ITag* tag = driver_.tag("1?IREG?50?short-4");
-    EXPECT_EQ(readItem(tag, 1), driver_.memory("IREG").bytes(51, 2));
+    EXPECT_EQ(driver_.memory("IREG").bytes(51, 2), readItem(tag, 1));
     const unsigned char value[] = {1, 2};
-    EXPECT_EQ(driver_.writeArrayItem(tag, 1, value), 0);
-    EXPECT_EQ(driver_.GetLastError(), -1);
-    EXPECT_STREQ(driver_.GetLastErrorString(), "Memory type is read only");
-    EXPECT_EQ(driver_.calls(), "read 51+1");
+    EXPECT_EQ(0, driver_.writeArrayItem(tag, 1, value));
+    EXPECT_EQ(-1, driver_.GetLastError());
+    EXPECT_STREQ("Memory type is read only", driver_.GetLastErrorString());
+    EXPECT_EQ("read 51+1", driver_.calls());
 }
 
 TEST_F(ArrayItem, WholeArrayTravelsUnlessTheDriverAddressesItems) {
     driver_.setArrayItemByTag(0);
     const ITag* tag = driver_.tag("1?REG?50?short-4");
-    EXPECT_EQ(readItem(tag, 1), driver_.memory("REG").bytes(51, 2));
-    EXPECT_EQ(driver_.calls(), "read 50+4");
+    EXPECT_EQ(driver_.memory("REG").bytes(51, 2), readItem(tag, 1));
+    EXPECT_EQ("read 50+4", driver_.calls());
     const unsigned char value[] = {1, 2};
     EXPECT_NE(driver_.writeArrayItem(tag, 1, value), 0);
-    EXPECT_EQ(driver_.calls(), "read 50+4, write 50+4");
+    EXPECT_EQ("read 50+4, write 50+4", driver_.calls());
 }
 
 TEST_F(ArrayItem, AreaOfTheDriverItselfTravelsWhole) {
     const ITag* tag = driver_.tag("1?AREA?0?unsignedByte-4");
-    EXPECT_EQ(readItem(tag, 2), Bytes(1, driver_.memory("AREA").image()[2]));
-    EXPECT_EQ(driver_.calls(), "read 0+1");
+    EXPECT_EQ(Bytes(1, driver_.memory("AREA").image()[2]), readItem(tag, 2));
+    EXPECT_EQ("read 0+1", driver_.calls());
 }

@@ -50,12 +50,12 @@ TEST(Blocks, EveryItemIsCoveredOnceInOrder) {
         for (int limit = 1; limit < 20; ++limit) {
             int next = 0;
             for (const Blocks::Block block : Blocks(count, limit)) {
-                ASSERT_EQ(block.first, next) << count << " by " << limit;
+                ASSERT_EQ(next, block.first) << count << " by " << limit;
                 ASSERT_GE(block.count, 1) << count << " by " << limit;
                 ASSERT_LE(block.count, limit) << count << " by " << limit;
                 next += block.count;
             }
-            ASSERT_EQ(next, count) << "by " << limit;
+            ASSERT_EQ(count, next) << "by " << limit;
         }
     }
 }

@@ -33,7 +33,7 @@ TEST_F(Allocation, BlockReadsOfOneRequestTakeNothingFromTheHeap) {
         const ITag* tag = driver_.tag(row.uri);
         const AllocationCounter counter;
         const int done = driver_.ReadBlock(tag, value_.data(), row.length);
-        EXPECT_EQ(counter.allocations(), 0U) << row.uri << " length " << row.length;
+        EXPECT_EQ(0U, counter.allocations()) << row.uri << " length " << row.length;
         EXPECT_NE(done, 0) << row.uri;
     }
 }
@@ -45,7 +45,7 @@ TEST_F(Allocation, TagReadsAndWritesOfOneRequestTakeNothingFromTheHeap) {
         const AllocationCounter counter;
         const bool done =
             driver_.Read(tag, value_.data()) != 0 && driver_.Write(tag, value_.data()) != 0;
-        EXPECT_EQ(counter.allocations(), 0U) << uri;
+        EXPECT_EQ(0U, counter.allocations()) << uri;
         EXPECT_TRUE(done) << uri;
     }
 }
@@ -58,7 +58,7 @@ TEST_F(Allocation, BitBlocksAndArrayItemsTakeNothingFromTheHeap) {
                       driver_.WriteBitBlock(coils, value_.data(), 1968) != 0;
     const bool item = driver_.readArrayItem(array, 77, value_.data()) != 0 &&
                       driver_.writeArrayItem(array, 77, value_.data()) != 0;
-    EXPECT_EQ(counter.allocations(), 0U);
+    EXPECT_EQ(0U, counter.allocations());
     EXPECT_TRUE(bits);
     EXPECT_TRUE(item);
 }

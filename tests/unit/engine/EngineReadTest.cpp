@@ -25,11 +25,11 @@ class Read : public testing::Test {
     void expectRefused(const std::string& uri, int code, const std::string& text) {
         unsigned char value[16];
         std::fill(std::begin(value), std::end(value), kUntouched);
-        EXPECT_EQ(driver_.Read(driver_.tag(uri), value), 0) << uri;
-        EXPECT_EQ(driver_.GetLastError(), code) << uri;
-        EXPECT_EQ(driver_.GetLastErrorString(), text) << uri;
+        EXPECT_EQ(0, driver_.Read(driver_.tag(uri), value)) << uri;
+        EXPECT_EQ(code, driver_.GetLastError()) << uri;
+        EXPECT_EQ(text, driver_.GetLastErrorString()) << uri;
         for (const unsigned char byte : value)
-            EXPECT_EQ(byte, kUntouched) << uri;
+            EXPECT_EQ(kUntouched, byte) << uri;
     }
     Bytes bitsOf(const char* memory, int first, int count) {
         Bytes bits;
@@ -50,7 +50,7 @@ TEST_F(Read, EveryTypeAtEveryLengthEqualsTheRegisters) {
             const std::string uri = std::string("1?") + memory + "?1201?" + type.text;
             const Bytes expected = type.bits ? bitsOf(memory, 1201 * itemLength * 8, type.bytes)
                                              : driver_.memory(memory).bytes(1201, type.bytes);
-            EXPECT_EQ(read(uri), expected) << uri;
+            EXPECT_EQ(expected, read(uri)) << uri;
         }
     }
 }
@@ -63,14 +63,14 @@ TEST_F(Read, BitsInsideRegistersBeginAtTheSubIndex) {
                 const std::string uri = std::string("1?") + memory + "?77." +
                                         std::to_string(subIndex) + "?boolean-" +
                                         std::to_string(count);
-                EXPECT_EQ(read(uri), bitsOf(memory, 77 * itemBits + subIndex, count)) << uri;
+                EXPECT_EQ(bitsOf(memory, 77 * itemBits + subIndex, count), read(uri)) << uri;
             }
         }
     }
 }
 
 TEST_F(Read, SubIndexMovesBitsOnly) {
-    EXPECT_EQ(read("1?REG?77.5?short"), driver_.memory("REG").bytes(77, 2));
+    EXPECT_EQ(driver_.memory("REG").bytes(77, 2), read("1?REG?77.5?short"));
 }
 
 TEST_F(Read, BitsOfABitMemoryBeginAtTheOffset) {
@@ -78,7 +78,7 @@ TEST_F(Read, BitsOfABitMemoryBeginAtTheOffset) {
         for (const int count : {1, 2, 7, 8, 9, 64, 500, 2000, 2001, 4100}) {
             const std::string uri =
                 "1?COIL?" + std::to_string(offset) + "?boolean-" + std::to_string(count);
-            EXPECT_EQ(read(uri), bitsOf("COIL", offset, count)) << uri;
+            EXPECT_EQ(bitsOf("COIL", offset, count), read(uri)) << uri;
         }
     }
 }
@@ -110,38 +110,38 @@ TEST_F(Read, RequestsAreCutAtTheBlockLimit) {
     };
     for (const Row& row : kRows) {
         read(row.uri);
-        EXPECT_EQ(driver_.calls(), row.calls) << row.uri;
+        EXPECT_EQ(row.calls, driver_.calls()) << row.uri;
     }
 }
 
 TEST_F(Read, LimitThatIsNoMultipleOfEightKeepsTheBitPositions) {
     driver_.setLimit(13);
-    EXPECT_EQ(read("1?COIL?5?boolean-40"), bitsOf("COIL", 5, 40));
-    EXPECT_EQ(driver_.calls(), "readBits 5+13, readBits 18+13, readBits 31+13, readBits 44+1");
+    EXPECT_EQ(bitsOf("COIL", 5, 40), read("1?COIL?5?boolean-40"));
+    EXPECT_EQ("readBits 5+13, readBits 18+13, readBits 31+13, readBits 44+1", driver_.calls());
 }
 
 TEST_F(Read, LimitBelowOneItemReadsItemByItem) {
     driver_.setLimit(0);
-    EXPECT_EQ(read("1?REG?10?int"), driver_.memory("REG").bytes(10, 4));
-    EXPECT_EQ(driver_.calls(), "read 10+1, read 11+1");
-    EXPECT_EQ(read("1?COIL?6?boolean-3"), bitsOf("COIL", 6, 3));
-    EXPECT_EQ(driver_.calls(), "readBits 6+1, readBits 7+1, readBits 8+1");
+    EXPECT_EQ(driver_.memory("REG").bytes(10, 4), read("1?REG?10?int"));
+    EXPECT_EQ("read 10+1, read 11+1", driver_.calls());
+    EXPECT_EQ(bitsOf("COIL", 6, 3), read("1?COIL?6?boolean-3"));
+    EXPECT_EQ("readBits 6+1, readBits 7+1, readBits 8+1", driver_.calls());
 }
 
 TEST_F(Read, AreaOfTheDriverItselfIsOneCall) {
-    EXPECT_EQ(read("1?AREA?0?unsignedInt"), driver_.memory("AREA").bytes(0, 4));
-    EXPECT_EQ(driver_.calls(), "read 0+1");
-    EXPECT_EQ(read("1?FLAG?0?boolean"), bitsOf("FLAG", 0, 1));
-    EXPECT_EQ(driver_.calls(), "readBits 0+1");
-    EXPECT_EQ(read("1?FLAG?0?unsignedByte"), (Bytes{driver_.memory("FLAG").image()[0]}));
-    EXPECT_EQ(driver_.calls(), "readBits 0+8");
+    EXPECT_EQ(driver_.memory("AREA").bytes(0, 4), read("1?AREA?0?unsignedInt"));
+    EXPECT_EQ("read 0+1", driver_.calls());
+    EXPECT_EQ(bitsOf("FLAG", 0, 1), read("1?FLAG?0?boolean"));
+    EXPECT_EQ("readBits 0+1", driver_.calls());
+    EXPECT_EQ((Bytes{driver_.memory("FLAG").image()[0]}), read("1?FLAG?0?unsignedByte"));
+    EXPECT_EQ("readBits 0+8", driver_.calls());
 }
 
 TEST_F(Read, LastAddressIsReached) {
-    EXPECT_EQ(read("1?REG?65535?short"), driver_.memory("REG").bytes(65535, 2));
-    EXPECT_EQ(read("1?REG?65535?byte"), driver_.memory("REG").bytes(65535, 1));
-    EXPECT_EQ(read("1?COIL?65535?boolean"), bitsOf("COIL", 65535, 1));
-    EXPECT_EQ(read("1?SMALL?9?boolean"), bitsOf("SMALL", 9, 1));
+    EXPECT_EQ(driver_.memory("REG").bytes(65535, 2), read("1?REG?65535?short"));
+    EXPECT_EQ(driver_.memory("REG").bytes(65535, 1), read("1?REG?65535?byte"));
+    EXPECT_EQ(bitsOf("COIL", 65535, 1), read("1?COIL?65535?boolean"));
+    EXPECT_EQ(bitsOf("SMALL", 9, 1), read("1?SMALL?9?boolean"));
 }
 
 TEST_F(Read, TagsOutsideTheMemoryAreRefusedBeforeAnythingIsSent) {
@@ -153,14 +153,14 @@ TEST_F(Read, TagsOutsideTheMemoryAreRefusedBeforeAnythingIsSent) {
     expectRefused("1?COIL?65535?boolean-2", -1, outside);
     expectRefused("1?COIL?-8?boolean", -1, outside);
     expectRefused("1?SMALL?10?boolean", -1, outside);
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ("", driver_.calls());
 }
 
 TEST_F(Read, TagsWithoutLengthAreRefusedBeforeAnythingIsSent) {
     for (const char* uri : {"1?REG?0?int-0", "1?REG?0?int--3", "1?REG?0?string-", "1?REG?0?object",
                             "1?REG?0.3?boolean-0", "1?COIL?3?boolean-0", "1?COIL?3?boolean--20"})
         expectRefused(uri, -1, "Tag length is not positive");
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ("", driver_.calls());
 }
 
 TEST_F(Read, OtherUnusableTagsAreRefusedBeforeAnythingIsSent) {
@@ -168,16 +168,16 @@ TEST_F(Read, OtherUnusableTagsAreRefusedBeforeAnythingIsSent) {
     expectRefused("1?REG?5.-3?boolean-16", -1, "Tag's bit index is negative");
     expectRefused("1?NOWHERE?5?short", -1, "Tag has no memory type");
     expectRefused("1?COIL?5?unsignedByte", -1, "Only bits may begin inside a byte");
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ("", driver_.calls());
 }
 
 TEST_F(Read, ConversionsAreApplied) {
     driver_.memory("REG").setBytes(4, {0x34, 0x12, 0x78, 0x56});
-    EXPECT_EQ(read("1?REG?4?short(bcd)"), (Bytes{0xD2, 0x04}));
-    EXPECT_EQ(read("1?REG?4?int(swap2)"), (Bytes{0x12, 0x34, 0x56, 0x78}));
-    EXPECT_EQ(read("1?REG?4?int(swap2,swap4)"), (Bytes{0x78, 0x56, 0x34, 0x12}));
+    EXPECT_EQ((Bytes{0xD2, 0x04}), read("1?REG?4?short(bcd)"));
+    EXPECT_EQ((Bytes{0x12, 0x34, 0x56, 0x78}), read("1?REG?4?int(swap2)"));
+    EXPECT_EQ((Bytes{0x78, 0x56, 0x34, 0x12}), read("1?REG?4?int(swap2,swap4)"));
     driver_.memory("COIL").setBit(9, 1);
-    EXPECT_EQ(read("1?COIL?9?boolean(inv)"), (Bytes{0}));
+    EXPECT_EQ((Bytes{0}), read("1?COIL?9?boolean(inv)"));
 }
 
 TEST_F(Read, RefusedConversionLeavesTheValue) {
@@ -192,10 +192,10 @@ TEST_F(Read, FailureInAnyBlockLeavesTheValue) {
         for (int call = 1; call <= 3; ++call) {
             Bytes value(static_cast<std::size_t>(tag->GetVarLength()), kUntouched);
             driver_.failCall(call);
-            EXPECT_EQ(driver_.Read(tag, value.data()), 0) << uri << " call " << call;
-            EXPECT_EQ(driver_.GetLastError(), -4);
-            EXPECT_STREQ(driver_.GetLastErrorString(), "No response");
-            EXPECT_EQ(value, Bytes(value.size(), kUntouched)) << uri << " call " << call;
+            EXPECT_EQ(0, driver_.Read(tag, value.data())) << uri << " call " << call;
+            EXPECT_EQ(-4, driver_.GetLastError());
+            EXPECT_STREQ("No response", driver_.GetLastErrorString());
+            EXPECT_EQ(Bytes(value.size(), kUntouched), value) << uri << " call " << call;
         }
         driver_.failCall(0);
     }

@@ -45,9 +45,9 @@ TEST_F(Threads, WritingDifferentBitsOfOneRegisterLosesNoUpdate) {
     const ITag* low = driver_.tag("1?REG?40.3?boolean");
     const ITag* high = driver_.tag("1?REG?40.12?boolean");
     together([&] { flip(low, lost[0]); }, [&] { flip(high, lost[1]); });
-    EXPECT_EQ(lost[0], 0);
-    EXPECT_EQ(lost[1], 0);
-    EXPECT_EQ(driver_.memory("REG").bytes(40, 2), (std::vector<unsigned char>{0x08, 0x10}));
+    EXPECT_EQ(0, lost[0]);
+    EXPECT_EQ(0, lost[1]);
+    EXPECT_EQ((std::vector<unsigned char>{0x08, 0x10}), driver_.memory("REG").bytes(40, 2));
 }
 
 // Three bytes are written with a read of both registers in front: its write back must not bring
@@ -72,8 +72,8 @@ TEST_F(Threads, WholeWriteIsNotUndoneByAWriteBack) {
         }
     };
     together(writePart, writeWhole);
-    EXPECT_EQ(lost[0], 0);
-    EXPECT_EQ(lost[1], 0);
+    EXPECT_EQ(0, lost[0]);
+    EXPECT_EQ(0, lost[1]);
 }
 
 TEST_F(Threads, WritingDifferentItemsOfOneRegisterLosesNoUpdate) {
@@ -88,6 +88,6 @@ TEST_F(Threads, WritingDifferentItemsOfOneRegisterLosesNoUpdate) {
         }
     };
     together([&] { count(2, lost[0]); }, [&] { count(3, lost[1]); });
-    EXPECT_EQ(lost[0], 0);
-    EXPECT_EQ(lost[1], 0);
+    EXPECT_EQ(0, lost[0]);
+    EXPECT_EQ(0, lost[1]);
 }

@@ -23,9 +23,9 @@ class Write : public testing::Test {
         return driver_.Write(driver_.tag(uri), bytes.data());
     }
     void expectRefused(const std::string& uri, int code, const std::string& text) {
-        EXPECT_EQ(write(uri, value(64, false)), 0) << uri;
-        EXPECT_EQ(driver_.GetLastError(), code) << uri;
-        EXPECT_EQ(driver_.GetLastErrorString(), text) << uri;
+        EXPECT_EQ(0, write(uri, value(64, false))) << uri;
+        EXPECT_EQ(code, driver_.GetLastError()) << uri;
+        EXPECT_EQ(text, driver_.GetLastErrorString()) << uri;
     }
 
     FakeDriver driver_;
@@ -105,7 +105,7 @@ TEST_F(Write, RequestsAreCutAtTheBlockLimit) {
     };
     for (const Row& row : kRows) {
         EXPECT_NE(write(row.uri, value(4000, true)), 0) << row.uri;
-        EXPECT_EQ(driver_.calls(), row.calls) << row.uri;
+        EXPECT_EQ(row.calls, driver_.calls()) << row.uri;
     }
 }
 
@@ -124,62 +124,62 @@ TEST_F(Write, PartOfARegisterIsReadFirst) {
     };
     for (const Row& row : kRows) {
         EXPECT_NE(write(row.uri, value(300, true)), 0) << row.uri;
-        EXPECT_EQ(driver_.calls(), row.calls) << row.uri;
+        EXPECT_EQ(row.calls, driver_.calls()) << row.uri;
     }
 }
 
 TEST_F(Write, RegistersInFrontOfTheBitAreNotTouched) {
     EXPECT_NE(write("1?REG?10.37?boolean", {1}), 0);
-    EXPECT_EQ(driver_.calls(), "read 12+1, write 12+1");
+    EXPECT_EQ("read 12+1, write 12+1", driver_.calls());
 }
 
 TEST_F(Write, WholeRegistersOfBitsNeedNoRead) {
     EXPECT_NE(write("1?REG?10.16?boolean-32", value(32, true)), 0);
-    EXPECT_EQ(driver_.calls(), "write 11+2");
+    EXPECT_EQ("write 11+2", driver_.calls());
 }
 
 TEST_F(Write, LimitBelowOneItemWritesItemByItem) {
     driver_.setLimit(0);
     EXPECT_NE(write("1?REG?10?int", value(4, false)), 0);
-    EXPECT_EQ(driver_.calls(), "write 10+1, write 11+1");
+    EXPECT_EQ("write 10+1, write 11+1", driver_.calls());
 }
 
 TEST_F(Write, AreaOfTheDriverItselfIsOneCallWithoutARead) {
     EXPECT_NE(write("1?AREA?0?unsignedInt", {1, 2, 3, 4}), 0);
-    EXPECT_EQ(driver_.calls(), "write 0+1");
-    EXPECT_EQ(driver_.memory("AREA").bytes(0, 4), (Bytes{1, 2, 3, 4}));
+    EXPECT_EQ("write 0+1", driver_.calls());
+    EXPECT_EQ((Bytes{1, 2, 3, 4}), driver_.memory("AREA").bytes(0, 4));
     EXPECT_NE(write("1?AREA?0?unsignedByte", {9}), 0);
-    EXPECT_EQ(driver_.calls(), "write 0+1");
-    EXPECT_EQ(driver_.memory("AREA").bytes(0, 4), (Bytes{9, 0, 0, 0}));
+    EXPECT_EQ("write 0+1", driver_.calls());
+    EXPECT_EQ((Bytes{9, 0, 0, 0}), driver_.memory("AREA").bytes(0, 4));
     EXPECT_NE(write("1?FLAG?0?unsignedByte", {0x52}), 0);
-    EXPECT_EQ(driver_.calls(), "writeBits 0+8");
-    EXPECT_EQ(driver_.memory("FLAG").image()[0], 0x52);
+    EXPECT_EQ("writeBits 0+8", driver_.calls());
+    EXPECT_EQ(0x52, driver_.memory("FLAG").image()[0]);
     EXPECT_NE(write("1?FLAG?0?boolean", {1}), 0);
-    EXPECT_EQ(driver_.calls(), "writeBits 0+1");
+    EXPECT_EQ("writeBits 0+1", driver_.calls());
 }
 
 TEST_F(Write, NothingIsWrittenWhenTheReadFails) {
     for (const char* uri : {"1?REG?10.3?boolean", "1?REG?10?byte", "1?REG?10?string-301"}) {
         const Bytes before = driver_.memory("REG").image();
         driver_.failCall(1);
-        EXPECT_EQ(write(uri, value(301, true)), 0) << uri;
-        EXPECT_EQ(driver_.GetLastError(), -4) << uri;
-        EXPECT_EQ(driver_.calls().find("write"), std::string::npos) << uri;
+        EXPECT_EQ(0, write(uri, value(301, true))) << uri;
+        EXPECT_EQ(-4, driver_.GetLastError()) << uri;
+        EXPECT_EQ(std::string::npos, driver_.calls().find("write")) << uri;
         EXPECT_TRUE(driver_.memory("REG").image() == before) << uri;
     }
 }
 
 TEST_F(Write, FailureEndsTheBlocks) {
     driver_.failCall(2);
-    EXPECT_EQ(write("1?REG?10?short-300", value(600, false)), 0);
-    EXPECT_EQ(driver_.GetLastError(), -4);
-    EXPECT_EQ(driver_.calls(), "write 10+123, write 133+123");
+    EXPECT_EQ(0, write("1?REG?10?short-300", value(600, false)));
+    EXPECT_EQ(-4, driver_.GetLastError());
+    EXPECT_EQ("write 10+123, write 133+123", driver_.calls());
 }
 
 TEST_F(Write, ReadOnlyMemoryIsRefused) {
     expectRefused("1?IREG?10?short", -1, "Memory type is read only");
     expectRefused("1?IREG?10.3?boolean", -1, "Memory type is read only");
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ("", driver_.calls());
 }
 
 TEST_F(Write, UnusableTagsAreRefusedBeforeAnythingIsSent) {
@@ -191,21 +191,21 @@ TEST_F(Write, UnusableTagsAreRefusedBeforeAnythingIsSent) {
     expectRefused("1?REG?0.-1?boolean", -1, "Tag's bit index is negative");
     expectRefused("1?COIL?3?unsignedByte", -1, "Only bits may begin inside a byte");
     expectRefused("1?NOWHERE?0?short", -1, "Tag has no memory type");
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ("", driver_.calls());
 }
 
 TEST_F(Write, ConversionsAreApplied) {
     EXPECT_NE(write("1?REG?4?short(bcd)", {0xD2, 0x04}), 0);
-    EXPECT_EQ(driver_.memory("REG").bytes(4, 2), (Bytes{0x34, 0x12}));
+    EXPECT_EQ((Bytes{0x34, 0x12}), driver_.memory("REG").bytes(4, 2));
     EXPECT_NE(write("1?REG?4?int(swap2)", {1, 2, 3, 4}), 0);
-    EXPECT_EQ(driver_.memory("REG").bytes(4, 4), (Bytes{2, 1, 4, 3}));
+    EXPECT_EQ((Bytes{2, 1, 4, 3}), driver_.memory("REG").bytes(4, 4));
     EXPECT_NE(write("1?REG?4?boolean(inv)", {1}), 0);
-    EXPECT_EQ(driver_.memory("REG").bytes(4, 1), (Bytes{2}));
+    EXPECT_EQ((Bytes{2}), driver_.memory("REG").bytes(4, 1));
 }
 
 TEST_F(Write, RefusedConversionWritesNothing) {
     expectRefused("1?REG?4?short(neg,bcd)", -9, "write conversion error");
     expectRefused("1?REG?4?string-3(swap2)", -9, "write conversion error");
     expectRefused("1?COIL?4?boolean(bcd,neg)", -9, "write conversion error");
-    EXPECT_EQ(driver_.calls().find("write"), std::string::npos);
+    EXPECT_EQ(std::string::npos, driver_.calls().find("write"));
 }

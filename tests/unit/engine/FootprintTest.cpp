@@ -54,8 +54,8 @@ TEST(Footprint, WholeTagCoversItsItems) {
     FakeDriver driver;
     for (const Row& row : kRows) {
         const ProtgenTag& tag = make(driver, row.uri);
-        EXPECT_EQ(engine::wholeTag(tag), row.range) << row.uri;
-        EXPECT_EQ(engine::footprint(tag, row.range), row.place) << row.uri;
+        EXPECT_EQ(row.range, engine::wholeTag(tag)) << row.uri;
+        EXPECT_EQ(row.place, engine::footprint(tag, row.range)) << row.uri;
     }
 }
 
@@ -81,7 +81,7 @@ TEST(Footprint, ArrayItemTakesItsSwapPartnersAlong) {
     };
     FakeDriver driver;
     for (const Row& row : kRows) {
-        EXPECT_EQ(engine::arrayItem(make(driver, row.uri), row.index), row.range)
+        EXPECT_EQ(row.range, engine::arrayItem(make(driver, row.uri), row.index))
             << row.uri << " item " << row.index;
     }
 }
@@ -89,17 +89,17 @@ TEST(Footprint, ArrayItemTakesItsSwapPartnersAlong) {
 TEST(Footprint, PartOfABitMemoryKeepsTheBitPosition) {
     FakeDriver driver;
     const ProtgenTag& tag = make(driver, "1?COIL?11?boolean-20");
-    EXPECT_EQ(engine::footprint(tag, {9, 10}), (Footprint{17, 1, 8, 1, false}));
-    EXPECT_EQ(engine::footprint(tag, {7, 9}), (Footprint{15, 2, 0, 2, false}));
+    EXPECT_EQ((Footprint{17, 1, 8, 1, false}), engine::footprint(tag, {9, 10}));
+    EXPECT_EQ((Footprint{15, 2, 0, 2, false}), engine::footprint(tag, {7, 9}));
 }
 
 TEST(Footprint, BufferByteFollowsTheItem) {
     FakeDriver driver;
-    EXPECT_EQ(engine::byteOfItem(make(driver, "1?REG?5?short"), 5, 7), 14);
-    EXPECT_EQ(engine::byteOfItem(make(driver, "1?LONG?5?int"), 5, 7), 28);
-    EXPECT_EQ(engine::byteOfItem(make(driver, "1?COIL?5?boolean"), 5, 2), 0);
-    EXPECT_EQ(engine::byteOfItem(make(driver, "1?COIL?5?boolean"), 5, 3), 1);
-    EXPECT_EQ(engine::byteOfItem(make(driver, "1?COIL?5?boolean"), 5, 2000), 250);
+    EXPECT_EQ(14, engine::byteOfItem(make(driver, "1?REG?5?short"), 5, 7));
+    EXPECT_EQ(28, engine::byteOfItem(make(driver, "1?LONG?5?int"), 5, 7));
+    EXPECT_EQ(0, engine::byteOfItem(make(driver, "1?COIL?5?boolean"), 5, 2));
+    EXPECT_EQ(1, engine::byteOfItem(make(driver, "1?COIL?5?boolean"), 5, 3));
+    EXPECT_EQ(250, engine::byteOfItem(make(driver, "1?COIL?5?boolean"), 5, 2000));
 }
 
 TEST(Footprint, FaultsAreNamed) {
@@ -138,7 +138,7 @@ TEST(Footprint, FaultsAreNamed) {
     FakeDriver driver;
     for (const Row& row : kRows) {
         const ProtgenTag& tag = make(driver, row.uri);
-        EXPECT_STREQ(engine::accessFault(tag, engine::itemsOfTag(tag), false), row.fault)
+        EXPECT_STREQ(row.fault, engine::accessFault(tag, engine::itemsOfTag(tag), false))
             << row.uri;
     }
 }

@@ -44,41 +44,41 @@ TEST(ProtgenTag, AddressFieldGivesOffsetAndSubIndex) {
     for (const Row& row : kRows) {
         const ProtgenTag tag(row.uri, kFields);
         SCOPED_TRACE(row.uri != nullptr ? row.uri : "(null)");
-        EXPECT_EQ(tag.offset(), row.offset);
-        EXPECT_EQ(tag.subIndex(), row.subIndex);
-        EXPECT_STREQ(tag.GetVarName(), row.uri != nullptr ? row.uri : "");
+        EXPECT_EQ(row.offset, tag.offset());
+        EXPECT_EQ(row.subIndex, tag.subIndex());
+        EXPECT_STREQ(row.uri != nullptr ? row.uri : "", tag.GetVarName());
     }
 }
 
 TEST(ProtgenTag, AddressFieldIsFoundByName) {
     constexpr const char* kOther[] = {"arrayindex.subindex", "memorytype", nullptr};
-    EXPECT_EQ(ProtgenTag("5.2?REG", kOther).offset(), 5);
-    EXPECT_EQ(ProtgenTag("5.2?REG", kOther).subIndex(), 2);
+    EXPECT_EQ(5, ProtgenTag("5.2?REG", kOther).offset());
+    EXPECT_EQ(2, ProtgenTag("5.2?REG", kOther).subIndex());
     constexpr const char* kNone[] = {"address", nullptr};
-    EXPECT_EQ(ProtgenTag("5.2?REG", kNone).offset(), 0);
-    EXPECT_EQ(ProtgenTag("5.2?REG", nullptr).offset(), 0);
+    EXPECT_EQ(0, ProtgenTag("5.2?REG", kNone).offset());
+    EXPECT_EQ(0, ProtgenTag("5.2?REG", nullptr).offset());
 }
 
 TEST(ProtgenTag, RegisterTagKeepsItemAddressAndSubIndex) {
     FakeDriver driver;
     const ITag* tag = driver.tag("1?REG?1000.21?boolean-4");
-    EXPECT_EQ(tag->GetByteOffset(), 1000U);
-    EXPECT_EQ(tag->GetBitIndex(), 21);
+    EXPECT_EQ(1000U, tag->GetByteOffset());
+    EXPECT_EQ(21, tag->GetBitIndex());
 }
 
 TEST(ProtgenTag, BitMemoryTagTakesItsBitFromTheOffset) {
     FakeDriver driver;
     const ITag* tag = driver.tag("1?COIL?1003.5?boolean");
-    EXPECT_EQ(tag->GetByteOffset(), 125U);
-    EXPECT_EQ(tag->GetBitIndex(), 3);
-    EXPECT_EQ(ProtUtilsN::getStartingBit(tag), 1003);
+    EXPECT_EQ(125U, tag->GetByteOffset());
+    EXPECT_EQ(3, tag->GetBitIndex());
+    EXPECT_EQ(1003, ProtUtilsN::getStartingBit(tag));
 }
 
 TEST(ProtgenTag, BitPositionFollowsTheNormalisedOffset) {
     FakeDriver driver;
     const std::unique_ptr<ITag> copy(driver.tag("1?COIL?1003?boolean")->Clone());
     static_cast<ProtgenTag*>(copy.get())->setOffset(14);
-    EXPECT_EQ(ProtUtilsN::getStartingBit(copy.get()), 14);
+    EXPECT_EQ(14, ProtUtilsN::getStartingBit(copy.get()));
 }
 
 TEST(ProtgenTag, PackedLengthReachesFromTheFirstItemToTheLastBit) {
@@ -102,13 +102,13 @@ TEST(ProtgenTag, PackedLengthReachesFromTheFirstItemToTheLastBit) {
     };
     FakeDriver driver;
     for (const Row& row : kRows)
-        EXPECT_EQ(driver.tag(row.uri)->PackedLen(), row.length) << row.uri;
+        EXPECT_EQ(row.length, driver.tag(row.uri)->PackedLen()) << row.uri;
 }
 
 TEST(ProtgenTag, PackedLengthOfAHugeTagDoesNotWrap) {
     FakeDriver driver;
-    EXPECT_EQ(driver.tag("1?REG?0.2147483647?boolean-2147483647")->PackedLen(),
-              static_cast<int>((2LL * std::numeric_limits<int>::max() + 7) / 8));
+    EXPECT_EQ(static_cast<int>((2LL * std::numeric_limits<int>::max() + 7) / 8),
+              driver.tag("1?REG?0.2147483647?boolean-2147483647")->PackedLen());
 }
 
 TEST(ProtgenTag, ReadOnlyComesFromTheMemoryType) {
@@ -120,11 +120,11 @@ TEST(ProtgenTag, ReadOnlyComesFromTheMemoryType) {
 
 TEST(ProtgenTag, ItemLengthIsThatOfTheMemory) {
     FakeDriver driver;
-    EXPECT_EQ(asProtgen(driver.tag("1?REG?0?double")).memoryItemLength(), 2);
-    EXPECT_EQ(asProtgen(driver.tag("1?LONG?0?double")).memoryItemLength(), 4);
-    EXPECT_EQ(asProtgen(driver.tag("1?BYTE?0?double")).memoryItemLength(), 1);
-    EXPECT_EQ(asProtgen(driver.tag("1?COIL?0?boolean")).memoryItemLength(), 1);
-    EXPECT_EQ(asProtgen(driver.tag("1?NOWHERE?0?double")).memoryItemLength(), 1);
+    EXPECT_EQ(2, asProtgen(driver.tag("1?REG?0?double")).memoryItemLength());
+    EXPECT_EQ(4, asProtgen(driver.tag("1?LONG?0?double")).memoryItemLength());
+    EXPECT_EQ(1, asProtgen(driver.tag("1?BYTE?0?double")).memoryItemLength());
+    EXPECT_EQ(1, asProtgen(driver.tag("1?COIL?0?boolean")).memoryItemLength());
+    EXPECT_EQ(1, asProtgen(driver.tag("1?NOWHERE?0?double")).memoryItemLength());
     EXPECT_TRUE(asProtgen(driver.tag("1?COIL?0?boolean")).inBitMemory());
     EXPECT_FALSE(asProtgen(driver.tag("1?REG?0?boolean")).inBitMemory());
     EXPECT_FALSE(asProtgen(driver.tag("1?NOWHERE?0?boolean")).inBitMemory());
@@ -135,14 +135,14 @@ TEST(ProtgenTag, CloneCarriesEverything) {
     const ProtgenTag& tag = asProtgen(driver.tag("3?REG?20.4?short-3(swap2, neg)"));
     const std::unique_ptr<ITag> clone(tag.Clone());
     const ProtgenTag& copy = asProtgen(clone.get());
-    EXPECT_STREQ(copy.GetVarName(), tag.GetVarName());
-    EXPECT_EQ(copy.nodeId(), 3);
-    EXPECT_EQ(copy.offset(), 20);
-    EXPECT_EQ(copy.subIndex(), 4);
-    EXPECT_EQ(copy.GetVarType(), ICU_Type::shortArray);
-    EXPECT_EQ(copy.GetItemType(), ICU_Type::short_);
-    EXPECT_EQ(copy.GetVarLength(), 6);
-    EXPECT_EQ(copy.memoryType(), tag.memoryType());
-    EXPECT_EQ(copy.model(), tag.model());
-    EXPECT_EQ(copy.conversions(), (std::vector<std::string>{"swap2", "neg"}));
+    EXPECT_STREQ(tag.GetVarName(), copy.GetVarName());
+    EXPECT_EQ(3, copy.nodeId());
+    EXPECT_EQ(20, copy.offset());
+    EXPECT_EQ(4, copy.subIndex());
+    EXPECT_EQ(ICU_Type::shortArray, copy.GetVarType());
+    EXPECT_EQ(ICU_Type::short_, copy.GetItemType());
+    EXPECT_EQ(6, copy.GetVarLength());
+    EXPECT_EQ(tag.memoryType(), copy.memoryType());
+    EXPECT_EQ(tag.model(), copy.model());
+    EXPECT_EQ((std::vector<std::string>{"swap2", "neg"}), copy.conversions());
 }

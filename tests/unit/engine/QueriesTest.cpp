@@ -61,7 +61,7 @@ TEST_F(Queries, BitTagsAreOrderedByTheirBit) {
 }
 
 TEST_F(Queries, NodeIsTheTagsNode) {
-    EXPECT_EQ(driver_.GetNodeID(tag("7?REG?0?short")), 7);
+    EXPECT_EQ(7, driver_.GetNodeID(tag("7?REG?0?short")));
 }
 
 TEST_F(Queries, BitBlocksBelongToBitMemories) {
@@ -87,25 +87,25 @@ TEST_F(Queries, PartOfARegisterNeedsAReadBeforeAWrite) {
         {"1?REG?0?int-0", false},         {"1?NOWHERE?0?byte", false},
     };
     for (const Row& row : kRows)
-        EXPECT_EQ(driver_.NeedsReadBeforeWrite(tag(row.uri)), row.needed) << row.uri;
+        EXPECT_EQ(row.needed, driver_.NeedsReadBeforeWrite(tag(row.uri))) << row.uri;
 }
 
 TEST_F(Queries, BitLimitFollowsTheItemLimit) {
     const auto* coil = static_cast<const ProtgenTag*>(tag("1?COIL?0?boolean"));
-    EXPECT_EQ(driver_.getMaxBitCount(coil, false), 2000);
-    EXPECT_EQ(driver_.getMaxBitCount(coil, true), 1968);
+    EXPECT_EQ(2000, driver_.getMaxBitCount(coil, false));
+    EXPECT_EQ(1968, driver_.getMaxBitCount(coil, true));
 }
 
 TEST_F(Queries, ItemsOfArraysAreNotAddressedUnlessTheDriverSaysSo) {
-    EXPECT_EQ(driver_.ProtgenProtocol::arrayItemByTag(), 0);
+    EXPECT_EQ(0, driver_.ProtgenProtocol::arrayItemByTag());
 }
 
 TEST_F(Queries, DatagramLimitsComeFromTheModel) {
-    EXPECT_EQ(driver_.MaxDatagramItems(tag("1?REG?0?short")), 3);
-    EXPECT_EQ(driver_.MaxDatagramLength(tag("1?REG?0?short")), 10);
+    EXPECT_EQ(3, driver_.MaxDatagramItems(tag("1?REG?0?short")));
+    EXPECT_EQ(10, driver_.MaxDatagramLength(tag("1?REG?0?short")));
     const ProtgenTag loose("1?REG?0?short", nullptr);
-    EXPECT_EQ(driver_.MaxDatagramItems(&loose), 0);
-    EXPECT_EQ(driver_.MaxDatagramLength(&loose), 0);
+    EXPECT_EQ(0, driver_.MaxDatagramItems(&loose));
+    EXPECT_EQ(0, driver_.MaxDatagramLength(&loose));
 }
 
 TEST_F(Queries, DatagramHoldsTagsOfOneNodeWhoseMemoriesTakePart) {
@@ -132,13 +132,13 @@ TEST_F(Queries, DatagramReadIsRefusedUnlessTheDriverHasIt) {
     const ITag* reg = tag("1?REG?0?short");
     unsigned char data[2] = {7, 7};
     idal_error_t status = 5;
-    EXPECT_EQ(driver_.ReadDatagram(&reg, 1, data), 0);
-    EXPECT_EQ(driver_.GetLastError(), -3);
-    EXPECT_STREQ(driver_.GetLastErrorString(), "Datagrams not supported");
-    EXPECT_EQ(driver_.ReadDatagramWithStatus(&reg, 1, data, &status), 0);
-    EXPECT_EQ(status, 5);
-    EXPECT_EQ(data[0], 7);
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ(0, driver_.ReadDatagram(&reg, 1, data));
+    EXPECT_EQ(-3, driver_.GetLastError());
+    EXPECT_STREQ("Datagrams not supported", driver_.GetLastErrorString());
+    EXPECT_EQ(0, driver_.ReadDatagramWithStatus(&reg, 1, data, &status));
+    EXPECT_EQ(5, status);
+    EXPECT_EQ(7, data[0]);
+    EXPECT_EQ("", driver_.calls());
 }
 
 namespace {
@@ -164,9 +164,9 @@ TEST(DatagramHook, ReceivesTheTagsAndStoresTheStatus) {
     std::array<unsigned char, 2> data{};
     std::array<idal_error_t, 2> status{};
     EXPECT_NE(driver.ReadDatagramWithStatus(tags.data(), 2, data.data(), status.data()), 0);
-    EXPECT_EQ(data, (std::array<unsigned char, 2>{4, 6}));
-    EXPECT_EQ(status, (std::array<idal_error_t, 2>{kItemDone, kItemDone}));
+    EXPECT_EQ((std::array<unsigned char, 2>{4, 6}), data);
+    EXPECT_EQ((std::array<idal_error_t, 2>{kItemDone, kItemDone}), status);
     data = {};
     EXPECT_NE(driver.ReadDatagram(tags.data(), 2, data.data()), 0);
-    EXPECT_EQ(data, (std::array<unsigned char, 2>{4, 6}));
+    EXPECT_EQ((std::array<unsigned char, 2>{4, 6}), data);
 }

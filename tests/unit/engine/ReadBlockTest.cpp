@@ -19,7 +19,7 @@ class ReadBlock : public testing::Test {
         Bytes data(static_cast<std::size_t>(length) + 1, kUntouched);
         EXPECT_NE(driver_.ReadBlock(driver_.tag(uri), data.data(), length), 0)
             << uri << ": " << driver_.GetLastErrorString();
-        EXPECT_EQ(data.back(), kUntouched) << uri;
+        EXPECT_EQ(kUntouched, data.back()) << uri;
         data.pop_back();
         return data;
     }
@@ -33,7 +33,7 @@ TEST_F(ReadBlock, AnyLengthBeginsWithTheTagsFirstItem) {
     for (const char* memory : {"REG", "LONG", "BYTE"}) {
         for (const int length : {1, 2, 3, 4, 5, 247, 248, 249, 250, 251, 252, 501, 1003}) {
             const std::string uri = std::string("1?") + memory + "?33?short";
-            EXPECT_EQ(read(uri, length), driver_.memory(memory).bytes(33, length))
+            EXPECT_EQ(driver_.memory(memory).bytes(33, length), read(uri, length))
                 << uri << " length " << length;
         }
     }
@@ -41,7 +41,7 @@ TEST_F(ReadBlock, AnyLengthBeginsWithTheTagsFirstItem) {
 
 TEST_F(ReadBlock, PartOfTheLastItemIsReadWhole) {
     read("1?REG?33?short", 5);
-    EXPECT_EQ(driver_.calls(), "read 33+3");
+    EXPECT_EQ("read 33+3", driver_.calls());
 }
 
 TEST_F(ReadBlock, FailureInAnyBlockLeavesTheBuffer) {
@@ -49,8 +49,8 @@ TEST_F(ReadBlock, FailureInAnyBlockLeavesTheBuffer) {
         for (int call = 1; call <= 2; ++call) {
             Bytes data(static_cast<std::size_t>(length), kUntouched);
             driver_.failCall(call);
-            EXPECT_EQ(driver_.ReadBlock(driver_.tag("1?REG?33?short"), data.data(), length), 0);
-            EXPECT_EQ(data, Bytes(data.size(), kUntouched)) << length << " call " << call;
+            EXPECT_EQ(0, driver_.ReadBlock(driver_.tag("1?REG?33?short"), data.data(), length));
+            EXPECT_EQ(Bytes(data.size(), kUntouched), data) << length << " call " << call;
         }
     }
 }
@@ -73,28 +73,28 @@ TEST_F(ReadBlock, UnusableLengthsAreRefused) {
     };
     for (const Row& row : kRows) {
         unsigned char data = kUntouched;
-        EXPECT_EQ(driver_.ReadBlock(driver_.tag(row.uri), &data, row.length), 0) << row.uri;
-        EXPECT_EQ(driver_.GetLastError(), -1) << row.uri;
-        EXPECT_STREQ(driver_.GetLastErrorString(), row.text) << row.uri << " " << row.length;
-        EXPECT_EQ(data, kUntouched) << row.uri;
+        EXPECT_EQ(0, driver_.ReadBlock(driver_.tag(row.uri), &data, row.length)) << row.uri;
+        EXPECT_EQ(-1, driver_.GetLastError()) << row.uri;
+        EXPECT_STREQ(row.text, driver_.GetLastErrorString()) << row.uri << " " << row.length;
+        EXPECT_EQ(kUntouched, data) << row.uri;
     }
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ("", driver_.calls());
 }
 
 TEST_F(ReadBlock, BitMemoryDeliversTheTagsOwnBits) {
     Bytes data(2, 0);
     ASSERT_NE(driver_.ReadBlock(driver_.tag("1?COIL?21?boolean-10"), data.data(), 2), 0);
-    EXPECT_EQ(driver_.calls(), "readBits 21+10");
+    EXPECT_EQ("readBits 21+10", driver_.calls());
     for (int i = 0; i < 10; ++i) {
         const int bit = data[static_cast<std::size_t>((5 + i) / 8)] >> ((5 + i) % 8) & 1;
-        EXPECT_EQ(bit, driver_.memory("COIL").bit(21 + i)) << i;
+        EXPECT_EQ(driver_.memory("COIL").bit(21 + i), bit) << i;
     }
 }
 
 TEST_F(ReadBlock, BitMemoryFillsLongerBuffersToTheLastBit) {
     Bytes data(3, 0);
     ASSERT_NE(driver_.ReadBlock(driver_.tag("1?COIL?21?boolean"), data.data(), 3), 0);
-    EXPECT_EQ(driver_.calls(), "readBits 21+19");
+    EXPECT_EQ("readBits 21+19", driver_.calls());
 }
 
 TEST_F(ReadBlock, BitBlockLandsAtTheOffsetsBitAndSparesTheOthers) {
@@ -109,7 +109,7 @@ TEST_F(ReadBlock, BitBlockLandsAtTheOffsetsBitAndSparesTheOthers) {
                 const bool inside = k >= offset % 8 && k < offset % 8 + 17;
                 const int expected =
                     inside ? driver_.memory("COIL").bit(16 + k) : kUntouched >> (k % 8) & 1;
-                EXPECT_EQ(bit, expected) << "offset " << offset << " bit " << k;
+                EXPECT_EQ(expected, bit) << "offset " << offset << " bit " << k;
             }
         }
     }
@@ -119,15 +119,15 @@ TEST_F(ReadBlock, BitBlockFailureInTheSecondRequestLeavesTheBuffer) {
     driver_.setLimit(10);
     driver_.failCall(2);
     Bytes data(4, kUntouched);
-    EXPECT_EQ(driver_.ReadBitBlock(driver_.tag("1?COIL?3?boolean"), data.data(), 20), 0);
-    EXPECT_EQ(data, Bytes(4, kUntouched));
-    EXPECT_EQ(driver_.calls(), "readBits 3+10, readBits 13+10");
+    EXPECT_EQ(0, driver_.ReadBitBlock(driver_.tag("1?COIL?3?boolean"), data.data(), 20));
+    EXPECT_EQ(Bytes(4, kUntouched), data);
+    EXPECT_EQ("readBits 3+10, readBits 13+10", driver_.calls());
 }
 
 TEST_F(ReadBlock, RegistersHaveNoBitBlocks) {
     unsigned char data = kUntouched;
-    EXPECT_EQ(driver_.ReadBitBlock(driver_.tag("1?REG?3?boolean"), &data, 1), 0);
-    EXPECT_EQ(driver_.GetLastError(), -3);
-    EXPECT_STREQ(driver_.GetLastErrorString(), "Bit blocks not supported");
-    EXPECT_EQ(data, kUntouched);
+    EXPECT_EQ(0, driver_.ReadBitBlock(driver_.tag("1?REG?3?boolean"), &data, 1));
+    EXPECT_EQ(-3, driver_.GetLastError());
+    EXPECT_STREQ("Bit blocks not supported", driver_.GetLastErrorString());
+    EXPECT_EQ(kUntouched, data);
 }

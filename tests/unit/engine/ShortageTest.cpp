@@ -30,10 +30,10 @@ class Shortage : public testing::Test {
         driver_.onCall([&calls] { ++calls; });
         for (int memory = 0; memory < failures; ++memory) {
             const int done = withMemory(memory, access);
-            EXPECT_EQ(done, 0) << what << " with " << memory;
-            EXPECT_EQ(driver_.GetLastError(), -1) << what << " with " << memory;
-            EXPECT_STREQ(driver_.GetLastErrorString(), "Out of memory") << what;
-            EXPECT_EQ(calls, 0) << what << " with " << memory;
+            EXPECT_EQ(0, done) << what << " with " << memory;
+            EXPECT_EQ(-1, driver_.GetLastError()) << what << " with " << memory;
+            EXPECT_STREQ("Out of memory", driver_.GetLastErrorString()) << what;
+            EXPECT_EQ(0, calls) << what << " with " << memory;
         }
         EXPECT_NE(access(), 0) << what;
     }
@@ -71,8 +71,8 @@ TEST_F(Shortage, DatagramsAreRefused) {
     for (int memory = 0; memory < 2; ++memory) {
         const int done =
             withMemory(memory, [&] { return driver_.ReadDatagram(tags.data(), 1, value_.data()); });
-        EXPECT_EQ(done, 0);
-        EXPECT_STREQ(driver_.GetLastErrorString(), "Out of memory") << memory;
+        EXPECT_EQ(0, done);
+        EXPECT_STREQ("Out of memory", driver_.GetLastErrorString()) << memory;
     }
 }
 

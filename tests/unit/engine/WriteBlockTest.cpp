@@ -42,24 +42,24 @@ TEST_F(WriteBlock, OnlyAPartialLastItemIsAReasonToRead) {
     const Bytes bytes = image(4);
     const ITag* tag = driver_.tag("1?REG?33?short");
     EXPECT_NE(driver_.WriteBlock(tag, bytes.data(), 4), 0);
-    EXPECT_EQ(driver_.calls(), "write 33+2");
+    EXPECT_EQ("write 33+2", driver_.calls());
     EXPECT_NE(driver_.WriteBlock(tag, bytes.data(), 3), 0);
-    EXPECT_EQ(driver_.calls(), "read 33+2, write 33+2");
+    EXPECT_EQ("read 33+2, write 33+2", driver_.calls());
 }
 
 TEST_F(WriteBlock, NothingIsWrittenWhenTheReadFails) {
     const Bytes before = driver_.memory("REG").image();
     driver_.failCall(1);
-    EXPECT_EQ(driver_.WriteBlock(driver_.tag("1?REG?33?short"), image(3).data(), 3), 0);
-    EXPECT_EQ(driver_.GetLastError(), -4);
+    EXPECT_EQ(0, driver_.WriteBlock(driver_.tag("1?REG?33?short"), image(3).data(), 3));
+    EXPECT_EQ(-4, driver_.GetLastError());
     EXPECT_TRUE(driver_.memory("REG").image() == before);
-    EXPECT_EQ(driver_.calls(), "read 33+2");
+    EXPECT_EQ("read 33+2", driver_.calls());
 }
 
 TEST_F(WriteBlock, AreaOfTheDriverItselfIsNeverReadFirst) {
     EXPECT_NE(driver_.WriteBlock(driver_.tag("1?AREA?0?unsignedInt"), image(3).data(), 3), 0);
-    EXPECT_EQ(driver_.calls(), "write 0+1");
-    EXPECT_EQ(driver_.memory("AREA").bytes(0, 4), (Bytes{5, 16, 27, 0}));
+    EXPECT_EQ("write 0+1", driver_.calls());
+    EXPECT_EQ((Bytes{5, 16, 27, 0}), driver_.memory("AREA").bytes(0, 4));
 }
 
 TEST_F(WriteBlock, UnusableBlocksAreRefused) {
@@ -78,20 +78,20 @@ TEST_F(WriteBlock, UnusableBlocksAreRefused) {
     };
     const Bytes bytes = image(8);
     for (const Row& row : kRows) {
-        EXPECT_EQ(driver_.WriteBlock(driver_.tag(row.uri), bytes.data(), row.length), 0) << row.uri;
-        EXPECT_EQ(driver_.GetLastError(), -1) << row.uri;
-        EXPECT_STREQ(driver_.GetLastErrorString(), row.text) << row.uri << " " << row.length;
+        EXPECT_EQ(0, driver_.WriteBlock(driver_.tag(row.uri), bytes.data(), row.length)) << row.uri;
+        EXPECT_EQ(-1, driver_.GetLastError()) << row.uri;
+        EXPECT_STREQ(row.text, driver_.GetLastErrorString()) << row.uri << " " << row.length;
     }
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ("", driver_.calls());
 }
 
 TEST_F(WriteBlock, BitMemoryTakesTheTagsOwnBits) {
     const Bytes bytes = image(2);
     EXPECT_NE(driver_.WriteBlock(driver_.tag("1?COIL?21?boolean-10"), bytes.data(), 2), 0);
-    EXPECT_EQ(driver_.calls(), "writeBits 21+10");
+    EXPECT_EQ("writeBits 21+10", driver_.calls());
     for (int i = 0; i < 10; ++i) {
         const int bit = bytes[static_cast<size_t>((5 + i) / 8)] >> ((5 + i) % 8) & 1;
-        EXPECT_EQ(driver_.memory("COIL").bit(21 + i), bit) << i;
+        EXPECT_EQ(bit, driver_.memory("COIL").bit(21 + i)) << i;
     }
 }
 
@@ -115,8 +115,8 @@ TEST_F(WriteBlock, BitBlockIsTakenFromTheOffsetsBitOn) {
 
 TEST_F(WriteBlock, BitBlocksBelongToBitMemories) {
     const unsigned char byte = 1;
-    EXPECT_EQ(driver_.WriteBitBlock(driver_.tag("1?REG?3?boolean"), &byte, 1), 0);
-    EXPECT_EQ(driver_.GetLastError(), -3);
-    EXPECT_STREQ(driver_.GetLastErrorString(), "Bit blocks not supported");
-    EXPECT_EQ(driver_.calls(), "");
+    EXPECT_EQ(0, driver_.WriteBitBlock(driver_.tag("1?REG?3?boolean"), &byte, 1));
+    EXPECT_EQ(-3, driver_.GetLastError());
+    EXPECT_STREQ("Bit blocks not supported", driver_.GetLastErrorString());
+    EXPECT_EQ("", driver_.calls());
 }
