@@ -54,10 +54,9 @@ class CompressDescription : public testing::Test {
 std::string zlibStream(const std::string& text) {
     uLongf length = compressBound(static_cast<uLong>(text.size()));
     std::string stream(length, '\0');
-    EXPECT_EQ(
-        compress(reinterpret_cast<Bytef*>(stream.data()), &length,
-                 reinterpret_cast<const Bytef*>(text.data()), static_cast<uLong>(text.size())),
-        Z_OK);
+    EXPECT_EQ(Z_OK, compress(reinterpret_cast<Bytef*>(stream.data()), &length,
+                             reinterpret_cast<const Bytef*>(text.data()),
+                             static_cast<uLong>(text.size())));
     stream.resize(length);
     return stream;
 }
@@ -65,31 +64,31 @@ std::string zlibStream(const std::string& text) {
 TEST_F(CompressDescription, FramesAnyDocumentWithItsOwnLength) {
     for (const std::string& text : {std::string("<a/>"), std::string(40000, 'x')}) {
         store(text);
-        ASSERT_EQ(run(output()), 0);
+        ASSERT_EQ(0, run(output()));
         const std::string stream = zlibStream(text);
         std::string expected =
             "<<ICOM_XML_START>>Name=MRTU?FullName=Modbus RTU?Version=126?Platform=KV58_LIN";
         expected.append(1, '\0');
         expected.append("compressedXML=").append(std::to_string(stream.size())).append(1, '\0');
         expected.append(stream).append("<<ICOM_XML_END>>").append(1, '\0');
-        EXPECT_EQ(block(), expected);
+        EXPECT_EQ(expected, block());
     }
 }
 
 TEST_F(CompressDescription, RefusesAMissingDocument) {
-    EXPECT_EQ(run(output()), 1);
+    EXPECT_EQ(1, run(output()));
     EXPECT_FALSE(fs::exists(output()));
 }
 
 TEST_F(CompressDescription, RefusesAnEmptyDocument) {
     store("");
-    EXPECT_EQ(run(output()), 1);
+    EXPECT_EQ(1, run(output()));
     EXPECT_FALSE(fs::exists(output()));
 }
 
 TEST_F(CompressDescription, ReportsAnOutputThatCannotBeWritten) {
     store("<a/>");
-    EXPECT_EQ(run("/dev/full"), 1);
+    EXPECT_EQ(1, run("/dev/full"));
 }
 
 }  // namespace

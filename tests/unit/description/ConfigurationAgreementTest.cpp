@@ -84,7 +84,7 @@ TEST(DescriptionAndConfiguration, KnowTheSameKeys) {
         ++keys[textOf(parameter)];
     EXPECT_EQ(keys.size(), stored.size());
     for (const auto& [key, read] : stored)
-        EXPECT_EQ(keys[key], 1) << key;
+        EXPECT_EQ(1, keys[key]) << key;
 }
 
 TEST(DescriptionAndConfiguration, VersionIsTheMarkerOfTheFormat) {
@@ -108,7 +108,7 @@ TEST(DescriptionAndConfiguration, EveryMandatoryKeyIsMissedByTheReader) {
         items.erase(key);
         ParamManager manager;
         EXPECT_FALSE(manager.parse(configuration(items).c_str())) << key;
-        EXPECT_EQ(manager.getLastError(), "Parser: parameter '" + key + "' is not found");
+        EXPECT_EQ("Parser: parameter '" + key + "' is not found", manager.getLastError());
     }
 }
 
@@ -119,13 +119,13 @@ TEST(DescriptionAndConfiguration, DefaultOfEveryOptionalKeyIsTheReadersDefault) 
     for (const auto& parameter : configurable()) {
         if (flag(parameter, "isMandatory")) continue;
         const std::string key = textOf(parameter);
-        EXPECT_EQ(parameter.attribute("defaultValue").value(), stored.at(key)(manager, -1)) << key;
+        EXPECT_EQ(stored.at(key)(manager, -1), parameter.attribute("defaultValue").value()) << key;
         EXPECT_STREQ(parameter.attribute("default").value(),
                      parameter.attribute("defaultValue").value())
             << key;
         ++compared;
     }
-    EXPECT_EQ(compared, 10);
+    EXPECT_EQ(10, compared);
 }
 
 TEST(DescriptionAndConfiguration, EveryDefaultIsAmongTheChoices) {
@@ -146,11 +146,11 @@ TEST(DescriptionAndConfiguration, EveryChoiceIsReadAsWritten) {
             items[key] = choice;
             ParamManager manager;
             ASSERT_TRUE(manager.parse(configuration(items).c_str())) << key << "=" << choice;
-            EXPECT_EQ(stored.at(key)(manager, -1), choice) << key;
+            EXPECT_EQ(choice, stored.at(key)(manager, -1)) << key;
             ++compared;
         }
     }
-    EXPECT_EQ(compared, 2 + 2 + 2 + 16 + 11 + 3 + 2 + 2 + 3);
+    EXPECT_EQ(2 + 2 + 2 + 16 + 11 + 3 + 2 + 2 + 3, compared);
 }
 
 TEST(DescriptionAndConfiguration, EveryChoiceOfLineSettingsHasACode) {
@@ -184,11 +184,11 @@ TEST(DescriptionAndConfiguration, NodePropertiesMayBeGivenForOneNode) {
         items[nodePrefix + key] = value;
         ParamManager manager;
         ASSERT_TRUE(manager.parse(configuration(items).c_str())) << key;
-        EXPECT_EQ(stored.at(key)(manager, node), value) << key;
+        EXPECT_EQ(value, stored.at(key)(manager, node)) << key;
         EXPECT_NE(stored.at(key)(manager, -1), value) << key << " leaks to other nodes";
         ++compared;
     }
-    EXPECT_EQ(compared, 10);
+    EXPECT_EQ(10, compared);
 }
 
 TEST(DescriptionAndConfiguration, OtherPropertiesOfOneNodeAreNotSeen) {
@@ -203,11 +203,11 @@ TEST(DescriptionAndConfiguration, OtherPropertiesOfOneNodeAreNotSeen) {
         items[nodePrefix + key] = value;
         ParamManager manager;
         const bool accepted = manager.parse(configuration(items).c_str());
-        EXPECT_EQ(accepted, !flag(parameter, "isMandatory")) << key;
+        EXPECT_EQ(!flag(parameter, "isMandatory"), accepted) << key;
         EXPECT_NE(stored.at(key)(manager, node), value) << key;
         ++compared;
     }
-    EXPECT_EQ(compared, 7);
+    EXPECT_EQ(7, compared);
 }
 
 TEST(DescriptionAndConfiguration, DistinctParameterHasNoCommonValueWhereThereAreNodes) {
@@ -216,8 +216,8 @@ TEST(DescriptionAndConfiguration, DistinctParameterHasNoCommonValueWhereThereAre
         Items items = mandatoryDefaults();
         items[key] = anotherValue(key, parameter);
         items[nodePrefix + std::string("delay")] = "1";
-        EXPECT_EQ(ParamManager().parse(configuration(items).c_str()),
-                  !flag(parameter, "isDistinct"))
+        EXPECT_EQ(!flag(parameter, "isDistinct"),
+                  ParamManager().parse(configuration(items).c_str()))
             << key;
     }
 }
@@ -231,11 +231,11 @@ TEST(DescriptionAndConfiguration, LimitsOfTheRegisterBlockAreTheReadersLimits) {
     items["maxOptLen"] = std::to_string(max + 1);
     ParamManager manager;
     ASSERT_TRUE(manager.parse(configuration(items).c_str()));
-    EXPECT_EQ(manager.getNodeParams(-1)->maxOptLen, max);
+    EXPECT_EQ(max, manager.getNodeParams(-1)->maxOptLen);
 
     items["maxOptLen"] = std::to_string(min);
     ASSERT_TRUE(manager.parse(configuration(items).c_str()));
-    EXPECT_EQ(manager.getNodeParams(-1)->maxOptLen, min);
+    EXPECT_EQ(min, manager.getNodeParams(-1)->maxOptLen);
 
     items["maxOptLen"] = std::to_string(min - 1);
     EXPECT_FALSE(manager.parse(configuration(items).c_str()));
@@ -250,8 +250,8 @@ TEST(DescriptionAndConfiguration, DefaultModelIsADescribedModel) {
 
 TEST(DescriptionAndConfiguration, MarkParityIsAcceptedThoughNotOffered) {
     EXPECT_TRUE(childWithText(described("parity"), "mark").empty());
-    EXPECT_EQ(_MRTU::parityCode("mark"), 3);
-    EXPECT_EQ(_MRTU::parityCode("space"), -1) << "no further difference";
+    EXPECT_EQ(3, _MRTU::parityCode("mark"));
+    EXPECT_EQ(-1, _MRTU::parityCode("space")) << "no further difference";
 }
 
 TEST(DescriptionAndConfiguration, DataBitsAreMandatoryYetNotReadInRtu) {
@@ -259,13 +259,13 @@ TEST(DescriptionAndConfiguration, DataBitsAreMandatoryYetNotReadInRtu) {
     ASSERT_TRUE(flag(bits, "isMandatory"));
     const std::vector<std::string> modes =
         childTexts(described(bits.attribute("disable_list_id").value()));
-    EXPECT_EQ(modes.at(bits.attribute("disable_list_entry").as_uint(99)), "RTU");
+    EXPECT_EQ("RTU", modes.at(bits.attribute("disable_list_entry").as_uint(99)));
 
     for (const std::string& mode : modes) {
         Items items = mandatoryDefaults();
         items["txMode"] = mode;
         items.erase("bits");
-        EXPECT_EQ(ParamManager().parse(configuration(items).c_str()), mode == "RTU") << mode;
+        EXPECT_EQ(mode == "RTU", ParamManager().parse(configuration(items).c_str())) << mode;
     }
 }
 

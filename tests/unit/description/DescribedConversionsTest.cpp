@@ -23,7 +23,7 @@ const std::vector<Conversion> conversions{
 };
 
 TEST(DescriptionConversions, SectionHasItsDisplayText) {
-    EXPECT_EQ(attributesOf(root().child("conversions")), (Attributes{{"display", "Conversions"}}));
+    EXPECT_EQ((Attributes{{"display", "Conversions"}}), attributesOf(root().child("conversions")));
 }
 
 TEST(DescriptionConversions, NamesStandInOrder) {
@@ -31,15 +31,15 @@ TEST(DescriptionConversions, NamesStandInOrder) {
     names.reserve(conversions.size());
     for (const Conversion& conversion : conversions)
         names.push_back(conversion.name);
-    EXPECT_EQ(childTexts(root().child("conversions")), names);
+    EXPECT_EQ(names, childTexts(root().child("conversions")));
 }
 
 TEST(DescriptionConversions, AttributesAreThoseOfTheConversionAndInOrder) {
     for (const Conversion& conversion : conversions) {
         const auto element = childWithText(root().child("conversions"), conversion.name);
-        EXPECT_STREQ(element.name(), "conversion") << conversion.name;
-        EXPECT_EQ(attributesOf(element),
-                  (Attributes{{"display", conversion.display}, {"icomTypes", conversion.mask}}))
+        EXPECT_STREQ("conversion", element.name()) << conversion.name;
+        EXPECT_EQ((Attributes{{"display", conversion.display}, {"icomTypes", conversion.mask}}),
+                  attributesOf(element))
             << conversion.name;
     }
 }

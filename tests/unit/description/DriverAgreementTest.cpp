@@ -20,7 +20,7 @@ class DescriptionAndDriver : public testing::Test {
   protected:
     void SetUp() override {
         module_ = static_cast<IProtModule*>(plugin_.CreateInterface("IProtModule"));
-        ASSERT_EQ(module_->Init(&host_), 1);
+        ASSERT_EQ(1, module_->Init(&host_));
         factory_ = static_cast<IProtocolFactory*>(plugin_.CreateInterface("IProtocolFactory"));
         protocol_ = factory_->CreateProtocol("MRTU");
         ASSERT_NE(protocol_, nullptr);
@@ -69,17 +69,17 @@ std::string fact(const char* element) {
 }
 
 TEST_F(DescriptionAndDriver, ProtocolHandsOutTheBlock) {
-    EXPECT_EQ(protocol().GetXml(), GetXml_MRTU());
+    EXPECT_EQ(GetXml_MRTU(), protocol().GetXml());
 }
 
 TEST_F(DescriptionAndDriver, AgreeOnNamesAndNumbers) {
-    EXPECT_EQ(fact("name"), protocol().GetName());
-    EXPECT_EQ(fact("display"), protocol().GetProtocolName());
-    EXPECT_EQ(fact("code"), std::to_string(protocol().GetProtocolType()));
+    EXPECT_EQ(protocol().GetName(), fact("name"));
+    EXPECT_EQ(protocol().GetProtocolName(), fact("display"));
+    EXPECT_EQ(std::to_string(protocol().GetProtocolType()), fact("code"));
     const std::string version = "Version=" + std::to_string(protocol().GetProtocolVersion()) + "?";
     const std::string markerTail = version + "Platform=KV58_LIN";
     const char* lengthLine = reinterpret_cast<const char*>(GetXml_MRTU());
-    EXPECT_EQ(std::string(lengthLine - markerTail.size() - 1, markerTail.size()), markerTail);
+    EXPECT_EQ(markerTail, std::string(lengthLine - markerTail.size() - 1, markerTail.size()));
 }
 
 TEST_F(DescriptionAndDriver, AgreeOnTheFieldsOfATagUri) {
@@ -88,14 +88,14 @@ TEST_F(DescriptionAndDriver, AgreeOnTheFieldsOfATagUri) {
     for (int i = 0; i < protocol7().getTagUriFieldCount(); ++i) {
         names.emplace_back(protocol7().getTagUriFieldName(i));
     }
-    EXPECT_EQ(childTexts(root().child("tag_uri")), names);
+    EXPECT_EQ(names, childTexts(root().child("tag_uri")));
 }
 
 TEST_F(DescriptionAndDriver, AgreeThatThereAreNoMultipleReadsAndWrites) {
     auto* later = static_cast<IProtocol3*>(protocol().ConvertTo("IProtocol3"));
     ASSERT_NE(later, nullptr);
-    EXPECT_EQ(fact("canMultipleRead") == "true", later->MultipleReadSupported());
-    EXPECT_EQ(fact("canMultipleWrite") == "true", later->MultipleWriteSupported());
+    EXPECT_EQ(later->MultipleReadSupported(), fact("canMultipleRead") == "true");
+    EXPECT_EQ(later->MultipleWriteSupported(), fact("canMultipleWrite") == "true");
 }
 
 TEST_F(DescriptionAndDriver, ConsoleShowsTheLengthLine) {
@@ -103,9 +103,9 @@ TEST_F(DescriptionAndDriver, ConsoleShowsTheLengthLine) {
     ASSERT_NE(console, nullptr);
     char answer[64];
     std::memset(answer, 'x', sizeof answer);
-    EXPECT_EQ(console->DoCommand("xml", answer, sizeof answer), 1);
-    EXPECT_STREQ(answer, "compressedXML=2224");
-    EXPECT_EQ(answer[sizeof answer - 1], '\0') << "padded to the end";
+    EXPECT_EQ(1, console->DoCommand("xml", answer, sizeof answer));
+    EXPECT_STREQ("compressedXML=2224", answer);
+    EXPECT_EQ('\0', answer[sizeof answer - 1]) << "padded to the end";
 }
 
 /// A data type that the area admits, as a tag URI writes it.
@@ -137,18 +137,18 @@ TEST_F(DescriptionAndDriver, TagsMayUseTheOfferedRangesAndNothingBeyond) {
             ++compared;
         }
     }
-    EXPECT_EQ(compared, 4 + 3 + 12 + 12);
+    EXPECT_EQ(4 + 3 + 12 + 12, compared);
 }
 
 TEST_F(DescriptionAndDriver, WriteFunctionsOfferedAreTheFunctionsUsed) {
     const auto parameters = root().child("parameters");
     for (const std::string& choice : childTexts(childWithText(parameters, "presetFunction"))) {
         configure("presetFunction=" + choice);
-        EXPECT_EQ(writeFunctionOf("1?HREG?400001?unsignedShort"), std::stoi(choice));
+        EXPECT_EQ(std::stoi(choice), writeFunctionOf("1?HREG?400001?unsignedShort"));
     }
     for (const std::string& choice : childTexts(childWithText(parameters, "forceFunction"))) {
         configure("forceFunction=" + choice);
-        EXPECT_EQ(writeFunctionOf("1?OUTP?1?boolean"), std::stoi(choice));
+        EXPECT_EQ(std::stoi(choice), writeFunctionOf("1?OUTP?1?boolean"));
     }
 }
 

@@ -47,15 +47,15 @@ constexpr std::array facts{
 };
 
 TEST(DescriptionIdentity, RootIsTheProtocolConfiguration) {
-    EXPECT_STREQ(root().name(), "protocol_cfg");
+    EXPECT_STREQ("protocol_cfg", root().name());
     EXPECT_TRUE(attributesOf(root()).empty());
 }
 
 TEST(DescriptionIdentity, FactsStandInOrderWithTheirValues) {
     pugi::xml_node element = root().first_child();
     for (const Fact& fact : facts) {
-        EXPECT_EQ(element.name(), fact.element);
-        EXPECT_EQ(element.child_value(), fact.value) << fact.element;
+        EXPECT_EQ(fact.element, element.name());
+        EXPECT_EQ(fact.value, element.child_value()) << fact.element;
         element = element.next_sibling();
     }
 }
@@ -66,13 +66,14 @@ TEST(DescriptionIdentity, SectionsFollowTheFactsInOrder) {
         names.emplace_back(child.name());
     ASSERT_GE(names.size(), facts.size());
     names.erase(names.begin(), names.begin() + facts.size());
-    EXPECT_EQ(names, (std::vector<std::string>{"parameters", "memtypes", "tag_uri", "models",
-                                               "conversions"}));
+    EXPECT_EQ(
+        (std::vector<std::string>{"parameters", "memtypes", "tag_uri", "models", "conversions"}),
+        names);
 }
 
 TEST(DescriptionIdentity, NodesAreLocatedByTheirSlaveNumber) {
-    EXPECT_EQ(attributesOf(root().child("plcnet")),
-              (Attributes{{"alwaysEnable", "false"}, {"locator", "slaveid"}}));
+    EXPECT_EQ((Attributes{{"alwaysEnable", "false"}, {"locator", "slaveid"}}),
+              attributesOf(root().child("plcnet")));
 }
 
 }  // namespace

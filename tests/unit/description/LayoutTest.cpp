@@ -18,7 +18,7 @@ TEST(DescriptionLayout, IsWellFormed) {
     const std::string text = inflateDocument().text;
     const XML_Status status =
         XML_Parse(parser.get(), text.data(), static_cast<int>(text.size()), XML_TRUE);
-    EXPECT_EQ(status, XML_STATUS_OK) << XML_ErrorString(XML_GetErrorCode(parser.get()))
+    EXPECT_EQ(XML_STATUS_OK, status) << XML_ErrorString(XML_GetErrorCode(parser.get()))
                                      << " in line " << XML_GetCurrentLineNumber(parser.get());
 }
 
@@ -34,7 +34,7 @@ TEST(DescriptionLayout, EndsWithALineFeed) {
 }
 
 TEST(DescriptionLayout, HasNeitherCarriageReturnsNorTabs) {
-    EXPECT_EQ(inflateDocument().text.find_first_of("\r\t"), std::string::npos);
+    EXPECT_EQ(std::string::npos, inflateDocument().text.find_first_of("\r\t"));
 }
 
 /// How many levels deeper the line leads: tags that it opens minus tags that it closes.
@@ -52,11 +52,11 @@ TEST(DescriptionLayout, EveryElementStandsOnItsOwnLineIndentedByFourSpacesALevel
         const std::string content = line.substr(indent);
         const bool closes = content.starts_with("</");
         if (closes) --level;
-        EXPECT_EQ(indent, 4 * level) << line;
-        EXPECT_EQ(content.front(), '<') << line;
+        EXPECT_EQ(4 * level, indent) << line;
+        EXPECT_EQ('<', content.front()) << line;
         if (!closes) level += static_cast<std::size_t>(levelsOpened(content));
     }
-    EXPECT_EQ(level, 0U);
+    EXPECT_EQ(0U, level);
 }
 
 TEST(DescriptionLayout, EmptyElementEndsWithoutABlank) {
@@ -68,7 +68,7 @@ TEST(DescriptionLayout, EmptyElementEndsWithoutABlank) {
 TEST(DescriptionLayout, GreaterThanStandsUnescapedInDisplayTexts) {
     const std::string text = inflateDocument().text;
     EXPECT_NE(text.find("display=\"ABCD->CDAB\""), std::string::npos);
-    EXPECT_EQ(text.find('&'), std::string::npos);
+    EXPECT_EQ(std::string::npos, text.find('&'));
 }
 
 }  // namespace

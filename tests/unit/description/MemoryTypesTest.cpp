@@ -69,14 +69,14 @@ TEST(DescriptionMemoryTypes, NamesStandInOrder) {
     names.reserve(areas.size());
     for (const Area& area : areas)
         names.push_back(area.name);
-    EXPECT_EQ(childTexts(root().child("memtypes")), names);
+    EXPECT_EQ(names, childTexts(root().child("memtypes")));
 }
 
 TEST(DescriptionMemoryTypes, AttributesAreThoseOfTheAreaAndInOrder) {
     for (const Area& area : areas) {
         const auto element = childWithText(root().child("memtypes"), area.name);
-        EXPECT_STREQ(element.name(), "memtype") << area.name;
-        EXPECT_EQ(attributesOf(element), expectedAttributes(area)) << area.name;
+        EXPECT_STREQ("memtype", element.name()) << area.name;
+        EXPECT_EQ(expectedAttributes(area), attributesOf(element)) << area.name;
     }
 }
 

@@ -59,16 +59,16 @@ const std::vector<ModelRow> models{
 };
 
 TEST(DescriptionModels, ModelsStandInOrder) {
-    EXPECT_EQ(childTexts(root().child("models")), (std::vector<std::string>{"1", "2", "3", "4"}));
+    EXPECT_EQ((std::vector<std::string>{"1", "2", "3", "4"}), childTexts(root().child("models")));
 }
 
 TEST(DescriptionModels, ModelsCarryTheirDisplayTextAndNoDatagrams) {
     for (const ModelRow& model : models) {
         const auto element = childWithText(root().child("models"), model.name);
-        EXPECT_STREQ(element.name(), "model");
-        EXPECT_EQ(attributesOf(element),
-                  (Attributes{
-                      {"display", model.display}, {"datagramCount", "0"}, {"datagramLength", "0"}}))
+        EXPECT_STREQ("model", element.name());
+        EXPECT_EQ((Attributes{
+                      {"display", model.display}, {"datagramCount", "0"}, {"datagramLength", "0"}}),
+                  attributesOf(element))
             << model.name;
     }
 }
@@ -79,12 +79,13 @@ TEST(DescriptionModels, AreasStandInOrderWithTheirRanges) {
         std::vector<std::string> names;
         for (const Offer& offer : model.offers)
             names.push_back(offer.name);
-        EXPECT_EQ(childTexts(element), names) << "model " << model.name;
+        EXPECT_EQ(names, childTexts(element)) << "model " << model.name;
         for (const Offer& offer : model.offers) {
             const auto reference = childWithText(element, offer.name);
-            EXPECT_STREQ(reference.name(), "memtype_ref");
-            EXPECT_EQ(attributesOf(reference), (Attributes{{"min", std::to_string(offer.min)},
-                                                           {"max", std::to_string(offer.max)}}))
+            EXPECT_STREQ("memtype_ref", reference.name());
+            EXPECT_EQ((Attributes{{"min", std::to_string(offer.min)},
+                                  {"max", std::to_string(offer.max)}}),
+                      attributesOf(reference))
                 << "model " << model.name << ", " << offer.name;
         }
     }

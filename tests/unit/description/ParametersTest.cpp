@@ -83,21 +83,21 @@ TEST(DescriptionParameters, KeysStandInOrder) {
     keys.reserve(parameters.size());
     for (const Parameter& row : parameters)
         keys.push_back(row.key);
-    EXPECT_EQ(childTexts(root().child("parameters")), keys);
+    EXPECT_EQ(keys, childTexts(root().child("parameters")));
 }
 
 TEST(DescriptionParameters, AttributesAreThoseOfTheirKeysAndInOrder) {
     for (const Parameter& row : parameters) {
         const auto element = childWithText(root().child("parameters"), row.key);
-        EXPECT_STREQ(element.name(), "parameter") << row.key;
-        EXPECT_EQ(attributesOf(element), expectedAttributes(row)) << row.key;
+        EXPECT_STREQ("parameter", element.name()) << row.key;
+        EXPECT_EQ(expectedAttributes(row), attributesOf(element)) << row.key;
     }
 }
 
 TEST(DescriptionParameters, ChoicesAreListedInOrder) {
     for (const Parameter& row : parameters) {
         const auto element = childWithText(root().child("parameters"), row.key);
-        EXPECT_EQ(childTexts(element), row.choices) << row.key;
+        EXPECT_EQ(row.choices, childTexts(element)) << row.key;
         for (const auto& entry : element.children("list_entry")) {
             EXPECT_TRUE(attributesOf(entry).empty()) << row.key;
         }

@@ -51,21 +51,21 @@ std::string typeString(ICU_Type type) {
 /// Everything but the range, which belongs to the model.
 void expectSameSettings(const MemoryType& type, const pugi::xml_node& described) {
     SCOPED_TRACE(type.getName());
-    EXPECT_EQ(described.attribute("naturalType").value(), typeString(type.getNaturalType()));
-    EXPECT_EQ(described.attribute("icomTypes").as_uint(),
-              static_cast<unsigned>(type.getIcomTypes()));
-    EXPECT_EQ(described.attribute("blockReadCount").as_int(-1), type.getBlockReadCount());
-    EXPECT_EQ(described.attribute("blockWriteCount").as_int(-1), type.getBlockWriteCount());
-    EXPECT_EQ(described.attribute("canBitWrite").as_bool(), type.isBitWrite());
-    EXPECT_EQ(described.attribute("canBitArrayWrite").as_bool(), type.isBitArrayWrite());
-    EXPECT_EQ(described.attribute("mustBitRead").as_bool(), type.isBitRead());
-    EXPECT_EQ(described.attribute("isReadOnly").as_bool(), type.isReadOnly());
-    EXPECT_EQ(described.attribute("isWriteOnly").as_bool(), type.isWriteOnly());
-    EXPECT_EQ(described.attribute("isSwap2").as_bool(), type.isSwap2());
-    EXPECT_EQ(described.attribute("isSwap4").as_bool(), type.isSwap4());
-    EXPECT_EQ(described.attribute("isSwap8").as_bool(), type.isSwap8());
-    EXPECT_EQ(described.attribute("useInDatagram").as_bool(), type.isInDatagram());
-    EXPECT_EQ(described.attribute("hasInternalConversion").as_bool(), type.hasInternalConversion());
+    EXPECT_EQ(typeString(type.getNaturalType()), described.attribute("naturalType").value());
+    EXPECT_EQ(static_cast<unsigned>(type.getIcomTypes()),
+              described.attribute("icomTypes").as_uint());
+    EXPECT_EQ(type.getBlockReadCount(), described.attribute("blockReadCount").as_int(-1));
+    EXPECT_EQ(type.getBlockWriteCount(), described.attribute("blockWriteCount").as_int(-1));
+    EXPECT_EQ(type.isBitWrite(), described.attribute("canBitWrite").as_bool());
+    EXPECT_EQ(type.isBitArrayWrite(), described.attribute("canBitArrayWrite").as_bool());
+    EXPECT_EQ(type.isBitRead(), described.attribute("mustBitRead").as_bool());
+    EXPECT_EQ(type.isReadOnly(), described.attribute("isReadOnly").as_bool());
+    EXPECT_EQ(type.isWriteOnly(), described.attribute("isWriteOnly").as_bool());
+    EXPECT_EQ(type.isSwap2(), described.attribute("isSwap2").as_bool());
+    EXPECT_EQ(type.isSwap4(), described.attribute("isSwap4").as_bool());
+    EXPECT_EQ(type.isSwap8(), described.attribute("isSwap8").as_bool());
+    EXPECT_EQ(type.isInDatagram(), described.attribute("useInDatagram").as_bool());
+    EXPECT_EQ(type.hasInternalConversion(), described.attribute("hasInternalConversion").as_bool());
 }
 
 TEST(DescriptionAndRegistry, HaveTheSameModels) {
@@ -73,14 +73,14 @@ TEST(DescriptionAndRegistry, HaveTheSameModels) {
     for (const Model& model : registry().getModels()) {
         names.push_back(model.getName());
         const auto described = describedModel(model.getName());
-        EXPECT_EQ(described.attribute("datagramCount").as_int(-1), model.getMaxDatagramItems());
-        EXPECT_EQ(described.attribute("datagramLength").as_int(-1), model.getMaxDatagramLength());
+        EXPECT_EQ(model.getMaxDatagramItems(), described.attribute("datagramCount").as_int(-1));
+        EXPECT_EQ(model.getMaxDatagramLength(), described.attribute("datagramLength").as_int(-1));
     }
-    EXPECT_EQ(childTexts(root().child("models")), names);
+    EXPECT_EQ(names, childTexts(root().child("models")));
 }
 
 TEST(DescriptionAndRegistry, HaveTheSameMemoryTypesInTheSameOrder) {
-    EXPECT_EQ(childTexts(root().child("memtypes")), registeredNames(*registry().getModel("3")));
+    EXPECT_EQ(registeredNames(*registry().getModel("3")), childTexts(root().child("memtypes")));
 }
 
 TEST(DescriptionAndRegistry, AgreeOnEveryMemoryTypeInEveryModel) {
@@ -99,8 +99,8 @@ TEST(DescriptionAndRegistry, GeneralRangesAreThoseOfModelOneAndForLongThoseOfMod
         const std::string name = textOf(described);
         const MemoryType* type = registry().getMemoryType(name == "LONG" ? "3" : "1", name);
         ASSERT_NE(type, nullptr) << name;
-        EXPECT_EQ(described.attribute("min").as_int(-1), type->getMinIndex()) << name;
-        EXPECT_EQ(described.attribute("max").as_int(-1), type->getMaxIndex()) << name;
+        EXPECT_EQ(type->getMinIndex(), described.attribute("min").as_int(-1)) << name;
+        EXPECT_EQ(type->getMaxIndex(), described.attribute("max").as_int(-1)) << name;
     }
 }
 
@@ -110,8 +110,8 @@ TEST(DescriptionAndRegistry, EveryAreaOfferedInAModelIsRegisteredWithTheSameRang
             SCOPED_TRACE("model " + textOf(described) + ", " + textOf(reference));
             const MemoryType* type = registry().getMemoryType(textOf(described), textOf(reference));
             ASSERT_NE(type, nullptr);
-            EXPECT_EQ(reference.attribute("min").as_int(-1), type->getMinIndex());
-            EXPECT_EQ(reference.attribute("max").as_int(-1), type->getMaxIndex());
+            EXPECT_EQ(type->getMinIndex(), reference.attribute("min").as_int(-1));
+            EXPECT_EQ(type->getMaxIndex(), reference.attribute("max").as_int(-1));
         }
     }
 }
@@ -125,15 +125,15 @@ TEST(DescriptionAndRegistry, DifferInExactlyTheListedAreas) {
                 difference.push_back(name);
             }
         }
-        EXPECT_EQ(difference, missing) << "model " << model;
+        EXPECT_EQ(missing, difference) << "model " << model;
     }
 }
 
 TEST(DescriptionAndRegistry, InputRegistersOfModelTwoAreRegisteredThoughNotOffered) {
     const MemoryType* type = registry().getMemoryType("2", "IREG");
     ASSERT_NE(type, nullptr);
-    EXPECT_EQ(type->getMinIndex(), 300000);
-    EXPECT_EQ(type->getMaxIndex(), 365535);
+    EXPECT_EQ(300000, type->getMinIndex());
+    EXPECT_EQ(365535, type->getMaxIndex());
     EXPECT_TRUE(childWithText(describedModel("2"), "IREG").empty());
 }
 

@@ -27,23 +27,24 @@ TEST(DescriptionTagFields, FieldsStandInTheOrderOfTheAddress) {
     names.reserve(fields.size());
     for (const Field& field : fields)
         names.push_back(field.name);
-    EXPECT_EQ(childTexts(root().child("tag_uri")), names);
+    EXPECT_EQ(names, childTexts(root().child("tag_uri")));
 }
 
 TEST(DescriptionTagFields, AttributesAreThoseOfTheFieldAndInOrder) {
     for (const Field& field : fields) {
         const auto element = childWithText(root().child("tag_uri"), field.name);
-        EXPECT_STREQ(element.name(), "tag_field") << field.name;
-        EXPECT_EQ(attributesOf(element), (Attributes{{"display", field.display},
-                                                     {"default", field.preset},
-                                                     {"arrayType", "false"},
-                                                     {"readonly", "true"},
-                                                     {"group", field.group},
-                                                     {"type", field.type},
-                                                     {"conversion", "true"},
-                                                     {"sub", field.sub},
-                                                     {"ExcludeOnlyIf", "false"},
-                                                     {"isMandatory", "true"}}))
+        EXPECT_STREQ("tag_field", element.name()) << field.name;
+        EXPECT_EQ((Attributes{{"display", field.display},
+                              {"default", field.preset},
+                              {"arrayType", "false"},
+                              {"readonly", "true"},
+                              {"group", field.group},
+                              {"type", field.type},
+                              {"conversion", "true"},
+                              {"sub", field.sub},
+                              {"ExcludeOnlyIf", "false"},
+                              {"isMandatory", "true"}}),
+                  attributesOf(element))
             << field.name;
     }
 }
