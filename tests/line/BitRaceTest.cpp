@@ -28,8 +28,8 @@ TEST(BitRaceTest, FlippingBitsOfOneRegisterLosesNoUpdateOnALine) {
     std::thread second(flip, high);
     first.join();
     second.join();
-    EXPECT_EQ(lost, 0) << line.lastError();
-    EXPECT_EQ(line.simulator.slave().get(1, sim::Area::holdingRegister, 9), 0U);
+    EXPECT_EQ(0, lost) << line.lastError();
+    EXPECT_EQ(0U, line.simulator.slave().get(1, sim::Area::holdingRegister, 9));
 }
 
 }  // namespace

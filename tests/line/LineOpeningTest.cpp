@@ -31,54 +31,54 @@ void expectSameSettings(const termios& a, const termios& b) {
 }
 
 TEST_F(LineTest, UnmappedNamesHaveNoPort) {
-    EXPECT_EQ(factory.openPort("com2"), nullptr);
-    EXPECT_EQ(factory.lastError(), "com2: no device is mapped to this port");
+    EXPECT_EQ(nullptr, factory.openPort("com2"));
+    EXPECT_EQ("com2: no device is mapped to this port", factory.lastError());
     for (const char* name : {"com0", "com17", "COM1", "com01", "com1 ", ""}) {
-        EXPECT_EQ(factory.openPort(name), nullptr) << name;
-        EXPECT_EQ(factory.lastError(), std::string(name) + ": not a port name (com1 .. com16)");
+        EXPECT_EQ(nullptr, factory.openPort(name)) << name;
+        EXPECT_EQ(std::string(name) + ": not a port name (com1 .. com16)", factory.lastError());
     }
-    EXPECT_EQ(factory.openPort(nullptr), nullptr);
+    EXPECT_EQ(nullptr, factory.openPort(nullptr));
 }
 
 TEST_F(LineTest, AllSixteenNamesCanBeMappedAndUnmapped) {
     for (int number = 1; number <= 16; ++number) {
         const std::string name = "com" + std::to_string(number);
         EXPECT_TRUE(factory.mapPort(name, "/dev/somewhere")) << name;
-        EXPECT_EQ(factory.deviceOf(name), "/dev/somewhere") << name;
+        EXPECT_EQ("/dev/somewhere", factory.deviceOf(name)) << name;
     }
     EXPECT_FALSE(factory.mapPort("com17", "/dev/somewhere"));
     EXPECT_TRUE(factory.mapPort("com3", ""));
-    EXPECT_EQ(factory.deviceOf("com3"), "");
+    EXPECT_EQ("", factory.deviceOf("com3"));
 }
 
 TEST_F(LineTest, DeviceThatIsNotThereIsNamed) {
     factory.mapPort("com1", "/dev/ttyNowhere9");
-    EXPECT_EQ(factory.openPort("com1"), nullptr);
-    EXPECT_EQ(factory.lastError(), "com1: /dev/ttyNowhere9: No such file or directory");
+    EXPECT_EQ(nullptr, factory.openPort("com1"));
+    EXPECT_EQ("com1: /dev/ttyNowhere9: No such file or directory", factory.lastError());
 }
 
 TEST_F(LineTest, WhatIsNoTerminalIsRefused) {
     factory.mapPort("com1", "/dev/null");
-    EXPECT_EQ(factory.openPort("com1"), nullptr);
-    EXPECT_EQ(factory.lastError(), "com1: /dev/null: not a terminal");
+    EXPECT_EQ(nullptr, factory.openPort("com1"));
+    EXPECT_EQ("com1: /dev/null: not a terminal", factory.lastError());
     factory.mapPort("com1", "/");
-    EXPECT_EQ(factory.openPort("com1"), nullptr);
-    EXPECT_EQ(factory.lastError(), "com1: /: Is a directory");
+    EXPECT_EQ(nullptr, factory.openPort("com1"));
+    EXPECT_EQ("com1: /: Is a directory", factory.lastError());
 }
 
 TEST_F(LineTest, FifoIsRefusedWithoutWaitingForItsOtherEnd) {
     const std::string fifo = ::testing::TempDir() + "fifo" + std::to_string(::getpid());
-    ASSERT_EQ(::mkfifo(fifo.c_str(), 0600), 0);
+    ASSERT_EQ(0, ::mkfifo(fifo.c_str(), 0600));
     factory.mapPort("com1", fifo);
-    EXPECT_EQ(factory.openPort("com1"), nullptr);
+    EXPECT_EQ(nullptr, factory.openPort("com1"));
     std::remove(fifo.c_str());
-    EXPECT_EQ(factory.lastError(), "com1: " + fifo + ": not a terminal");
+    EXPECT_EQ("com1: " + fifo + ": not a terminal", factory.lastError());
 }
 
 TEST_F(LineTest, SuccessfulOpenClearsTheError) {
-    EXPECT_EQ(factory.openPort("com2"), nullptr);
+    EXPECT_EQ(nullptr, factory.openPort("com2"));
     EXPECT_NE(openPort(), nullptr);
-    EXPECT_EQ(factory.lastError(), "");
+    EXPECT_EQ("", factory.lastError());
 }
 
 TEST_F(LineTest, SettingsComeBackAtTheRelease) {
@@ -89,7 +89,7 @@ TEST_F(LineTest, SettingsComeBackAtTheRelease) {
     unusual.c_cflag |= CSTOPB;
     ::cfsetispeed(&unusual, B1200);
     ::cfsetospeed(&unusual, B1200);
-    ASSERT_EQ(::tcsetattr(terminal.watch(), TCSANOW, &unusual), 0);
+    ASSERT_EQ(0, ::tcsetattr(terminal.watch(), TCSANOW, &unusual));
     const termios before = terminal.settings();
 
     ISerialPort* port = openPort();
@@ -97,8 +97,8 @@ TEST_F(LineTest, SettingsComeBackAtTheRelease) {
     ASSERT_NE(port->configure(19200, 1, 7, 1, 0), 0) << factory.lastError();
     ASSERT_NE(port->configure(57600, 0, 8, 2, 0), 0) << factory.lastError();
     const termios during = terminal.settings();
-    EXPECT_EQ(::cfgetospeed(&during), speed_t{B57600});
-    EXPECT_EQ(during.c_lflag & (ICANON | ECHO), 0u);
+    EXPECT_EQ(speed_t{B57600}, ::cfgetospeed(&during));
+    EXPECT_EQ(0u, during.c_lflag & (ICANON | ECHO));
 
     factory.releasePort(port);
     expectSameSettings(terminal.settings(), before);
@@ -112,7 +112,7 @@ TEST_F(LineTest, DestroyedFactoryReleasesItsPorts) {
         ISerialPort* port = shortLived.openPort("com5");
         ASSERT_NE(port, nullptr);
         ASSERT_NE(port->configure(9600, 0, 8, 1, 0), 0);
-        EXPECT_EQ(shortLived.openPorts(), 1);
+        EXPECT_EQ(1, shortLived.openPorts());
     }
     expectSameSettings(terminal.settings(), before);
     EXPECT_NE(openPort(), nullptr);
@@ -145,10 +145,10 @@ TEST_F(LineTest, PortWithoutDirectionControlWorksInEveryMode) {
 TEST_F(LineTest, RateOfZeroFailsWithItsReason) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
-    EXPECT_EQ(port->configure(0, 0, 8, 1, 0), 0);
-    EXPECT_EQ(factory.lastError(), "com1: " + terminal.path() + ": baud rate 0 is not supported");
+    EXPECT_EQ(0, port->configure(0, 0, 8, 1, 0));
+    EXPECT_EQ("com1: " + terminal.path() + ": baud rate 0 is not supported", factory.lastError());
     const unsigned char byte = 1;
-    EXPECT_EQ(port->send(&byte, 1), 0);
+    EXPECT_EQ(0, port->send(&byte, 1));
 }
 
 TEST_F(LineTest, SecondOpenInThisProcessIsRefused) {
@@ -156,8 +156,8 @@ TEST_F(LineTest, SecondOpenInThisProcessIsRefused) {
     ASSERT_NE(port, nullptr);
     PosixSerialFactory other;
     other.mapPort("com7", terminal.path());
-    EXPECT_EQ(other.openPort("com7"), nullptr);
-    EXPECT_EQ(other.lastError(), "com7: " + terminal.path() + ": in use");
+    EXPECT_EQ(nullptr, other.openPort("com7"));
+    EXPECT_EQ("com7: " + terminal.path() + ": in use", other.lastError());
 
     factory.releasePort(port);
     EXPECT_NE(other.openPort("com7"), nullptr) << other.lastError();
@@ -168,18 +168,18 @@ TEST_F(LineTest, RefusedSecondOpenLeavesTheFirstExclusive) {
     ASSERT_NE(port, nullptr);
     PosixSerialFactory other;
     other.mapPort("com7", terminal.path());
-    EXPECT_EQ(other.openPort("com7"), nullptr);
+    EXPECT_EQ(nullptr, other.openPort("com7"));
     int exclusive = 0;
 #ifdef MRTU_EMULATED
     // The emulator passes TIOCEXCL on, but does not know the question whether it is set.
     if (::ioctl(terminal.watch(), TIOCGEXCL, &exclusive) != 0 && errno == ENOSYS)
         GTEST_SKIP() << "qemu-user has no TIOCGEXCL";
 #endif
-    ASSERT_EQ(::ioctl(terminal.watch(), TIOCGEXCL, &exclusive), 0);
+    ASSERT_EQ(0, ::ioctl(terminal.watch(), TIOCGEXCL, &exclusive));
     EXPECT_NE(exclusive, 0);
     factory.releasePort(port);
-    ASSERT_EQ(::ioctl(terminal.watch(), TIOCGEXCL, &exclusive), 0);
-    EXPECT_EQ(exclusive, 0);
+    ASSERT_EQ(0, ::ioctl(terminal.watch(), TIOCGEXCL, &exclusive));
+    EXPECT_EQ(0, exclusive);
 }
 
 /// Runs `check` in a child process. @return its exit status.
@@ -188,7 +188,7 @@ int inChild(Check check) {
     const pid_t child = ::fork();
     if (child == 0) ::_exit(check());
     int status = 0;
-    EXPECT_EQ(::waitpid(child, &status, 0), child);
+    EXPECT_EQ(child, ::waitpid(child, &status, 0));
     return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
 }
 
@@ -202,7 +202,7 @@ TEST_F(LineTest, SecondOpenByAnotherProcessIsRefused) {
         const bool said = other.lastError().ends_with(": in use");
         return refused && said ? 7 : 1;
     };
-    EXPECT_EQ(inChild(tryToOpen), 7);
+    EXPECT_EQ(7, inChild(tryToOpen));
 }
 
 TEST_F(LineTest, DescriptorIsNotInheritedByOtherPrograms) {
@@ -221,7 +221,7 @@ TEST_F(LineTest, PortDoesNotBecomeTheControllingTerminal) {
         const int controlling = ::open("/dev/tty", O_RDWR);
         return controlling < 0 && errno == ENXIO ? 7 : 3;
     };
-    EXPECT_EQ(inChild(openAsLeader), 7);
+    EXPECT_EQ(7, inChild(openAsLeader));
 }
 
 TEST_F(LineTest, ForeignPortsAreNotReleased) {
@@ -230,20 +230,20 @@ TEST_F(LineTest, ForeignPortsAreNotReleased) {
     PosixSerialFactory other;
     other.releasePort(port);
     other.releasePort(nullptr);
-    EXPECT_EQ(factory.openPorts(), 1);
+    EXPECT_EQ(1, factory.openPorts());
     factory.releasePort(port);
     factory.releasePort(port);
-    EXPECT_EQ(factory.openPorts(), 0);
+    EXPECT_EQ(0, factory.openPorts());
 }
 
 TEST_F(LineTest, PortOfAVanishedTerminalCanStillBeReleased) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.hangUp();
-    EXPECT_EQ(port->configure(9600, 0, 8, 1, 0), 0);
+    EXPECT_EQ(0, port->configure(9600, 0, 8, 1, 0));
     EXPECT_THAT(factory.lastError(), HasSubstr(terminal.path()));
     factory.releasePort(port);
-    EXPECT_EQ(factory.openPorts(), 0);
+    EXPECT_EQ(0, factory.openPorts());
 }
 
 }  // namespace

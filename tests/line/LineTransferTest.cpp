@@ -59,12 +59,12 @@ TEST_F(LineTest, EveryByteValuePassesBothWays) {
 
     termios raw = terminal.settings();
     ASSERT_NE(port->send(all.data(), static_cast<int>(all.size())), 0);
-    EXPECT_EQ(terminal.take(all.size()), all);
+    EXPECT_EQ(all, terminal.take(all.size()));
     terminal.put(all);
     const Frame frame = receiveFrame(*port, 256, kForEver, kForEver);
     EXPECT_NE(frame.good, 0);
-    EXPECT_EQ(frame.bytes, all);
-    EXPECT_EQ(raw.c_oflag & OPOST, 0u);
+    EXPECT_EQ(all, frame.bytes);
+    EXPECT_EQ(0u, raw.c_oflag & OPOST);
 }
 
 TEST_F(LineTest, FirstByteThenTheRest) {
@@ -73,7 +73,7 @@ TEST_F(LineTest, FirstByteThenTheRest) {
     terminal.put({1, 3, 2, 0xAB});
     unsigned char first = 0;
     ASSERT_NE(port->receiveByte(&first, kForEver, 0), 0);
-    EXPECT_EQ(first, 1);
+    EXPECT_EQ(1, first);
     const Frame rest = receiveFrame(*port, 512, kForEver, 20);
     EXPECT_NE(rest.good, 0);
     EXPECT_THAT(rest.bytes, ElementsAre(3, 2, 0xAB));
@@ -83,11 +83,11 @@ TEST_F(LineTest, TimeoutOfZeroOnlyLooks) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     unsigned char byte = 0x77;
-    EXPECT_EQ(port->receiveByte(&byte, 0, 0), 0);
-    EXPECT_EQ(byte, 0x77);
+    EXPECT_EQ(0, port->receiveByte(&byte, 0, 0));
+    EXPECT_EQ(0x77, byte);
     terminal.put({5});
     ASSERT_NE(port->receiveByte(&byte, kForEver, 0), 0);
-    EXPECT_EQ(byte, 5);
+    EXPECT_EQ(5, byte);
 }
 
 TEST_F(LineTest, SilenceEndsAFrame) {
@@ -134,7 +134,7 @@ TEST_F(LineTest, FrameOfNothingFails) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     const Frame frame = receiveFrame(*port, 512, kForEver, 1);
-    EXPECT_EQ(frame.good, 0);
+    EXPECT_EQ(0, frame.good);
     EXPECT_TRUE(frame.bytes.empty());
 }
 
@@ -146,7 +146,7 @@ TEST_F(LineTest, GapFloorBridgesPausesThatTheDriverWouldNot) {
     const Meanwhile answering([this](const std::atomic<bool>&) {
         std::this_thread::sleep_for(std::chrono::milliseconds{30});
         const Bytes rest{2, 3};
-        EXPECT_EQ(::write(terminal.far(), rest.data(), rest.size()), 2);
+        EXPECT_EQ(2, ::write(terminal.far(), rest.data(), rest.size()));
     });
     EXPECT_THAT(receiveFrame(*port, 3, kForEver, 1).bytes, ElementsAre(1, 2, 3));
 }
@@ -158,7 +158,7 @@ TEST_F(LineTest, PurgeThrowsAwayWhatWasReceived) {
     unsigned char byte = 0;
     ASSERT_NE(port->receiveByte(&byte, kForEver, 0), 0);
     port->purge();
-    EXPECT_EQ(port->receiveByte(&byte, 0, 0), 0);
+    EXPECT_EQ(0, port->receiveByte(&byte, 0, 0));
 }
 
 TEST_F(LineTest, ConfigureStartsWithAnEmptyLine) {
@@ -168,14 +168,14 @@ TEST_F(LineTest, ConfigureStartsWithAnEmptyLine) {
     unsigned char byte = 0;
     ASSERT_NE(port->receiveByte(&byte, kForEver, 0), 0);
     ASSERT_NE(port->configure(9600, 0, 8, 1, 0), 0);
-    EXPECT_EQ(port->receiveByte(&byte, 0, 0), 0);
+    EXPECT_EQ(0, port->receiveByte(&byte, 0, 0));
 }
 
 TEST_F(LineTest, NegativeLengthIsRefused) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     const unsigned char byte = 1;
-    EXPECT_EQ(port->send(&byte, -1), 0);
+    EXPECT_EQ(0, port->send(&byte, -1));
     EXPECT_NE(port->send(&byte, 0), 0);
 }
 
@@ -194,12 +194,12 @@ TEST_F(LineTest, HangUpFailsEveryTransferAtOnceAndForGood) {
     terminal.hangUp();
     for (int round = 0; round < 3; ++round) {
         unsigned char byte = 0x77;
-        EXPECT_EQ(port->receiveByte(&byte, kForEver, 0), 0);
-        EXPECT_EQ(byte, 0x77);
+        EXPECT_EQ(0, port->receiveByte(&byte, kForEver, 0));
+        EXPECT_EQ(0x77, byte);
         const Frame frame = receiveFrame(*port, 512, kForEver, kForEver);
-        EXPECT_EQ(frame.good, 0);
+        EXPECT_EQ(0, frame.good);
         EXPECT_TRUE(frame.bytes.empty());
-        EXPECT_EQ(port->send(&byte, 1), 0);
+        EXPECT_EQ(0, port->send(&byte, 1));
         port->purge();
     }
 }
@@ -209,7 +209,7 @@ TEST_F(LineTest, HangUpFailsAFrameFirst) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.hangUp();
-    EXPECT_EQ(receiveFrame(*port, 512, kForEver, kForEver).good, 0);
+    EXPECT_EQ(0, receiveFrame(*port, 512, kForEver, kForEver).good);
 }
 
 TEST_F(LineTest, HangUpFailsASendFirst) {
@@ -217,7 +217,7 @@ TEST_F(LineTest, HangUpFailsASendFirst) {
     ASSERT_NE(port, nullptr);
     terminal.hangUp();
     const Bytes data(100'000);  // Two hours of sending at this rate.
-    EXPECT_EQ(port->send(data.data(), static_cast<int>(data.size())), 0);
+    EXPECT_EQ(0, port->send(data.data(), static_cast<int>(data.size())));
 }
 
 TEST_F(LineTest, HangUpEndsAWaitForTheFirstByte) {
@@ -228,7 +228,7 @@ TEST_F(LineTest, HangUpEndsAWaitForTheFirstByte) {
         terminal.hangUp();
     });
     unsigned char byte = 0;
-    EXPECT_EQ(port->receiveByte(&byte, kForEver, 0), 0);
+    EXPECT_EQ(0, port->receiveByte(&byte, kForEver, 0));
 }
 
 TEST_F(LineTest, HangUpEndsAFrameAndKeepsWhatCame) {
@@ -241,7 +241,7 @@ TEST_F(LineTest, HangUpEndsAFrameAndKeepsWhatCame) {
         std::this_thread::sleep_for(std::chrono::milliseconds{20});
         terminal.hangUp();
     });
-    EXPECT_EQ(receiveFrame(*port, 512, kForEver, kForEver).good, 0);
+    EXPECT_EQ(0, receiveFrame(*port, 512, kForEver, kForEver).good);
 }
 
 TEST_F(LineTest, SendToAReaderThatNeverReadsEndsAtItsDeadline) {
@@ -254,7 +254,7 @@ TEST_F(LineTest, SendToAReaderThatNeverReadsEndsAtItsDeadline) {
         ++rounds;
     EXPECT_LT(rounds, 100);
     unsigned char byte = 0;
-    EXPECT_EQ(port->receiveByte(&byte, 0, 0), 0);
+    EXPECT_EQ(0, port->receiveByte(&byte, 0, 0));
     terminal.put({9});
     EXPECT_NE(port->receiveByte(&byte, kForEver, 0), 0) << "the line itself is still there";
 }
@@ -267,7 +267,7 @@ TEST_F(LineTest, SignalsDoNotCutWaitsShort) {
     struct sigaction action {};
     action.sa_handler = [](int) { ++signalsSeen; };
     struct sigaction before {};
-    ASSERT_EQ(::sigaction(SIGUSR1, &action, &before), 0);
+    ASSERT_EQ(0, ::sigaction(SIGUSR1, &action, &before));
     const pthread_t waiting = ::pthread_self();
     unsigned char byte = 0;
     {
@@ -277,12 +277,12 @@ TEST_F(LineTest, SignalsDoNotCutWaitsShort) {
                 std::this_thread::sleep_for(std::chrono::milliseconds{1});
             }
             const std::uint8_t answer = 0x42;
-            EXPECT_EQ(::write(terminal.far(), &answer, 1), 1);
+            EXPECT_EQ(1, ::write(terminal.far(), &answer, 1));
         });
         EXPECT_NE(port->receiveByte(&byte, kForEver, 0), 0);
     }
     ::sigaction(SIGUSR1, &before, nullptr);
-    EXPECT_EQ(byte, 0x42);
+    EXPECT_EQ(0x42, byte);
     EXPECT_GE(signalsSeen, 10);
 }
 

@@ -34,8 +34,8 @@ class PseudoTerminal {
     void hangUp() { far_ = runtime::FileDescriptor(); }
 
     void put(const std::vector<std::uint8_t>& bytes) const {
-        ASSERT_EQ(::write(far_.get(), bytes.data(), bytes.size()),
-                  static_cast<ssize_t>(bytes.size()));
+        ASSERT_EQ(static_cast<ssize_t>(bytes.size()),
+                  ::write(far_.get(), bytes.data(), bytes.size()));
     }
     std::vector<std::uint8_t> take(std::size_t count) const {
         std::vector<std::uint8_t> bytes(count);
@@ -50,7 +50,7 @@ class PseudoTerminal {
     }
     termios settings() const {
         termios now{};
-        EXPECT_EQ(::tcgetattr(watch_.get(), &now), 0);
+        EXPECT_EQ(0, ::tcgetattr(watch_.get(), &now));
         return now;
     }
 

@@ -59,7 +59,7 @@ struct StorageFileTest : ::testing::Test {
     }
     static unsigned modeOf(const std::string& file) {
         struct stat info {};
-        EXPECT_EQ(::stat(file.c_str(), &info), 0) << file;
+        EXPECT_EQ(0, ::stat(file.c_str(), &info)) << file;
         return info.st_mode & 07777u;
     }
 
@@ -70,6 +70,6 @@ struct StorageFileTest : ::testing::Test {
 /// Waits for a child. @return its exit status, or minus the signal that ended it.
 inline int endOf(pid_t child) {
     int status = 0;
-    EXPECT_EQ(::waitpid(child, &status, 0), child);
+    EXPECT_EQ(child, ::waitpid(child, &status, 0));
     return WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status);
 }

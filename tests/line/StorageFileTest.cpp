@@ -40,9 +40,9 @@ TEST_F(StorageFileTest, ValuesOutlastTheStorage) {
         storage->writeInt("line1", "baud", 19200);
     }
     const auto storage = open();
-    EXPECT_STREQ(storage->readString("line1", "tempNode5"), "9");
+    EXPECT_STREQ("9", storage->readString("line1", "tempNode5"));
     EXPECT_TRUE(storage->readBool("line1", "node5_ModiconMode"));
-    EXPECT_EQ(storage->readInt("line1", "baud"), 19200);
+    EXPECT_EQ(19200, storage->readInt("line1", "baud"));
 }
 
 TEST_F(StorageFileTest, ShellShowsSectionKeyTypeAndValue) {
@@ -50,15 +50,15 @@ TEST_F(StorageFileTest, ShellShowsSectionKeyTypeAndValue) {
     storage->writeString("line1", "tempNode5", "9");
     storage->writeBool("line1", "flag", true);
     storage->writeInt("line1", "baud", 19200);
-    EXPECT_EQ(ask("SELECT section||' '||key||' '||type||' '||value FROM settings ORDER BY key"),
-              "line1 baud int 19200\nline1 flag bool 1\nline1 tempNode5 text 9\n");
-    EXPECT_EQ(ask("SELECT typeof(value) FROM settings ORDER BY key"), "integer\ninteger\ntext\n");
+    EXPECT_EQ("line1 baud int 19200\nline1 flag bool 1\nline1 tempNode5 text 9\n",
+              ask("SELECT section||' '||key||' '||type||' '||value FROM settings ORDER BY key"));
+    EXPECT_EQ("integer\ninteger\ntext\n", ask("SELECT typeof(value) FROM settings ORDER BY key"));
 }
 
 TEST_F(StorageFileTest, WritesGoThroughALogThatIsSynced) {
     const auto storage = open();
     storage->writeInt("s", "k", 1);
-    EXPECT_EQ(ask("PRAGMA journal_mode"), "wal\n");
+    EXPECT_EQ("wal\n", ask("PRAGMA journal_mode"));
     EXPECT_FALSE(storage->readOnly());
 }
 
@@ -69,11 +69,11 @@ TEST_F(StorageFileTest, FilesAndDirectoriesAreForTheirOwnerAlone) {
         const auto storage = open();
         storage->writeInt("s", "k", 1);
         for (const char* ending : {"", "-wal", "-shm"}) {
-            EXPECT_EQ(modeOf(path + ending), 0600u) << ending;
+            EXPECT_EQ(0600u, modeOf(path + ending)) << ending;
         }
     }
-    EXPECT_EQ(modeOf(folder + "/state"), 0700u);
-    EXPECT_EQ(modeOf(folder + "/state/mrtu"), 0700u);
+    EXPECT_EQ(0700u, modeOf(folder + "/state"));
+    EXPECT_EQ(0700u, modeOf(folder + "/state/mrtu"));
     ::umask(before);
 }
 
@@ -82,7 +82,7 @@ TEST_F(StorageFileTest, NamesWithAMeaningInUrisAreJustNames) {
         path = folder + "/" + name;
         open()->writeInt("s", "k", 7);
         EXPECT_TRUE(std::filesystem::file_size(path) > 0) << name;
-        EXPECT_EQ(open()->readInt("s", "k"), 7) << name;
+        EXPECT_EQ(7, open()->readInt("s", "k")) << name;
     }
 }
 
@@ -91,7 +91,7 @@ TEST_F(StorageFileTest, BareNameMeansTheWorkingDirectory) {
     std::filesystem::current_path(folder);
     path = ":memory:";
     open()->writeInt("s", "k", 7);
-    EXPECT_EQ(open()->readInt("s", "k"), 7);
+    EXPECT_EQ(7, open()->readInt("s", "k"));
     std::filesystem::current_path(before);
     EXPECT_TRUE(std::filesystem::exists(folder + "/:memory:"));
 }
@@ -99,22 +99,22 @@ TEST_F(StorageFileTest, BareNameMeansTheWorkingDirectory) {
 TEST_F(StorageFileTest, LeadingSlashesAreNoHostName) {
     path = "//" + path;
     open()->writeInt("s", "k", 7);
-    EXPECT_EQ(open()->readInt("s", "k"), 7);
+    EXPECT_EQ(7, open()->readInt("s", "k"));
 }
 
 TEST_F(StorageFileTest, IsMadeByTheFirstWrite) {
     path = folder + "/state/overrides.db";
     const auto storage = open();
-    EXPECT_EQ(storage->keyCount("s"), 0);
-    EXPECT_EQ(storage->hasKey("s", "k"), 0);
+    EXPECT_EQ(0, storage->keyCount("s"));
+    EXPECT_EQ(0, storage->hasKey("s", "k"));
     EXPECT_TRUE(storage->sections().empty());
     EXPECT_TRUE(storage->entries("s").empty());
     storage->removeKey("s", "k");
     EXPECT_FALSE(std::filesystem::exists(folder + "/state"));
     EXPECT_FALSE(storage->failed()) << storage->lastError();
     storage->writeInt("s", "k", 7);
-    EXPECT_EQ(storage->readInt("s", "k"), 7);
-    EXPECT_EQ(open()->readInt("s", "k"), 7);
+    EXPECT_EQ(7, storage->readInt("s", "k"));
+    EXPECT_EQ(7, open()->readInt("s", "k"));
 }
 
 TEST_F(StorageFileTest, ThatCannotBeMadeFailsAtTheFirstWrite) {
@@ -122,38 +122,38 @@ TEST_F(StorageFileTest, ThatCannotBeMadeFailsAtTheFirstWrite) {
     std::filesystem::create_directory(path);
     EXPECT_FALSE(storage->failed());
     storage->writeInt("s", "k", 7);
-    EXPECT_EQ(storage->lastError(), path + ": not a regular file");
+    EXPECT_EQ(path + ": not a regular file", storage->lastError());
 }
 
 TEST_F(StorageFileTest, EmptyFileBecomesAStorage) {
     std::ofstream(path).close();
-    EXPECT_EQ(open()->keyCount("s"), 0);
-    EXPECT_EQ(std::filesystem::file_size(path), 0u);
+    EXPECT_EQ(0, open()->keyCount("s"));
+    EXPECT_EQ(0u, std::filesystem::file_size(path));
     open()->writeInt("s", "k", 7);
-    EXPECT_EQ(open()->readInt("s", "k"), 7);
+    EXPECT_EQ(7, open()->readInt("s", "k"));
 }
 
 TEST_F(StorageFileTest, DirectoryThatCannotBeMadeIsNamed) {
     std::ofstream(folder + "/file") << "in the way";
     const auto opened = SqliteStorage::open(folder + "/file/sub/overrides.db");
     ASSERT_FALSE(opened);
-    EXPECT_EQ(opened.error().fault, StorageFault::NoDirectory);
-    EXPECT_EQ(opened.error().text,
-              folder + "/file/sub/overrides.db: cannot make " + folder + "/file: Not a directory");
-    EXPECT_EQ(contentOf(folder + "/file"), "in the way");
+    EXPECT_EQ(StorageFault::NoDirectory, opened.error().fault);
+    EXPECT_EQ(folder + "/file/sub/overrides.db: cannot make " + folder + "/file: Not a directory",
+              opened.error().text);
+    EXPECT_EQ("in the way", contentOf(folder + "/file"));
 }
 
 TEST_F(StorageFileTest, DirectoryInPlaceOfTheFileIsRefused) {
     const auto opened = SqliteStorage::open(folder);
     ASSERT_FALSE(opened);
-    EXPECT_EQ(opened.error().fault, StorageFault::CannotOpen);
-    EXPECT_EQ(opened.error().text, folder + ": not a regular file");
+    EXPECT_EQ(StorageFault::CannotOpen, opened.error().fault);
+    EXPECT_EQ(folder + ": not a regular file", opened.error().text);
 }
 
 TEST_F(StorageFileTest, EmptyNameIsRefused) {
     const auto opened = SqliteStorage::open("");
     ASSERT_FALSE(opened);
-    EXPECT_EQ(opened.error().fault, StorageFault::CannotOpen);
+    EXPECT_EQ(StorageFault::CannotOpen, opened.error().fault);
 }
 
 /// Files that must be refused and left as they are.
@@ -164,12 +164,12 @@ struct Unfit : StorageFileTest {
         const auto filesBefore = files();
         const auto opened = SqliteStorage::open(path);
         ASSERT_FALSE(opened);
-        EXPECT_EQ(opened.error().fault, fault) << opened.error().text;
+        EXPECT_EQ(fault, opened.error().fault) << opened.error().text;
         EXPECT_THAT(opened.error().text, StartsWith(path + ": "));
         EXPECT_THAT(opened.error().text, HasSubstr(text));
         EXPECT_TRUE(contentOf(path) == before) << "the file was changed";
         EXPECT_TRUE(contentOf(path + "-wal") == logBefore) << "the log was changed";
-        EXPECT_EQ(files(), filesBefore);
+        EXPECT_EQ(filesBefore, files());
     }
     std::set<std::string> files() const {
         std::set<std::string> names;
@@ -218,8 +218,8 @@ TEST_F(Unfit, EveryTruncationOfAStorage) {
         std::ofstream(path, std::ios::binary) << whole.substr(0, size);
         const auto opened = SqliteStorage::open(path);
         ASSERT_FALSE(opened) << size;
-        EXPECT_EQ(opened.error().fault, StorageFault::Damaged) << size;
-        EXPECT_EQ(std::filesystem::file_size(path), size);
+        EXPECT_EQ(StorageFault::Damaged, opened.error().fault) << size;
+        EXPECT_EQ(size, std::filesystem::file_size(path));
     }
 }
 
@@ -256,7 +256,7 @@ TEST_F(Unfit, StorageWithAnOverwrittenSchema) {
 TEST_F(Unfit, DatabaseOfAnotherProgram) {
     ask("CREATE TABLE bookmarks(url); INSERT INTO bookmarks VALUES('x')");
     expectRefused(StorageFault::Foreign, "a database of another program");
-    EXPECT_EQ(ask("PRAGMA journal_mode"), "delete\n");
+    EXPECT_EQ("delete\n", ask("PRAGMA journal_mode"));
 }
 
 TEST_F(Unfit, DatabaseOfAnotherProgramWithChangesInItsLog) {
@@ -268,7 +268,7 @@ TEST_F(Unfit, DatabaseOfAnotherProgramWithChangesInItsLog) {
                      nullptr, nullptr);
         ::_exit(0);  // Without closing: the log stays.
     }
-    ASSERT_EQ(endOf(writer), 0);
+    ASSERT_EQ(0, endOf(writer));
     ASSERT_GT(std::filesystem::file_size(path + "-wal"), 0u);
     expectRefused(StorageFault::Foreign, "a database of another program");
 }
@@ -287,26 +287,26 @@ TEST_F(Unfit, StorageWithoutItsTable) {
 
 TEST_F(StorageFileTest, WriteProtectedFileIsReadAndNeverWritten) {
     open()->writeInt("line1", "baud", 19200);
-    ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
+    ASSERT_EQ(0, ::chmod(path.c_str(), 0444));
     {
         const auto storage = open();
         ASSERT_NE(storage, nullptr);
         EXPECT_TRUE(storage->readOnly());
-        EXPECT_EQ(storage->readInt("line1", "baud"), 19200);
+        EXPECT_EQ(19200, storage->readInt("line1", "baud"));
         EXPECT_FALSE(storage->failed());
 
         storage->writeInt("line1", "baud", 300);
         EXPECT_TRUE(storage->failed());
         EXPECT_THAT(storage->lastError(), HasSubstr("readonly database"));
-        EXPECT_EQ(storage->readInt("line1", "baud"), 19200);
+        EXPECT_EQ(19200, storage->readInt("line1", "baud"));
         storage->clearFailure();
         storage->removeKey("line1", "baud");
         EXPECT_TRUE(storage->failed());
     }
     EXPECT_FALSE(std::filesystem::exists(path + "-wal"));
     EXPECT_FALSE(std::filesystem::exists(path + "-shm"));
-    ASSERT_EQ(::chmod(path.c_str(), 0600), 0);
-    EXPECT_EQ(open()->readInt("line1", "baud"), 19200);
+    ASSERT_EQ(0, ::chmod(path.c_str(), 0600));
+    EXPECT_EQ(19200, open()->readInt("line1", "baud"));
 }
 
 TEST_F(StorageFileTest, WriteProtectedFileShowsAlsoWhatOnlyItsLogHolds) {
@@ -317,20 +317,20 @@ TEST_F(StorageFileTest, WriteProtectedFileShowsAlsoWhatOnlyItsLogHolds) {
         storage.value()->writeInt("line1", "baud", 4800);
         ::_exit(0);  // Without closing: the value is in the log alone.
     }
-    ASSERT_EQ(endOf(writer), 0);
+    ASSERT_EQ(0, endOf(writer));
     ASSERT_GT(std::filesystem::file_size(path + "-wal"), 0u);
-    ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
+    ASSERT_EQ(0, ::chmod(path.c_str(), 0444));
     const auto storage = open();
     ASSERT_NE(storage, nullptr);
     EXPECT_TRUE(storage->readOnly());
-    EXPECT_EQ(storage->readInt("line1", "baud"), 4800);
+    EXPECT_EQ(4800, storage->readInt("line1", "baud"));
 }
 
 TEST_F(StorageFileTest, WriteProtectedEmptyFileHoldsNothing) {
     std::ofstream(path).close();
-    ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
+    ASSERT_EQ(0, ::chmod(path.c_str(), 0444));
     const auto storage = open();
-    EXPECT_EQ(storage->keyCount("s"), 0);
+    EXPECT_EQ(0, storage->keyCount("s"));
     EXPECT_FALSE(storage->failed());
     storage->writeInt("s", "k", 1);
     EXPECT_THAT(storage->lastError(), HasSubstr("empty and write-protected"));
@@ -340,8 +340,8 @@ TEST_F(StorageFileTest, WriteProtectedEmptyFileHoldsNothing) {
 TEST_F(StorageFileTest, UserWithoutRightsReadsAndSaysSo) {
     if (::geteuid() != 0) GTEST_SKIP() << "needs to be able to become another user";
     open()->writeInt("line1", "baud", 19200);
-    ASSERT_EQ(::chmod(folder.c_str(), 0755), 0);
-    ASSERT_EQ(::chmod(path.c_str(), 0644), 0);
+    ASSERT_EQ(0, ::chmod(folder.c_str(), 0755));
+    ASSERT_EQ(0, ::chmod(path.c_str(), 0644));
     const auto asOther = [this] {
         constexpr uid_t kNobody = 65534;
         if (::setgid(kNobody) != 0 || ::setuid(kNobody) != 0) return 1;
@@ -356,8 +356,8 @@ TEST_F(StorageFileTest, UserWithoutRightsReadsAndSaysSo) {
     };
     const pid_t child = ::fork();
     if (child == 0) ::_exit(asOther());
-    EXPECT_EQ(endOf(child), 0);
-    ASSERT_EQ(::chmod(path.c_str(), 0600), 0);
+    EXPECT_EQ(0, endOf(child));
+    ASSERT_EQ(0, ::chmod(path.c_str(), 0600));
     const pid_t locked = ::fork();
     if (locked == 0) {
         const bool other = ::setgid(65534) == 0 && ::setuid(65534) == 0;
@@ -365,8 +365,8 @@ TEST_F(StorageFileTest, UserWithoutRightsReadsAndSaysSo) {
         const bool said = !opened && opened.error().text == path + ": Permission denied";
         ::_exit(other && said ? 0 : 1);
     }
-    EXPECT_EQ(endOf(locked), 0);
-    EXPECT_EQ(open()->readInt("line1", "baud"), 19200);
+    EXPECT_EQ(0, endOf(locked));
+    EXPECT_EQ(19200, open()->readInt("line1", "baud"));
 }
 
 /// The child's files may not grow beyond a limit, which is what a full disk looks like to it.
@@ -394,24 +394,24 @@ int writeUntilFull(const std::string& path) {
 
 TEST_F(StorageFileTest, FullDiskFailsVisiblyAndLosesNothing) {
     int answers[2];
-    ASSERT_EQ(::pipe(answers), 0);
+    ASSERT_EQ(0, ::pipe(answers));
     const pid_t child = ::fork();
     if (child == 0) {
         const int written = writeUntilFull(path);
         ::_exit(::write(answers[1], &written, sizeof written) == sizeof written ? 0 : 1);
     }
     int written = -100;
-    ASSERT_EQ(::read(answers[0], &written, sizeof written), ssize_t{sizeof written});
-    EXPECT_EQ(endOf(child), 0);
+    ASSERT_EQ(ssize_t{sizeof written}, ::read(answers[0], &written, sizeof written));
+    EXPECT_EQ(0, endOf(child));
     ::close(answers[0]);
     ::close(answers[1]);
     ASSERT_GT(written, 10);
 
-    EXPECT_EQ(ask("PRAGMA integrity_check"), "ok\n");
+    EXPECT_EQ("ok\n", ask("PRAGMA integrity_check"));
     const auto storage = open();
     ASSERT_NE(storage, nullptr);
-    EXPECT_EQ(storage->keyCount("line1"), written);
-    EXPECT_EQ(storage->readString("line1", "key3"), std::string(500, 't'));
+    EXPECT_EQ(written, storage->keyCount("line1"));
+    EXPECT_EQ(std::string(500, 't'), storage->readString("line1", "key3"));
     storage->writeInt("line1", "after", 1);
     EXPECT_FALSE(storage->failed()) << storage->lastError();
 }
@@ -435,8 +435,8 @@ TEST_F(StorageFileTest, FullDiskCanStillBeRead) {
     open()->writeInt("line1", "baud", 19200);
     const pid_t child = ::fork();
     if (child == 0) ::_exit(readWhenFull(path));
-    EXPECT_EQ(endOf(child), 0);
-    EXPECT_EQ(open()->readInt("line1", "baud"), 19200);
+    EXPECT_EQ(0, endOf(child));
+    EXPECT_EQ(19200, open()->readInt("line1", "baud"));
 }
 
 }  // namespace

@@ -55,7 +55,7 @@ struct StorageKillTest : StorageFileTest {
     /// @return the last number that it acknowledged.
     int killAfter(std::chrono::microseconds moment, int last) const {
         int ends[2];
-        EXPECT_EQ(::pipe(ends), 0);
+        EXPECT_EQ(0, ::pipe(ends));
         FileDescriptor reading(ends[0]);
         FileDescriptor writing(ends[1]);
         const pid_t child = ::fork();
@@ -64,7 +64,7 @@ struct StorageKillTest : StorageFileTest {
         std::this_thread::sleep_for(moment);
         ::kill(child, SIGKILL);
         const int acknowledged = lastAcknowledged(reading.get(), last);
-        EXPECT_EQ(endOf(child), -SIGKILL) << "the child ended by itself";
+        EXPECT_EQ(-SIGKILL, endOf(child)) << "the child ended by itself";
         return acknowledged;
     }
 
@@ -102,7 +102,7 @@ TEST_F(StorageKillTest, AcknowledgedValuesSurviveTwoHundredKills) {
         last = killAfter(std::chrono::microseconds(moments(random)), last);
         if (last > before) ++roundsWithWrites;
         if (std::filesystem::exists(path)) {
-            ASSERT_EQ(ask("PRAGMA integrity_check"), "ok\n") << "round " << round;
+            ASSERT_EQ("ok\n", ask("PRAGMA integrity_check")) << "round " << round;
         }
         expectAllAcknowledged(last);
         if (HasFailure()) FAIL() << "in round " << round;

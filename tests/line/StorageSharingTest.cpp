@@ -30,26 +30,26 @@ TEST_F(StorageFileTest, TwoProcessesCreateAndFillOneFile) {
         if (children[process] == 0) ::_exit(writeOwnAndSharedKeys(path, process));
     }
     for (const pid_t child : children)
-        EXPECT_EQ(endOf(child), 0);
+        EXPECT_EQ(0, endOf(child));
     const auto storage = open();
     ASSERT_NE(storage, nullptr);
-    EXPECT_EQ(storage->keyCount("line1"), 2 * kWrites + 1);
+    EXPECT_EQ(2 * kWrites + 1, storage->keyCount("line1"));
     for (int process = 0; process < 2; ++process) {
         for (int write = 0; write < kWrites; ++write) {
             const std::string own = "own" + std::to_string(process) + "_" + std::to_string(write);
-            EXPECT_EQ(storage->readInt("line1", own.c_str()), write) << own;
+            EXPECT_EQ(write, storage->readInt("line1", own.c_str())) << own;
         }
     }
-    EXPECT_EQ(ask("PRAGMA integrity_check"), "ok\n");
+    EXPECT_EQ("ok\n", ask("PRAGMA integrity_check"));
 }
 
 TEST_F(StorageFileTest, OtherStoragesWritesAreSeen) {
     const auto one = open();
     const auto other = open();
     one->writeInt("line1", "baud", 9600);
-    EXPECT_EQ(other->readInt("line1", "baud"), 9600);
+    EXPECT_EQ(9600, other->readInt("line1", "baud"));
     other->removeKey("line1", "baud");
-    EXPECT_EQ(one->hasKey("line1", "baud"), 0);
+    EXPECT_EQ(0, one->hasKey("line1", "baud"));
 }
 
 TEST_F(StorageFileTest, WriteThatWaitedTooLongFailsVisibly) {
@@ -59,18 +59,18 @@ TEST_F(StorageFileTest, WriteThatWaitedTooLongFailsVisibly) {
     ASSERT_TRUE(impatient);
 
     sqlite3* holder = nullptr;
-    ASSERT_EQ(sqlite3_open(path.c_str(), &holder), SQLITE_OK);
-    ASSERT_EQ(sqlite3_exec(holder, "BEGIN IMMEDIATE", nullptr, nullptr, nullptr), SQLITE_OK);
+    ASSERT_EQ(SQLITE_OK, sqlite3_open(path.c_str(), &holder));
+    ASSERT_EQ(SQLITE_OK, sqlite3_exec(holder, "BEGIN IMMEDIATE", nullptr, nullptr, nullptr));
     impatient.value()->writeInt("line1", "baud", 300);
     EXPECT_TRUE(impatient.value()->failed());
     EXPECT_THAT(impatient.value()->lastError(), HasSubstr("database is locked"));
-    EXPECT_EQ(impatient.value()->readInt("line1", "baud"), 9600) << "reading needs no lock";
+    EXPECT_EQ(9600, impatient.value()->readInt("line1", "baud")) << "reading needs no lock";
     sqlite3_close(holder);
 
     impatient.value()->clearFailure();
     impatient.value()->writeInt("line1", "baud", 300);
     EXPECT_FALSE(impatient.value()->failed()) << impatient.value()->lastError();
-    EXPECT_EQ(patient->readInt("line1", "baud"), 300);
+    EXPECT_EQ(300, patient->readInt("line1", "baud"));
 }
 
 }  // namespace

@@ -36,19 +36,19 @@ struct StoredValueTest : StorageFileTest {
 TEST_F(StoredValueTest, ThatWasNotAlteredIsUsed) {
     const auto storage = open();
     EXPECT_THAT(namesIn(*storage), ElementsAre("flag", "tempNode5", "tempNode6"));
-    EXPECT_EQ(unusedIn(*storage), "");
+    EXPECT_EQ("", unusedIn(*storage));
 }
 
 TEST_F(StoredValueTest, ThatWasAlteredIsKeptFromItsReaders) {
     ask("UPDATE settings SET value='0' WHERE key='tempNode5'");
     const auto storage = open();
-    EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "");
+    EXPECT_STREQ("", storage->readString("MRTU", "tempNode5"));
     char buffer[8] = "before";
-    EXPECT_EQ(storage->readStringInto("MRTU", "tempNode5", buffer, 8), 0);
-    EXPECT_EQ(storage->hasKey("MRTU", "tempNode5"), 0);
+    EXPECT_EQ(0, storage->readStringInto("MRTU", "tempNode5", buffer, 8));
+    EXPECT_EQ(0, storage->hasKey("MRTU", "tempNode5"));
     EXPECT_THAT(namesIn(*storage), ElementsAre("flag", "tempNode6"));
-    EXPECT_EQ(storage->entries("MRTU").size(), 2U);
-    EXPECT_EQ(unusedIn(*storage), "tempNode5: altered since it was written\n");
+    EXPECT_EQ(2U, storage->entries("MRTU").size());
+    EXPECT_EQ("tempNode5: altered since it was written\n", unusedIn(*storage));
     EXPECT_FALSE(storage->failed()) << storage->lastError();
 }
 
@@ -66,7 +66,7 @@ TEST_F(StoredValueTest, AnyPartOfTheRowThatWasAlteredIsNoticed) {
     for (const auto& row : rows) {
         ask(row.change);
         const auto storage = open();
-        EXPECT_EQ(storage->hasKey(row.section, row.key), 0) << row.change;
+        EXPECT_EQ(0, storage->hasKey(row.section, row.key)) << row.change;
         EXPECT_THAT(unusedIn(*storage, row.section),
                     HasSubstr(std::string(row.key) + ": altered since it was written\n"))
             << row.change;
@@ -78,9 +78,9 @@ TEST_F(StoredValueTest, ThatWasAlteredIsReplacedByAWriteAndCanBeRemoved) {
     const auto storage = open();
     storage->writeString("MRTU", "tempNode5", "9");
     storage->removeKey("MRTU", "tempNode6");
-    EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "9");
-    EXPECT_EQ(unusedIn(*storage), "");
-    EXPECT_EQ(ask("SELECT key FROM settings"), "flag\ntempNode5\n");
+    EXPECT_STREQ("9", storage->readString("MRTU", "tempNode5"));
+    EXPECT_EQ("", unusedIn(*storage));
+    EXPECT_EQ("flag\ntempNode5\n", ask("SELECT key FROM settings"));
 }
 
 TEST_F(StoredValueTest, ThatTheJudgeRefusesIsKeptFromItsReaders) {
@@ -90,9 +90,9 @@ TEST_F(StoredValueTest, ThatTheJudgeRefusesIsKeptFromItsReaders) {
     const auto opened = SqliteStorage::open(path, 100, judge);
     ASSERT_TRUE(opened);
     SqliteStorage& storage = *opened.value();
-    EXPECT_EQ(storage.hasKey("MRTU", "tempNode5"), 0);
+    EXPECT_EQ(0, storage.hasKey("MRTU", "tempNode5"));
     EXPECT_THAT(namesIn(storage), ElementsAre("flag", "tempNode6"));
-    EXPECT_EQ(unusedIn(storage), "tempNode5: not 7\n");
+    EXPECT_EQ("tempNode5: not 7\n", unusedIn(storage));
 }
 
 TEST_F(StoredValueTest, NamesFollowTheWritesOfThisAndOtherStorages) {
@@ -105,16 +105,16 @@ TEST_F(StoredValueTest, NamesFollowTheWritesOfThisAndOtherStorages) {
     other->writeInt("line2", "baud", 9600);
     EXPECT_THAT(namesIn(*storage), ElementsAre("tempNode1", "tempNode5", "tempNode6"));
     EXPECT_THAT(namesIn(*storage, "line2"), ElementsAre("baud"));
-    EXPECT_STREQ(storage->keyName("MRTU", 3), "");
+    EXPECT_STREQ("", storage->keyName("MRTU", 3));
 }
 
 TEST_F(StoredValueTest, NamesOfTwoSectionsMayBeListedTurnByTurn) {
     const auto storage = open();
     storage->writeInt("line2", "a", 1);
     storage->writeInt("line2", "b", 2);
-    EXPECT_STREQ(storage->keyName("MRTU", 1), "tempNode5");
-    EXPECT_STREQ(storage->keyName("line2", 1), "b");
-    EXPECT_STREQ(storage->keyName("MRTU", 2), "tempNode6");
+    EXPECT_STREQ("tempNode5", storage->keyName("MRTU", 1));
+    EXPECT_STREQ("b", storage->keyName("line2", 1));
+    EXPECT_STREQ("tempNode6", storage->keyName("MRTU", 2));
 }
 
 /// A storage as versions before the check sums wrote it.
@@ -134,26 +134,26 @@ TEST_F(EarlierStorageTest, IsBroughtUpToDateWithItsValues) {
     {
         const auto storage = open();
         ASSERT_NE(storage, nullptr);
-        EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "7");
-        EXPECT_EQ(storage->readInt("MRTU", "baud"), 300);
+        EXPECT_STREQ("7", storage->readString("MRTU", "tempNode5"));
+        EXPECT_EQ(300, storage->readInt("MRTU", "baud"));
     }
-    EXPECT_EQ(ask("PRAGMA user_version"), "2\n");
+    EXPECT_EQ("2\n", ask("PRAGMA user_version"));
     ask("UPDATE settings SET value='8' WHERE key='tempNode5'");
-    EXPECT_EQ(unusedIn(*open()), "tempNode5: altered since it was written\n");
-    EXPECT_EQ(ask("PRAGMA integrity_check"), "ok\n");
+    EXPECT_EQ("tempNode5: altered since it was written\n", unusedIn(*open()));
+    EXPECT_EQ("ok\n", ask("PRAGMA integrity_check"));
 }
 
 TEST_F(EarlierStorageTest, ThatMayOnlyBeReadIsReadAsItIs) {
-    ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
+    ASSERT_EQ(0, ::chmod(path.c_str(), 0444));
     const std::string before = contentOf(path);
     {
         const auto storage = open();
         ASSERT_NE(storage, nullptr);
-        EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "7");
-        EXPECT_EQ(unusedIn(*storage), "");
+        EXPECT_STREQ("7", storage->readString("MRTU", "tempNode5"));
+        EXPECT_EQ("", unusedIn(*storage));
         storage->writeString("MRTU", "tempNode5", "8");
         EXPECT_TRUE(storage->failed());
-        EXPECT_STREQ(storage->readString("MRTU", "tempNode5"), "7");
+        EXPECT_STREQ("7", storage->readString("MRTU", "tempNode5"));
     }
     EXPECT_TRUE(contentOf(path) == before);
 }
@@ -168,8 +168,8 @@ TEST_F(EarlierStorageTest, IsBroughtUpToDateByOneOfTwoProcesses) {
         }
     }
     for (const pid_t child : children)
-        EXPECT_EQ(endOf(child), 0);
-    EXPECT_EQ(unusedIn(*open()), "");
+        EXPECT_EQ(0, endOf(child));
+    EXPECT_EQ("", unusedIn(*open()));
 }
 
 }  // namespace
