@@ -22,7 +22,7 @@ constexpr const char* kHoldingRegister = "4";
 class SimMbpollTest : public testing::Test {
   protected:
     void SetUp() override {
-        ASSERT_EQ(peers::runProgram({"mbpoll", "-V"}).exitCode, 0)
+        ASSERT_EQ(0, peers::runProgram({"mbpoll", "-V"}).exitCode)
             << "the program mbpoll is missing: apt-get install mbpoll";
         simulator.start();
     }
@@ -59,70 +59,70 @@ class SimMbpollTest : public testing::Test {
 
 TEST_F(SimMbpollTest, Function1ReadsCoils) {
     const auto result = mbpoll(kCoil, {"-r", "5", "-c", "4"});
-    EXPECT_EQ(result.exitCode, 0) << result.output;
-    EXPECT_EQ(valuesIn(result.output), (std::map<int, int>{{5, 0}, {6, 1}, {7, 0}, {8, 0}}))
+    EXPECT_EQ(0, result.exitCode) << result.output;
+    EXPECT_EQ((std::map<int, int>{{5, 0}, {6, 1}, {7, 0}, {8, 0}}), valuesIn(result.output))
         << result.output;
-    EXPECT_EQ(functionOfFirstRequest(), 1);
+    EXPECT_EQ(1, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, Function2ReadsDiscreteInputs) {
     const auto result = mbpoll(kDiscreteInput, {"-r", "5", "-c", "4"});
-    EXPECT_EQ(result.exitCode, 0) << result.output;
-    EXPECT_EQ(valuesIn(result.output), (std::map<int, int>{{5, 0}, {6, 0}, {7, 1}, {8, 1}}))
+    EXPECT_EQ(0, result.exitCode) << result.output;
+    EXPECT_EQ((std::map<int, int>{{5, 0}, {6, 0}, {7, 1}, {8, 1}}), valuesIn(result.output))
         << result.output;
-    EXPECT_EQ(functionOfFirstRequest(), 2);
+    EXPECT_EQ(2, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, Function3ReadsHoldingRegisters) {
     const auto result = mbpoll(kHoldingRegister, {"-r", "0", "-c", "125"});
-    EXPECT_EQ(result.exitCode, 0) << result.output;
+    EXPECT_EQ(0, result.exitCode) << result.output;
     const auto values = valuesIn(result.output);
-    ASSERT_EQ(values.size(), 125U) << result.output;
+    ASSERT_EQ(125U, values.size()) << result.output;
     for (const auto& [address, value] : values)
-        EXPECT_EQ(value, 3000 + address);
-    EXPECT_EQ(functionOfFirstRequest(), 3);
+        EXPECT_EQ(3000 + address, value);
+    EXPECT_EQ(3, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, Function4ReadsInputRegisters) {
     // Above 32767 mbpoll adds the signed value in brackets, behind the unsigned one.
     const auto result = mbpoll(kInputRegister, {"-r", "9998", "-c", "2"});
-    EXPECT_EQ(result.exitCode, 0) << result.output;
-    EXPECT_EQ(valuesIn(result.output), (std::map<int, int>{{9998, 42998}, {9999, 42999}}))
+    EXPECT_EQ(0, result.exitCode) << result.output;
+    EXPECT_EQ((std::map<int, int>{{9998, 42998}, {9999, 42999}}), valuesIn(result.output))
         << result.output;
-    EXPECT_EQ(functionOfFirstRequest(), 4);
+    EXPECT_EQ(4, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, Function5WritesOneCoil) {
     const auto result = mbpoll(kCoil, {"-r", "5"}, {"1"});
-    EXPECT_EQ(result.exitCode, 0) << result.output;
-    EXPECT_EQ(item(Area::coil, 5), 1U);
-    EXPECT_EQ(functionOfFirstRequest(), 5);
+    EXPECT_EQ(0, result.exitCode) << result.output;
+    EXPECT_EQ(1U, item(Area::coil, 5));
+    EXPECT_EQ(5, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, Function6WritesOneRegister) {
     const auto result = mbpoll(kHoldingRegister, {"-r", "5"}, {"4711"});
-    EXPECT_EQ(result.exitCode, 0) << result.output;
-    EXPECT_EQ(item(Area::holdingRegister, 5), 4711U);
-    EXPECT_EQ(functionOfFirstRequest(), 6);
+    EXPECT_EQ(0, result.exitCode) << result.output;
+    EXPECT_EQ(4711U, item(Area::holdingRegister, 5));
+    EXPECT_EQ(6, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, Function15WritesManyCoils) {
     const auto result = mbpoll(kCoil, {"-r", "8"}, {"1", "0", "0", "1", "1", "0", "1", "1", "1"});
-    EXPECT_EQ(result.exitCode, 0) << result.output;
+    EXPECT_EQ(0, result.exitCode) << result.output;
     const sim::Bytes written{1, 0, 0, 1, 1, 0, 1, 1, 1};
     for (std::uint32_t i = 0; i < written.size(); ++i) {
-        EXPECT_EQ(item(Area::coil, 8 + i), written[i]) << i;
+        EXPECT_EQ(written[i], item(Area::coil, 8 + i)) << i;
     }
-    EXPECT_EQ(functionOfFirstRequest(), 15);
+    EXPECT_EQ(15, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, Function16WritesManyRegisters) {
     const auto result = mbpoll(kHoldingRegister, {"-r", "5"}, {"1", "65535", "256"});
-    EXPECT_EQ(result.exitCode, 0) << result.output;
-    EXPECT_EQ(item(Area::holdingRegister, 5), 1U);
-    EXPECT_EQ(item(Area::holdingRegister, 6), 65535U);
-    EXPECT_EQ(item(Area::holdingRegister, 7), 256U);
-    EXPECT_EQ(functionOfFirstRequest(), 16);
+    EXPECT_EQ(0, result.exitCode) << result.output;
+    EXPECT_EQ(1U, item(Area::holdingRegister, 5));
+    EXPECT_EQ(65535U, item(Area::holdingRegister, 6));
+    EXPECT_EQ(256U, item(Area::holdingRegister, 7));
+    EXPECT_EQ(16, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, AnExceptionReachesThePerson) {

@@ -17,7 +17,7 @@ class SimPymodbusTest : public testing::TestWithParam<std::pair<sim::Mode, const
 
 TEST_P(SimPymodbusTest, EveryFunctionCodeAgrees) {
     const auto installed = peers::runProgram({kPython, "-c", "import pymodbus.client"});
-    ASSERT_EQ(installed.exitCode, 0)
+    ASSERT_EQ(0, installed.exitCode)
         << "pymodbus is missing: apt-get install python3-pymodbus python3-serial-asyncio\n"
         << installed.output;
 
@@ -26,23 +26,24 @@ TEST_P(SimPymodbusTest, EveryFunctionCodeAgrees) {
     simulator.start();
     const std::string script = PEERS_DIRECTORY "/pymodbus_client.py";
     const auto result = peers::runProgram({kPython, script, name, simulator.path(), "7"});
-    EXPECT_EQ(result.exitCode, 0);
-    EXPECT_EQ(result.output,
-              "coils 1 0 0 1 0 0 1 0 0\n"
-              "inputs 0 0 0 1 1 0 0 0 1\n"
-              "holding 7005 7006 7007\n"
-              "input 37005 37006 37007\n"
-              "coil written\n"
-              "register written\n"
-              "coils written\n"
-              "registers written\n"
-              "back 7200 1 65535 256 7204\n"
-              "beyond 2\n");
-    EXPECT_EQ(simulator.slave().get(7, Area::coil, 100), 1U);
-    EXPECT_EQ(simulator.slave().get(7, Area::holdingRegister, 100), 4711U);
-    EXPECT_EQ(simulator.slave().get(7, Area::coil, 201), 1U);
-    EXPECT_EQ(simulator.slave().get(7, Area::coil, 202), 0U);
-    EXPECT_EQ(simulator.slave().get(7, Area::coil, 203), 1U);
+    EXPECT_EQ(0, result.exitCode);
+    EXPECT_EQ(
+        "coils 1 0 0 1 0 0 1 0 0\n"
+        "inputs 0 0 0 1 1 0 0 0 1\n"
+        "holding 7005 7006 7007\n"
+        "input 37005 37006 37007\n"
+        "coil written\n"
+        "register written\n"
+        "coils written\n"
+        "registers written\n"
+        "back 7200 1 65535 256 7204\n"
+        "beyond 2\n",
+        result.output);
+    EXPECT_EQ(1U, simulator.slave().get(7, Area::coil, 100));
+    EXPECT_EQ(4711U, simulator.slave().get(7, Area::holdingRegister, 100));
+    EXPECT_EQ(1U, simulator.slave().get(7, Area::coil, 201));
+    EXPECT_EQ(0U, simulator.slave().get(7, Area::coil, 202));
+    EXPECT_EQ(1U, simulator.slave().get(7, Area::coil, 203));
 }
 
 INSTANTIATE_TEST_SUITE_P(Modes, SimPymodbusTest,
