@@ -10,9 +10,9 @@ namespace {
 
 constexpr const char* kNoUri = "error: missing parameter (URI string)\n";
 
-using Console = ConsoleTest;
+using BaseConsoleTest = ConsoleTest;
 
-TEST_F(Console, HelpListsTheDocumentedCommands) {
+TEST_F(BaseConsoleTest, HelpListsTheDocumentedCommands) {
     EXPECT_EQ(
         "help - displays this message\n"
         "info - displays information about the protocol version\n"
@@ -24,7 +24,7 @@ TEST_F(Console, HelpListsTheDocumentedCommands) {
         answerTo("help"));
 }
 
-TEST_F(Console, UnknownWordsLeaveTheAnswerUntouched) {
+TEST_F(BaseConsoleTest, UnknownWordsLeaveTheAnswerUntouched) {
     for (const char* command : {"HELP", "Help", "helpme", "hel", "", " ", " help", "setid 1 2",
                                 "getid", "\nhelp", "help\n", "?"}) {
         SCOPED_TRACE(std::string("\"") + command + '"');
@@ -34,11 +34,11 @@ TEST_F(Console, UnknownWordsLeaveTheAnswerUntouched) {
     EXPECT_EQ(1, protocol_.GetLastError());
 }
 
-TEST_F(Console, TabsAroundAWordDoNotCount) {
+TEST_F(BaseConsoleTest, TabsAroundAWordDoNotCount) {
     EXPECT_EQ(answerTo("help"), answerTo("\thelp\t"));
 }
 
-TEST_F(Console, CommandsWithoutParametersIgnoreFurtherWords) {
+TEST_F(BaseConsoleTest, CommandsWithoutParametersIgnoreFurtherWords) {
     protocol_.SetError(-4, "no response");
     for (const char* command : {"help", "info", "lasterror", "getmaxtm"}) {
         const std::string plain = answerTo(command);
@@ -47,7 +47,7 @@ TEST_F(Console, CommandsWithoutParametersIgnoreFurtherWords) {
     }
 }
 
-TEST_F(Console, InfoIsTheProtocolsDescription) {
+TEST_F(BaseConsoleTest, InfoIsTheProtocolsDescription) {
     EXPECT_EQ(
         "Protocol: TEST (7) v.12\n"
         "Implementation: TestProtocol v.34\n"
@@ -56,7 +56,7 @@ TEST_F(Console, InfoIsTheProtocolsDescription) {
         answerTo("info"));
 }
 
-TEST_F(Console, XmlEndsAtTheFirstZeroOfTheBlock) {
+TEST_F(BaseConsoleTest, XmlEndsAtTheFirstZeroOfTheBlock) {
     class Described : public TestProtocol {
       public:
         const unsigned char* GetXml() const override {
@@ -69,20 +69,20 @@ TEST_F(Console, XmlEndsAtTheFirstZeroOfTheBlock) {
     EXPECT_EQ(std::string("compressedXML=5").append(25, '\0'), answer.content());
 }
 
-TEST_F(Console, XmlOfAProtocolWithoutDescriptionIsEmpty) {
+TEST_F(BaseConsoleTest, XmlOfAProtocolWithoutDescriptionIsEmpty) {
     GuardedText answer(40);
     EXPECT_EQ(1, protocol_.DoCommand("xml", answer.out(), 40));
     EXPECT_EQ(std::string(40, '\0'), answer.content());
     EXPECT_TRUE(answer.guardsIntact());
 }
 
-TEST_F(Console, LastErrorIsTheTextOfTheLastFailure) {
+TEST_F(BaseConsoleTest, LastErrorIsTheTextOfTheLastFailure) {
     EXPECT_EQ("", answerTo("lasterror"));
     protocol_.SetError(-4, "no response");
     EXPECT_EQ("no response", answerTo("lasterror"));
 }
 
-TEST_F(Console, MaxTimeIsAskedForNoTagAndSigned) {
+TEST_F(BaseConsoleTest, MaxTimeIsAskedForNoTagAndSigned) {
     for (const auto& [time, text] :
          {std::pair{1500, "maxtm = 1500 ms\n"}, std::pair{0, "maxtm = 0 ms\n"},
           std::pair{-5, "maxtm = -5 ms\n"},
@@ -94,7 +94,7 @@ TEST_F(Console, MaxTimeIsAskedForNoTagAndSigned) {
     }
 }
 
-TEST_F(Console, DeleteTagsDestroysTheTagsAndSaysNothing) {
+TEST_F(BaseConsoleTest, DeleteTagsDestroysTheTagsAndSaysNothing) {
     protocol_.CreateTag("byte");
     protocol_.CreateTag("word");
     GuardedText answer(kSize);
@@ -103,7 +103,7 @@ TEST_F(Console, DeleteTagsDestroysTheTagsAndSaysNothing) {
     EXPECT_EQ(2, protocol_.destroyedTags);
 }
 
-TEST_F(Console, ReadNeedsExactlyOneUri) {
+TEST_F(BaseConsoleTest, ReadNeedsExactlyOneUri) {
     for (const char* command :
          {"read", "read a b", "read byte ", "read  byte", "read byte word dword"}) {
         EXPECT_EQ(kNoUri, answerTo(command)) << '"' << command << '"';
@@ -111,7 +111,7 @@ TEST_F(Console, ReadNeedsExactlyOneUri) {
     EXPECT_TRUE(protocol_.readLengths.empty());
 }
 
-TEST_F(Console, ReadShowsTheBytesInMemoryOrder) {
+TEST_F(BaseConsoleTest, ReadShowsTheBytesInMemoryOrder) {
     protocol_.device = {0xAA, 0x0B, 0xCC, 0xDD};
     EXPECT_EQ("aa\n", answerTo("read byte"));
     EXPECT_EQ("aa0b\n", answerTo("read word"));
@@ -119,14 +119,14 @@ TEST_F(Console, ReadShowsTheBytesInMemoryOrder) {
     EXPECT_EQ("\n", answerTo("read nothing"));
 }
 
-TEST_F(Console, ReadShowsTheRunTimeForm) {
+TEST_F(BaseConsoleTest, ReadShowsTheRunTimeForm) {
     protocol_.device = {0b00001010};
     EXPECT_EQ("010001\n", answerTo("read bits"));
     protocol_.device = {0x34, 0x12};
     EXPECT_EQ("d204\n", answerTo("read bcd"));
 }
 
-TEST_F(Console, LongValuesAreShownWhole) {
+TEST_F(BaseConsoleTest, LongValuesAreShownWhole) {
     for (std::size_t length : {64u, 65u}) {
         protocol_.device.resize(length);
         std::iota(protocol_.device.begin(), protocol_.device.end(), static_cast<unsigned char>(0));
@@ -137,19 +137,19 @@ TEST_F(Console, LongValuesAreShownWhole) {
     }
 }
 
-TEST_F(Console, UnknownUriIsAnsweredWithTheDriversText) {
+TEST_F(BaseConsoleTest, UnknownUriIsAnsweredWithTheDriversText) {
     EXPECT_EQ("Tag URI error: no such tag", answerTo("read nowhere"));
     EXPECT_EQ("Tag URI error: no such tag", answerTo("write nowhere 00"));
 }
 
-TEST_F(Console, FailedReadIsAnsweredWithTheLastError) {
+TEST_F(BaseConsoleTest, FailedReadIsAnsweredWithTheLastError) {
     protocol_.readResult = 0;
     EXPECT_EQ("nobody answered the read", answerTo("read byte"));
     protocol_.readResult = 1;
     EXPECT_EQ("read conversion error", answerTo("read odd"));
 }
 
-TEST_F(Console, ReadOfADerivedProtocolIsTheOneThatIsUsed) {
+TEST_F(BaseConsoleTest, ReadOfADerivedProtocolIsTheOneThatIsUsed) {
     class OwnRead : public TestProtocol {
       public:
         int Read(const ITag*, unsigned char* value) override {
@@ -164,7 +164,7 @@ TEST_F(Console, ReadOfADerivedProtocolIsTheOneThatIsUsed) {
     EXPECT_EQ(std::string("4200\n"), answer.text());
 }
 
-TEST_F(Console, TagsOfTheConsoleAreFreedWhateverTheOutcome) {
+TEST_F(BaseConsoleTest, TagsOfTheConsoleAreFreedWhateverTheOutcome) {
     struct Row {
         const char* command;
         int readResult;
@@ -187,7 +187,7 @@ TEST_F(Console, TagsOfTheConsoleAreFreedWhateverTheOutcome) {
     EXPECT_EQ(0, protocol_.destroyedTags) << "a freed tag was still listed";
 }
 
-TEST_F(Console, TagsOfTheApplicationStay) {
+TEST_F(BaseConsoleTest, TagsOfTheApplicationStay) {
     protocol_.CreateTag("byte");
     answerTo("read byte");
     EXPECT_EQ(1, protocol_.destroyedTags);

@@ -41,7 +41,7 @@ const Bytes kBackgrounds[] = {Bytes(6, 0x00), Bytes(6, 0xFF), {0x33, 0xA5, 0x71,
 constexpr int kPositions = 17;
 constexpr int kCounts = 20;
 
-TEST(GetLenOfBits, CountsTheBytesTouched) {
+TEST(BitUtilsTest, GetLenOfBitsCountsTheBytesTouched) {
     struct Row {
         int start;
         int count;
@@ -73,35 +73,35 @@ TEST(GetLenOfBits, CountsTheBytesTouched) {
     }
 }
 
-TEST(UnpackBits, MakesOneByteOfEachBit) {
+TEST(BitUtilsTest, UnpackBitsMakesOneByteOfEachBit) {
     const Bytes packed = {0x05};
     Bytes bits(3, 0x77);
     ProtUtilsN::UnpackBits(bits.data(), packed.data(), 0, 3);
     EXPECT_EQ((Bytes{1, 0, 1}), bits);
 }
 
-TEST(PackBits, CrossesFromTheLastBitOfAByteToTheFirstOfTheNext) {
+TEST(BitUtilsTest, PackBitsCrossesFromTheLastBitOfAByteToTheFirstOfTheNext) {
     const Bytes values = {1, 1};
     Bytes packed = {0x00, 0x00};
     ProtUtilsN::PackBits(packed.data(), values.data(), 7, 2);
     EXPECT_EQ((Bytes{0x80, 0x01}), packed);
 }
 
-TEST(PackBits, TakesAnyValueButZeroForOne) {
+TEST(BitUtilsTest, PackBitsTakesAnyValueButZeroForOne) {
     const Bytes values = {2, 0, 0xFF, 0x80};
     Bytes packed = {0xF2};
     ProtUtilsN::PackBits(packed.data(), values.data(), 0, 4);
     EXPECT_EQ((Bytes{0xFD}), packed);
 }
 
-TEST(CopyBits, KeepsThePositionWithinTheByte) {
+TEST(BitUtilsTest, CopyBitsKeepsThePositionWithinTheByte) {
     const Bytes source = {0x00, 0xFF, 0xFF};
     Bytes copy = {0x00, 0x00};
     ProtUtilsN::CopyBits(copy.data(), source.data(), 13, 4);
     EXPECT_EQ((Bytes{0xE0, 0x01}), copy);
 }
 
-TEST(BitUtils, ACountBelowOneChangesNothing) {
+TEST(BitUtilsTest, ACountBelowOneChangesNothing) {
     for (const int count : {0, -1, INT32_MIN}) {
         Bytes dst(3, 0xA5);
         ProtUtilsN::CopyBits(dst.data(), kSource.data(), 5, count);
@@ -112,7 +112,7 @@ TEST(BitUtils, ACountBelowOneChangesNothing) {
     }
 }
 
-TEST(UnpackBits, AgreesWithTheModelEverywhere) {
+TEST(BitUtilsTest, UnpackBitsAgreesWithTheModelEverywhere) {
     const Bits source = ToBits(kSource);
     for (int start = 0; start < kPositions; ++start) {
         for (int count = 0; count < kCounts; ++count) {
@@ -126,7 +126,7 @@ TEST(UnpackBits, AgreesWithTheModelEverywhere) {
     }
 }
 
-TEST(PackBits, AgreesWithTheModelEverywhere) {
+TEST(BitUtilsTest, PackBitsAgreesWithTheModelEverywhere) {
     Bytes values;
     for (const bool bit : ToBits(kSource))
         values.push_back(bit ? 0x40 : 0);
@@ -145,7 +145,7 @@ TEST(PackBits, AgreesWithTheModelEverywhere) {
     }
 }
 
-TEST(CopyBits, AgreesWithTheModelEverywhere) {
+TEST(BitUtilsTest, CopyBitsAgreesWithTheModelEverywhere) {
     const Bits source = ToBits(kSource);
     for (const Bytes& background : kBackgrounds) {
         for (int start = 0; start < kPositions; ++start) {
@@ -162,7 +162,7 @@ TEST(CopyBits, AgreesWithTheModelEverywhere) {
     }
 }
 
-TEST(shiftBits, AgreesWithTheModelEverywhere) {
+TEST(BitUtilsTest, ShiftBitsAgreesWithTheModelEverywhere) {
     const Bits source = ToBits(kSource);
     for (const Bytes& background : kBackgrounds) {
         for (int from = 0; from < kPositions; ++from) {
@@ -182,7 +182,7 @@ TEST(shiftBits, AgreesWithTheModelEverywhere) {
 }
 
 // The buffers end with the last bit's byte, so that a sanitizer sees any step beyond it.
-TEST(BitUtils, StayWithinTheBytesThatTheBitsTouch) {
+TEST(BitUtilsTest, StayWithinTheBytesThatTheBitsTouch) {
     for (int start = 0; start < kPositions; ++start) {
         for (int count = 1; count < kCounts; ++count) {
             const auto bytes = Index((start + count + 7) / 8);
@@ -199,19 +199,19 @@ TEST(BitUtils, StayWithinTheBytesThatTheBitsTouch) {
     }
 }
 
-TEST(TagBits, LocateABitArray) {
+TEST(BitUtilsTest, TagBitsLocateABitArray) {
     const ValueTag tag("boolean-10", 2, 3);
     EXPECT_EQ(19, ProtUtilsN::getStartingBit(&tag));
     EXPECT_EQ(29, ProtUtilsN::getEndingBit(&tag));
 }
 
-TEST(TagBits, LocateASingleBit) {
+TEST(BitUtilsTest, TagBitsLocateASingleBit) {
     const ValueTag tag("boolean", 1, 7);
     EXPECT_EQ(15, ProtUtilsN::getStartingBit(&tag));
     EXPECT_EQ(16, ProtUtilsN::getEndingBit(&tag));
 }
 
-TEST(TagBits, IgnoreTheBitIndexOfOtherTypes) {
+TEST(BitUtilsTest, TagBitsIgnoreTheBitIndexOfOtherTypes) {
     const ValueTag tag("int-3", 2, 5);
     EXPECT_EQ(16, ProtUtilsN::getStartingBit(&tag));
     EXPECT_EQ(16 + 12 * 8, ProtUtilsN::getEndingBit(&tag));
@@ -223,7 +223,7 @@ class RegisterTag : public ValueTag {
     int PackedLen() const override { return 6; }
 };
 
-TEST(TagBits, EndBehindTheDeviceFormWhereItIsTheLongerOne) {
+TEST(BitUtilsTest, TagBitsEndBehindTheDeviceFormWhereItIsTheLongerOne) {
     const RegisterTag tag("string-5", 4);
     EXPECT_EQ(4 * 8 + 6 * 8, ProtUtilsN::getEndingBit(&tag));
 }

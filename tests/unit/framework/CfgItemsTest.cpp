@@ -81,7 +81,7 @@ const std::vector<std::string> kNames{
     "a",         "b",  "ab",  "",  "1",   "Node1", "Node1::a", "Node12::b",
     "xNode2::b", "a=", "a=b", "=", "a b", " a",    "a\tb"};
 
-TEST(CfgItems, LookUpFindsWhatAScanFinds) {
+TEST(CfgItemsTest, LookUpFindsWhatAScanFinds) {
     std::mt19937 random(1);
     int found = 0;
     for (int round = 0; round < 20000; ++round) {
@@ -97,7 +97,7 @@ TEST(CfgItems, LookUpFindsWhatAScanFinds) {
     EXPECT_GT(found, 1000) << "the texts hardly ever held the names";
 }
 
-TEST(CfgItems, TextWithoutItsMarkerIsLookedUpTheSameWay) {
+TEST(CfgItemsTest, TextWithoutItsMarkerIsLookedUpTheSameWay) {
     std::mt19937 random(2);
     for (int round = 0; round < 5000; ++round) {
         const std::string text = randomText(random);
@@ -107,7 +107,7 @@ TEST(CfgItems, TextWithoutItsMarkerIsLookedUpTheSameWay) {
     }
 }
 
-TEST(CfgItems, EveryItemOfALongTextIsFound) {
+TEST(CfgItemsTest, EveryItemOfALongTextIsFound) {
     constexpr int kNodes = 40000;
     std::string text = "CfgVer=1 timeout=1";
     for (int node = 0; node < kNodes; ++node)
@@ -121,14 +121,14 @@ TEST(CfgItems, EveryItemOfALongTextIsFound) {
     }
 }
 
-TEST(CfgItems, CopyOfAParserOutlivesIt) {
+TEST(CfgItemsTest, CopyOfAParserOutlivesIt) {
     auto parser = std::make_unique<CfgParser>("CfgVer=1 a=1");
     CfgParser copy(*parser);
     parser.reset();
     EXPECT_STREQ("1", copy.GetParam("a"));
 }
 
-TEST(CfgItems, NamesHoldNeitherEqualSignNorWhiteSpace) {
+TEST(CfgItemsTest, NamesHoldNeitherEqualSignNorWhiteSpace) {
     for (const char* name : {"", "a", "Node1::a", "::", "&nbsp;"})
         EXPECT_TRUE(CfgItems::isName(name)) << name;
     for (const char* name : {"=", "a=", "a b", " a", "a\t", "\n", "a\vb", "\f", "\r"})

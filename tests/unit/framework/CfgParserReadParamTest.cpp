@@ -9,7 +9,7 @@ namespace {
 
 constexpr int kNoNode = -1;
 
-TEST(parseValue, TurnsEveryNbspIntoABlank) {
+TEST(CfgParserReadParamTest, ParseValueTurnsEveryNbspIntoABlank) {
     const std::pair<const char*, const char*> rows[] = {
         {"", ""},
         {"abc", "abc"},
@@ -27,13 +27,13 @@ TEST(parseValue, TurnsEveryNbspIntoABlank) {
     }
 }
 
-TEST(parseValue, MayDecodeInPlace) {
+TEST(CfgParserReadParamTest, ParseValueMayDecodeInPlace) {
     std::string value = "a&nbsp;b";
     EXPECT_TRUE(CfgParserN::parseValue(value, value));
     EXPECT_EQ("a b", value);
 }
 
-TEST(getErrorString, SaysWhatIsWrong) {
+TEST(CfgParserReadParamTest, GetErrorStringSaysWhatIsWrong) {
     const std::pair<int, const char*> rows[] = {
         {0, "Parser: parameter 'uart' has unknown error"},
         {1, "Parser: parameter 'uart' has unknown error"},
@@ -63,7 +63,7 @@ Reading ReadInt(const std::string& body, int node, int flags, bool optional) {
     return reading;
 }
 
-TEST(readParam, ReadsIntegersWithAutomaticBase) {
+TEST(CfgParserReadParamTest, ReadParamReadsIntegersWithAutomaticBase) {
     const std::pair<const char*, int> rows[] = {
         {"timeout=0x10", 16}, {"timeout=010", 8},   {"timeout=12abc", 12},
         {"timeout=abc", 0},   {"timeout=", 0},      {"timeout=-5", -5},
@@ -77,28 +77,28 @@ TEST(readParam, ReadsIntegersWithAutomaticBase) {
     }
 }
 
-TEST(readParam, LeavesTheDefaultOfAnOptionalParameter) {
+TEST(CfgParserReadParamTest, ReadParamLeavesTheDefaultOfAnOptionalParameter) {
     const Reading reading = ReadInt("repeat=2", kNoNode, 0, true);
     EXPECT_TRUE(reading.goOn);
     EXPECT_EQ(-77, reading.value);
     EXPECT_EQ("", reading.error);
 }
 
-TEST(readParam, ReportsARequiredParameterThatIsMissing) {
+TEST(CfgParserReadParamTest, ReadParamReportsARequiredParameterThatIsMissing) {
     const Reading reading = ReadInt("repeat=2", kNoNode, 0, false);
     EXPECT_FALSE(reading.goOn);
     EXPECT_EQ(-77, reading.value);
     EXPECT_EQ("Parser: parameter 'timeout' is not found", reading.error);
 }
 
-TEST(readParam, GoesOnWithoutANodeParameterWhenNoNodeAsks) {
+TEST(CfgParserReadParamTest, ReadParamGoesOnWithoutANodeParameterWhenNoNodeAsks) {
     const Reading reading = ReadInt("Node1::timeout=5", kNoNode, CfgParser::nodeOnly, false);
     EXPECT_TRUE(reading.goOn);
     EXPECT_EQ(-77, reading.value);
     EXPECT_EQ("", reading.error);
 }
 
-TEST(readParam, ReportsMisplacedParametersEvenWhenOptional) {
+TEST(CfgParserReadParamTest, ReadParamReportsMisplacedParametersEvenWhenOptional) {
     struct Row {
         const char* body;
         int node;
@@ -119,7 +119,7 @@ TEST(readParam, ReportsMisplacedParametersEvenWhenOptional) {
     }
 }
 
-TEST(readParam, DecodesTexts) {
+TEST(CfgParserReadParamTest, ReadParamDecodesTexts) {
     CfgParser parser("CfgVer=1 name=a&nbsp;b Node2::name=c");
     std::string value = "before";
     std::string error;

@@ -26,7 +26,7 @@ std::string ParamOf(const std::string& text, const char* name) {
     return value == nullptr ? "(none)" : value;
 }
 
-TEST(CfgParser, NeedsItsMarker) {
+TEST(CfgParserTest, NeedsItsMarker) {
     struct Row {
         const char* text;
         bool known;
@@ -46,26 +46,26 @@ TEST(CfgParser, NeedsItsMarker) {
     }
 }
 
-TEST(CfgParser, TakesNoTextForAnEmptyOne) {
+TEST(CfgParserTest, TakesNoTextForAnEmptyOne) {
     CfgParser parser(nullptr);
     EXPECT_FALSE(parser.KnownFormat());
     EXPECT_EQ(nullptr, parser.GetParam("a"));
 }
 
-TEST(CfgParser, KeepsTheWholeTextAndNoNodesWithoutItsMarker) {
+TEST(CfgParserTest, KeepsTheWholeTextAndNoNodesWithoutItsMarker) {
     CfgParser parser("timeout=5 Node3::timeout=7");
     EXPECT_EQ(0, parser.GetNodeCount());
     EXPECT_STREQ("5", parser.GetParam("timeout"));
     EXPECT_STREQ("7", parser.GetParam("Node3::timeout"));
 }
 
-TEST(CfgParser, IgnoresWhatIsInFrontOfItsMarker) {
+TEST(CfgParserTest, IgnoresWhatIsInFrontOfItsMarker) {
     EXPECT_EQ(ParamOf("timeout=5 CfgVer=1 timeout=7", "timeout"), "7");
     EXPECT_EQ(ParamOf("timeout=5 CfgVer=1", "timeout"), "(none)");
     EXPECT_EQ(NodesOf("Node1::a=1 CfgVer=1 Node2::a=1"), std::vector<int>{2});
 }
 
-TEST(CfgParser, EndsAtTheNextMarkerOfAnyVersion) {
+TEST(CfgParserTest, EndsAtTheNextMarkerOfAnyVersion) {
     for (const char* second : {"CfgVer=1", "CfgVer=2", "CfgVer="}) {
         const std::string text = std::string("CfgVer=1 a=1 ") + second + " b=2 Node4::a=3";
         EXPECT_EQ("1", ParamOf(text, "a")) << text;
@@ -74,7 +74,7 @@ TEST(CfgParser, EndsAtTheNextMarkerOfAnyVersion) {
     }
 }
 
-TEST(CfgParser, ListsNodesInOrderOfFirstAppearance) {
+TEST(CfgParserTest, ListsNodesInOrderOfFirstAppearance) {
     const std::vector<std::pair<std::string, std::vector<int>>> rows = {
         {"", {}},
         {"Node3::a=1 Node1::a=1 Node3::b=1", {3, 1}},
@@ -99,7 +99,7 @@ TEST(CfgParser, ListsNodesInOrderOfFirstAppearance) {
     }
 }
 
-TEST(CfgParser, NumbersNodesFromZeroOnly) {
+TEST(CfgParserTest, NumbersNodesFromZeroOnly) {
     const CfgParser parser("CfgVer=1 Node3::a=1 Node9::a=1");
     EXPECT_EQ(2, parser.GetNodeCount());
     EXPECT_EQ(9, parser.GetNodeID(1));
@@ -107,7 +107,7 @@ TEST(CfgParser, NumbersNodesFromZeroOnly) {
     EXPECT_EQ(0, parser.GetNodeID(-1));
 }
 
-TEST(GetParam, FindsItemsWhereTheyBegin) {
+TEST(CfgParserTest, GetParamFindsItemsWhereTheyBegin) {
     struct Row {
         const char* body;
         const char* name;
@@ -143,7 +143,7 @@ TEST(GetParam, FindsItemsWhereTheyBegin) {
     }
 }
 
-TEST(GetParam, KeepsItsValueUntilTheNextCall) {
+TEST(CfgParserTest, GetParamKeepsItsValueUntilTheNextCall) {
     CfgParser parser("CfgVer=1 a=first b=second");
     EXPECT_STREQ("first", parser.GetParam("a"));
     const char* second = parser.GetParam("b");
@@ -192,7 +192,7 @@ constexpr LookupRow kLookups[] = {
     {"", kNoNode, kBoth, 6, "before"},
 };
 
-TEST(getParam, AnswersByPlaceAndFlags) {
+TEST(CfgParserTest, GetParamAnswersByPlaceAndFlags) {
     for (const LookupRow& row : kLookups) {
         CfgParser parser((std::string("CfgVer=1 ") + row.body).c_str());
         std::string value = "before";

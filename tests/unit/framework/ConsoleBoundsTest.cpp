@@ -9,9 +9,9 @@
 
 namespace {
 
-class ConsoleBounds : public testing::Test {
+class ConsoleBoundsTest : public testing::Test {
   protected:
-    ConsoleBounds() {
+    ConsoleBoundsTest() {
         protocol_.knownTags["dword"] = {ICU_Type::unsignedInt, ICU_Type::none, 4};
         protocol_.knownTags["b65"] = bytesShape(65);
         protocol_.device.assign(65, 0xA5);
@@ -55,7 +55,7 @@ std::string fill(std::size_t count) {
     return std::string(count, GuardedText::kFill);
 }
 
-TEST_F(ConsoleBounds, CopiedAnswersAreCutOrPaddedWithZeroes) {
+TEST_F(ConsoleBoundsTest, CopiedAnswersAreCutOrPaddedWithZeroes) {
     for (const char* command :
          {"help", "lasterror", "getmaxtm", "read", "read a b", "read nowhere", "write",
           "write dword 0", "write dword 0000000g", "write dword 01020304", "write nowhere 00"}) {
@@ -65,14 +65,14 @@ TEST_F(ConsoleBounds, CopiedAnswersAreCutOrPaddedWithZeroes) {
     }
 }
 
-TEST_F(ConsoleBounds, FailedReadIsCutOrPaddedToo) {
+TEST_F(ConsoleBoundsTest, FailedReadIsCutOrPaddedToo) {
     protocol_.readResult = 0;
     const std::string whole = wholeAnswer("read dword");
     ASSERT_EQ("nobody answered the read", whole);
     tryEverySize("read dword", [&whole](std::size_t size) { return boundedCopy(whole, size); });
 }
 
-TEST_F(ConsoleBounds, XmlIsCutOrPaddedToo) {
+TEST_F(ConsoleBoundsTest, XmlIsCutOrPaddedToo) {
     class Described : public TestProtocol {
       public:
         const unsigned char* GetXml() const override {
@@ -89,7 +89,7 @@ TEST_F(ConsoleBounds, XmlIsCutOrPaddedToo) {
     }
 }
 
-TEST_F(ConsoleBounds, InfoIsTerminatedOnlyWhereThereIsRoomAndNeverPadded) {
+TEST_F(ConsoleBoundsTest, InfoIsTerminatedOnlyWhereThereIsRoomAndNeverPadded) {
     const std::string whole = wholeAnswer("info");
     tryEverySize("info", [&whole](std::size_t size) {
         if (size <= whole.size()) return whole.substr(0, size);
@@ -107,24 +107,24 @@ std::string shownBytes(const std::string& digits, std::size_t size) {
     return shown + fill(size - shown.size());
 }
 
-TEST_F(ConsoleBounds, ReadValuesLeaveRoomForTheLineEnd) {
+TEST_F(ConsoleBoundsTest, ReadValuesLeaveRoomForTheLineEnd) {
     protocol_.device = {0xAA, 0xBB, 0xCC, 0xDD};
     tryEverySize("read dword", [](std::size_t size) { return shownBytes("aabbccdd", size); });
 }
 
-TEST_F(ConsoleBounds, LongReadValuesAreCutToFit) {
+TEST_F(ConsoleBoundsTest, LongReadValuesAreCutToFit) {
     std::string digits;
     for (int i = 0; i < 65; ++i)
         digits += "a5";
     tryEverySize("read b65", [&digits](std::size_t size) { return shownBytes(digits, size); });
 }
 
-TEST_F(ConsoleBounds, FourBytesIntoNineGiveThree) {
+TEST_F(ConsoleBoundsTest, FourBytesIntoNineGiveThree) {
     protocol_.device = {0xAA, 0xBB, 0xCC, 0xDD};
     tryOne("read dword", 9, std::string("aabbcc\n\0", 8) + fill(1));
 }
 
-TEST_F(ConsoleBounds, TinyBuffersOfAReadHoldWhatFits) {
+TEST_F(ConsoleBoundsTest, TinyBuffersOfAReadHoldWhatFits) {
     tryOne("read dword", 0, "");
     tryOne("read dword", 1, "\n");
     tryOne("read dword", 2, std::string("\n\0", 2));
@@ -132,7 +132,7 @@ TEST_F(ConsoleBounds, TinyBuffersOfAReadHoldWhatFits) {
     tryOne("read dword", 5, std::string("a5\n\0", 4) + fill(1));
 }
 
-TEST_F(ConsoleBounds, NoBufferIsNeededForNoBytes) {
+TEST_F(ConsoleBoundsTest, NoBufferIsNeededForNoBytes) {
     for (const char* command : {"help", "info", "xml", "lasterror", "getmaxtm", "read dword",
                                 "read", "write dword 01020304", "deletetags"}) {
         for (int size : {0, -1})

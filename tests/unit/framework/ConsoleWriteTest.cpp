@@ -9,13 +9,13 @@
 namespace {
 
 using Bytes = std::vector<unsigned char>;
-using ConsoleWrite = ConsoleTest;
+using ConsoleWriteTest = ConsoleTest;
 
 constexpr const char* kNoUriOrData = "error: missing parameters (URI string + data)\n";
 constexpr const char* kWrongLength = "error: incorrect length of data to write\n";
 constexpr const char* kWrongDigits = "error: incorrect hex data\n";
 
-TEST_F(ConsoleWrite, WriteNeedsExactlyUriAndData) {
+TEST_F(ConsoleWriteTest, WriteNeedsExactlyUriAndData) {
     for (const char* command :
          {"write", "write byte", "write byte 00 00", "write byte  00", "write byte 00 "}) {
         EXPECT_EQ(kNoUriOrData, answerTo(command)) << '"' << command << '"';
@@ -23,14 +23,14 @@ TEST_F(ConsoleWrite, WriteNeedsExactlyUriAndData) {
     EXPECT_TRUE(protocol_.written.empty());
 }
 
-TEST_F(ConsoleWrite, WrittenDigitsAreHighNibbleFirstInEitherCase) {
+TEST_F(ConsoleWriteTest, WrittenDigitsAreHighNibbleFirstInEitherCase) {
     EXPECT_EQ("written ok\n", answerTo("write dword 1aB2c3D4"));
     EXPECT_EQ("written ok\n", answerTo("write bits 010001"));
     const std::vector<Bytes> expected{{0x1A, 0xB2, 0xC3, 0xD4}, {1, 0, 1}};
     EXPECT_EQ(expected, protocol_.written);
 }
 
-TEST_F(ConsoleWrite, LongValuesAreWrittenWhole) {
+TEST_F(ConsoleWriteTest, LongValuesAreWrittenWhole) {
     for (std::size_t length : {64u, 65u}) {
         std::string digits;
         for (std::size_t i = 0; i < length; ++i)
@@ -43,7 +43,7 @@ TEST_F(ConsoleWrite, LongValuesAreWrittenWhole) {
     }
 }
 
-TEST_F(ConsoleWrite, WrongNumberOfDigitsIsRefused) {
+TEST_F(ConsoleWriteTest, WrongNumberOfDigitsIsRefused) {
     for (const char* data : {"001", "0", "00", "00000", "000000", "0x00f"}) {
         EXPECT_EQ(kWrongLength, answerTo(std::string("write word ") + data)) << data;
     }
@@ -51,16 +51,16 @@ TEST_F(ConsoleWrite, WrongNumberOfDigitsIsRefused) {
     EXPECT_TRUE(protocol_.written.empty());
 }
 
-TEST_F(ConsoleWrite, WrongLengthIsReportedBeforeWrongDigits) {
+TEST_F(ConsoleWriteTest, WrongLengthIsReportedBeforeWrongDigits) {
     EXPECT_EQ(kWrongLength, answerTo("write word 0g0"));
 }
 
-TEST_F(ConsoleWrite, EmptyValueTakesEmptyData) {
+TEST_F(ConsoleWriteTest, EmptyValueTakesEmptyData) {
     EXPECT_EQ("written ok\n", answerTo("write nothing "));
     EXPECT_EQ(std::vector<Bytes>{Bytes{}}, protocol_.written);
 }
 
-TEST_F(ConsoleWrite, OnlyHexadecimalDigitsAreTaken) {
+TEST_F(ConsoleWriteTest, OnlyHexadecimalDigitsAreTaken) {
     EXPECT_EQ(kWrongDigits, answerTo("write byte 0g"));
     const std::string digits = "0123456789ABCDEFabcdef";
     for (int code = 1; code < 256; ++code) {
@@ -74,7 +74,7 @@ TEST_F(ConsoleWrite, OnlyHexadecimalDigitsAreTaken) {
     EXPECT_EQ(2 * digits.size(), protocol_.written.size());
 }
 
-TEST_F(ConsoleWrite, FailedWriteIsAnsweredWithTheLastError) {
+TEST_F(ConsoleWriteTest, FailedWriteIsAnsweredWithTheLastError) {
     protocol_.writeResult = 0;
     EXPECT_EQ("nobody answered the write", answerTo("write byte 00"));
 }

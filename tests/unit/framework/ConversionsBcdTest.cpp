@@ -34,7 +34,7 @@ ConversionShape Items(int size, int items = 1) {
     return {size * items, size, items, ICU_Type::float_};
 }
 
-TEST(Bcd, TurnsDigitsIntoNumbersAndBack) {
+TEST(ConversionsBcdTest, TurnsDigitsIntoNumbersAndBack) {
     for (const BcdRow& row : kBcd) {
         const Bytes digits = LittleEndian(row.digits, row.size);
         const Bytes value = LittleEndian(row.value, row.size);
@@ -43,11 +43,11 @@ TEST(Bcd, TurnsDigitsIntoNumbersAndBack) {
     }
 }
 
-TEST(Bcd, ReadsLowByteFirst) {
+TEST(ConversionsBcdTest, ReadsLowByteFirst) {
     EXPECT_EQ((Bytes{0xD2, 0x04}), Converted({0x34, 0x12}, "bcd", Shape(ICU_Type::short_), kRead));
 }
 
-TEST(Bcd, ReadsEightBytesAndTheTenOfATime) {
+TEST(ConversionsBcdTest, ReadsEightBytesAndTheTenOfATime) {
     EXPECT_EQ(LittleEndian(9876543210123456U, 8),
               Converted(LittleEndian(0x9876543210123456U, 8), "bcd", Items(8), kRead));
     // 99999999999999999999 = 0x56BC75E2D630FFFFF has 67 bits
@@ -55,7 +55,7 @@ TEST(Bcd, ReadsEightBytesAndTheTenOfATime) {
               Converted(Bytes(10, 0x99), "bcd", Shape(ICU_Type::time), kRead));
 }
 
-TEST(Bcd, RefusesEveryNibbleAboveNine) {
+TEST(ConversionsBcdTest, RefusesEveryNibbleAboveNine) {
     for (int byte = 0; byte < 256; ++byte) {
         const bool digits = byte % 16 <= 9 && byte / 16 <= 9;
         for (std::size_t place = 0; place < 4; ++place) {
@@ -66,7 +66,7 @@ TEST(Bcd, RefusesEveryNibbleAboveNine) {
     }
 }
 
-TEST(Bcd, RefusesValuesOfMoreDigits) {
+TEST(ConversionsBcdTest, RefusesValuesOfMoreDigits) {
     const std::pair<int, std::uint64_t> rows[] = {
         {1, 100},     {1, 255},      {2, 10000},     {2, 0xFFFF},
         {3, 1000000}, {3, 0xFFFFFF}, {4, 100000000}, {4, 0xFFFFFFFF},
@@ -77,14 +77,14 @@ TEST(Bcd, RefusesValuesOfMoreDigits) {
     }
 }
 
-TEST(Bcd, WritesItemsOfFourBytesAtMost) {
+TEST(ConversionsBcdTest, WritesItemsOfFourBytesAtMost) {
     for (int size = 1; size <= 10; ++size) {
         EXPECT_EQ(size > 4, Refuses("bcd", Items(size), kWrite)) << size;
         EXPECT_FALSE(Refuses("bcd", Items(size), kRead)) << size;
     }
 }
 
-TEST(Bcd, ConvertsEveryItem) {
+TEST(ConversionsBcdTest, ConvertsEveryItem) {
     EXPECT_EQ((Bytes{0xD2, 0x04, 0x2E, 0x16}),
               Converted({0x34, 0x12, 0x78, 0x56}, "bcd", Items(2, 2), kRead));
     EXPECT_EQ((Bytes{0x34, 0x12, 0x78, 0x56}),
@@ -92,12 +92,12 @@ TEST(Bcd, ConvertsEveryItem) {
     EXPECT_EQ(Bytes{}, Converted({0x34, 0x12, 0x7A, 0x56}, "bcd", Items(2, 2), kRead));
 }
 
-TEST(Bcd, LeavesAnItemWithoutLengthAlone) {
+TEST(ConversionsBcdTest, LeavesAnItemWithoutLengthAlone) {
     EXPECT_EQ((Bytes{0xFF, 0xFF}),
               Converted({0xFF, 0xFF}, "bcd", {2, 0, 1, ICU_Type::object}, kRead));
 }
 
-TEST(Bcd, RoundTripsEveryTwoByteNumber) {
+TEST(ConversionsBcdTest, RoundTripsEveryTwoByteNumber) {
     for (unsigned value = 0; value <= 9999; ++value) {
         const Bytes written = Converted(LittleEndian(value, 2), "bcd", Items(2), kWrite);
         ASSERT_EQ(2U, written.size()) << value;

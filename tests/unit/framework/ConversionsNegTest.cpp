@@ -12,7 +12,7 @@ namespace {
 
 using namespace conversions_test;
 
-TEST(Neg, ComplementsIntegers) {
+TEST(ConversionsNegTest, ComplementsIntegers) {
     struct Row {
         ICU_Type type;
         std::int64_t from;
@@ -43,7 +43,7 @@ TEST(Neg, ComplementsIntegers) {
     }
 }
 
-TEST(Neg, FlipsTheSignOfFloatsAndDoubles) {
+TEST(ConversionsNegTest, FlipsTheSignOfFloatsAndDoubles) {
     for (const float value : {1.5F, 0.0F, -3.25e30F, std::numeric_limits<float>::infinity()}) {
         EXPECT_EQ(LittleEndian(std::bit_cast<std::uint32_t>(-value), 4),
                   Converted(LittleEndian(std::bit_cast<std::uint32_t>(value), 4), "neg",
@@ -80,7 +80,7 @@ int NegatedItems(ICU_Type type, int items) {
     return negated;
 }
 
-TEST(Neg, ReachesTheFrontPartOfArraysOfWiderItems) {
+TEST(ConversionsNegTest, ReachesTheFrontPartOfArraysOfWiderItems) {
     struct Row {
         ICU_Type type;
         int items;
@@ -99,7 +99,7 @@ TEST(Neg, ReachesTheFrontPartOfArraysOfWiderItems) {
     }
 }
 
-TEST(Neg, ReachesTheFrontPartOfFloatAndDoubleArrays) {
+TEST(ConversionsNegTest, ReachesTheFrontPartOfFloatAndDoubleArrays) {
     Bytes floats(std::size_t{10} * 4, 0);
     floats = Converted(floats, "neg", Shape(ICU_Type::float_, 10), kRead);
     EXPECT_EQ(3, std::count(floats.begin(), floats.end(), 0x80));
@@ -110,7 +110,7 @@ TEST(Neg, ReachesTheFrontPartOfFloatAndDoubleArrays) {
     EXPECT_EQ(0x80, doubles[15]);
 }
 
-TEST(Neg, IsForSignedTypesOnly) {
+TEST(ConversionsNegTest, IsForSignedTypesOnly) {
     const std::vector<int> allowed = {2, 3, 4, 8, 9, 24};
     for (int code = 0; code <= 28; ++code) {
         const ConversionShape shape{16, 1, 1, static_cast<ICU_Type>(code)};
@@ -119,7 +119,7 @@ TEST(Neg, IsForSignedTypesOnly) {
     }
 }
 
-TEST(Neg, StaysWithinTheValue) {
+TEST(ConversionsNegTest, StaysWithinTheValue) {
     EXPECT_EQ((Bytes{1, 2, 3, 4}),
               Converted({1, 2, 3, 4}, "neg", {3, 4, 1, ICU_Type::int_}, kRead));
 }

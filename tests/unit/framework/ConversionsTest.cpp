@@ -11,7 +11,7 @@ namespace {
 
 using namespace conversions_test;
 
-TEST(Conversion, OfAnUnknownNameIsRefused) {
+TEST(ConversionsTest, ConversionOfAnUnknownNameIsRefused) {
     for (const char* name : {"", "swap3", "Swap2", "swap2 ", " bcd", "swap", "swap22", "BCD"}) {
         EXPECT_TRUE(Refuses(name, Shape(ICU_Type::int_), kRead)) << name;
         EXPECT_TRUE(Refuses(name, Shape(ICU_Type::int_), kWrite)) << name;
@@ -19,7 +19,7 @@ TEST(Conversion, OfAnUnknownNameIsRefused) {
     EXPECT_TRUE(Refuses(nullptr, Shape(ICU_Type::int_), kRead));
 }
 
-TEST(Swaps, ReorderBytesInTheirGroups) {
+TEST(ConversionsTest, SwapsReorderBytesInTheirGroups) {
     struct Row {
         const char* name;
         Bytes from;
@@ -43,7 +43,7 @@ TEST(Swaps, ReorderBytesInTheirGroups) {
     }
 }
 
-TEST(Swaps, RefuseLengthsThatAreNoMultiple) {
+TEST(ConversionsTest, SwapsRefuseLengthsThatAreNoMultiple) {
     const std::pair<const char*, int> groups[] = {
         {"swapnibble", 1}, {"swap2", 2}, {"swap4", 4}, {"swap8", 8}};
     for (const auto& [name, group] : groups) {
@@ -54,7 +54,7 @@ TEST(Swaps, RefuseLengthsThatAreNoMultiple) {
     }
 }
 
-TEST(Conversions, WithoutALengthChangeNothing) {
+TEST(ConversionsTest, WithoutALengthChangeNothing) {
     for (const char* name : {"swapnibble", "swap2", "swap4", "swap8", "inv", "bcd"}) {
         for (const int length : {0, -1, -3, std::numeric_limits<int>::min()}) {
             EXPECT_EQ(Bytes{0x12}, Converted({0x12}, name, Raw(length), kRead))
@@ -65,14 +65,14 @@ TEST(Conversions, WithoutALengthChangeNothing) {
     }
 }
 
-TEST(Inv, TogglesBits) {
+TEST(ConversionsTest, InvTogglesBits) {
     for (const ICU_Type type : {ICU_Type::boolean, ICU_Type::booleanArray}) {
         EXPECT_EQ((Bytes{0, 1, 0, 0}), Converted({1, 0, 1, 7}, "inv", {4, 1, 4, type}, kRead));
         EXPECT_EQ((Bytes{0, 1, 0}), Converted({1, 0, 1}, "inv", {3, 1, 3, type}, kWrite));
     }
 }
 
-TEST(Inv, ComplementsUnsignedTypes) {
+TEST(ConversionsTest, InvComplementsUnsignedTypes) {
     const std::vector<int> bitwise = {5, 6, 7, 11, 23};
     for (int code = 0; code <= 28; ++code) {
         if (code == 1 || code == 13) continue;

@@ -87,7 +87,7 @@ Parsed Refused(Names conversions = {}) {
     return {false, -1, -1, -77, std::move(conversions)};
 }
 
-TEST(DataTypeTable, HasTheTwentySevenRows) {
+TEST(DataTypesTest, TableHasTheTwentySevenRows) {
     ASSERT_EQ(std::size(kKnown), ProtUtilsN::DataTypes.size());
     for (std::size_t i = 0; i < std::size(kKnown); ++i) {
         const ProtUtilsN::DataType& row = ProtUtilsN::DataTypes[i];
@@ -99,7 +99,7 @@ TEST(DataTypeTable, HasTheTwentySevenRows) {
     }
 }
 
-TEST(GetICOMType, ReadsEveryRow) {
+TEST(DataTypesTest, GetICOMTypeReadsEveryRow) {
     for (const KnownRow& row : kKnown) {
         const std::string text = row.text;
         const bool array = text.back() == '-';
@@ -109,7 +109,7 @@ TEST(GetICOMType, ReadsEveryRow) {
     }
 }
 
-TEST(GetICOMType, TakesTextsApart) {
+TEST(DataTypesTest, GetICOMTypeTakesTextsApart) {
     const std::vector<std::pair<std::string, Parsed>> rows = {
         {"int", Accepted(4, 0, 4)},
         {"int-10", Accepted(16, 4, 40)},
@@ -141,7 +141,7 @@ TEST(GetICOMType, TakesTextsApart) {
     }
 }
 
-TEST(GetICOMType, RefusesWhatIsNoType) {
+TEST(DataTypesTest, GetICOMTypeRefusesWhatIsNoType) {
     const std::vector<std::pair<std::string, Parsed>> rows = {
         {"", Refused()},
         {"-", Refused()},
@@ -163,13 +163,13 @@ TEST(GetICOMType, RefusesWhatIsNoType) {
     }
 }
 
-TEST(GetICOMType, MissesTheClosingParenthesisBeforeItLooksAtTheName) {
+TEST(DataTypesTest, GetICOMTypeMissesTheClosingParenthesisBeforeItLooksAtTheName) {
     EXPECT_EQ(Parse("float(swap2"), Refused());
     EXPECT_EQ(Parse("int-3(bcd"), Refused());
     EXPECT_EQ(Parse("wrong(swap2"), Refused());
 }
 
-TEST(GetICOMType, AppendsToTheConversions) {
+TEST(DataTypesTest, GetICOMTypeAppendsToTheConversions) {
     ICU_Type type = ICU_Type::none;
     ICU_Type element = ICU_Type::none;
     int length = 0;
@@ -178,7 +178,7 @@ TEST(GetICOMType, AppendsToTheConversions) {
     EXPECT_EQ((Names{"first", "neg"}), conversions);
 }
 
-TEST(GetICOMType, KeepsLengthsToThirtyTwoBits) {
+TEST(DataTypesTest, GetICOMTypeKeepsLengthsToThirtyTwoBits) {
     const std::vector<std::pair<std::string, int>> rows = {
         {"int-2000000000", INT32_MAX},          {"byte-2147483647", INT32_MAX},
         {"byte-99999999999", INT32_MAX},        {"int-4294967297", INT32_MAX},
@@ -192,7 +192,7 @@ TEST(GetICOMType, KeepsLengthsToThirtyTwoBits) {
     }
 }
 
-TEST(GetICOMName, AppendsTheElementCountOfArrays) {
+TEST(DataTypesTest, GetICOMNameAppendsTheElementCountOfArrays) {
     struct Row {
         int type;
         int length;
@@ -209,7 +209,7 @@ TEST(GetICOMName, AppendsTheElementCountOfArrays) {
     }
 }
 
-TEST(GetICOMName, IsReadBackAsTheSameType) {
+TEST(DataTypesTest, GetICOMNameIsReadBackAsTheSameType) {
     for (const KnownRow& row : kKnown) {
         if (row.code == 27) continue;  // the count behind "object" makes it no type
         const int itemLength = ProtUtilsN::GetDataLength(Code(row.element));
@@ -219,7 +219,7 @@ TEST(GetICOMName, IsReadBackAsTheSameType) {
     }
 }
 
-TEST(GetDataLength, CoversScalarsOnly) {
+TEST(DataTypesTest, GetDataLengthCoversScalarsOnly) {
     const int lengths[] = {0, 1, 1, 2, 4, 1, 2, 4, 4, 8, 0, 0, 10, 0, 0,
                            0, 0, 0, 0, 0, 0, 0, 0, 8, 8, 0, 0, 0,  0};
     for (int code = 0; code < static_cast<int>(std::size(lengths)); ++code) {
@@ -230,19 +230,19 @@ TEST(GetDataLength, CoversScalarsOnly) {
     }
 }
 
-TEST(GetItemCount, DividesTheLength) {
+TEST(DataTypesTest, GetItemCountDividesTheLength) {
     EXPECT_EQ(ProtUtilsN::GetItemCount(40, Code(4)), 10);
     EXPECT_EQ(ProtUtilsN::GetItemCount(43, Code(4)), 10);
     EXPECT_EQ(ProtUtilsN::GetItemCount(0, Code(4)), 0);
 }
 
-TEST(GetItemCount, IsOneWhereItemsHaveNoLength) {
+TEST(DataTypesTest, GetItemCountIsOneWhereItemsHaveNoLength) {
     for (const int code : {0, 10, 16, 25, 27, 28, -1}) {
         EXPECT_EQ(1, ProtUtilsN::GetItemCount(40, Code(code))) << code;
     }
 }
 
-TEST(TagQueries, TellItemsOfATag) {
+TEST(DataTypesTest, TagQueriesTellItemsOfATag) {
     struct Row {
         const char* text;
         int items;
@@ -265,19 +265,19 @@ TEST(TagQueries, TellItemsOfATag) {
     }
 }
 
-TEST(TagQueries, CountOneItemWhereTheItemTypeHasNoLength) {
+TEST(DataTypesTest, TagQueriesCountOneItemWhereTheItemTypeHasNoLength) {
     ValueTag tag("int-10");
     tag.setType(Code(16), Code(16), 40);
     EXPECT_EQ(1, ProtUtilsN::GetItemCount(&tag));
 }
 
-TEST(IsBitType, HoldsForBooleanAndItsArrayOnly) {
+TEST(DataTypesTest, IsBitTypeHoldsForBooleanAndItsArrayOnly) {
     for (int code = -1; code < 30; ++code) {
         EXPECT_EQ(code == 1 || code == 13, ProtUtilsN::IsBitType(Code(code))) << code;
     }
 }
 
-TEST(GetTypeFlag, IsOneBitPerType) {
+TEST(DataTypesTest, GetTypeFlagIsOneBitPerType) {
     for (const KnownRow& row : kKnown) {
         EXPECT_EQ(ProtUtilsN::GetTypeFlag(Code(row.code)), 1 << (row.code - 1)) << row.text;
     }
@@ -286,7 +286,7 @@ TEST(GetTypeFlag, IsOneBitPerType) {
     }
 }
 
-TEST(GetVersion, IsTwoHundred) {
+TEST(DataTypesTest, GetVersionIsTwoHundred) {
     EXPECT_EQ(ProtUtilsN::GetVersion(), 200);
 }
 

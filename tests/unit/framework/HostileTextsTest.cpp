@@ -46,7 +46,7 @@ class TextMaker {
     std::mt19937 random_;
 };
 
-TEST(HostileTexts, NeverMakeADataTypeOfNoRow) {
+TEST(HostileTextsTest, NeverMakeADataTypeOfNoRow) {
     Pieces pieces = {"(", ")", ",", "-", " ", "\t", "0", "7", "99999999999", "-5", "swap2", "bcd"};
     for (const auto& row : ProtUtilsN::DataTypes)
         pieces.emplace_back(row.typeString);
@@ -87,7 +87,7 @@ std::size_t ImageLength(const ValueTag& tag) {
     return AtLeastZero(tag.GetBitIndex() + tag.GetVarLength() + 7) / 8;
 }
 
-TEST(HostileTexts, NeverLeadATagOutOfItsBuffers) {
+TEST(HostileTextsTest, NeverLeadATagOutOfItsBuffers) {
     TextMaker texts({"int",      "short",    "boolean", "byte",  "-",          "3",
                      "1",        "(",        ")",       ",",     "swap2",      "swap4",
                      "swap8",    "bcd",      "neg",     "inv",   "swapnibble", "double",
@@ -112,7 +112,7 @@ TEST(HostileTexts, NeverLeadATagOutOfItsBuffers) {
     EXPECT_GT(converted, 100);
 }
 
-TEST(HostileTexts, NeverMakeAParameterOfAnotherOne) {
+TEST(HostileTextsTest, NeverMakeAParameterOfAnotherOne) {
     TextMaker texts({"CfgVer=1", "CfgVer=1 ", "CfgVer=", "Node", "Node1", "Node2::", "::", ":", " ",
                      "\n", "timeout=", "timeout", "=", "uart=com1", "&nbsp;", "7", "0x", "-"},
                     3);
@@ -143,7 +143,7 @@ TEST(HostileTexts, NeverMakeAParameterOfAnotherOne) {
 }
 
 // A driver reads all parameters of all nodes: the search must not grow out of hand.
-TEST(HostileTexts, NodesWithoutEndAreCollectedOnce) {
+TEST(HostileTextsTest, NodesWithoutEndAreCollectedOnce) {
     std::string text = "CfgVer=1 ";
     for (int i = 0; i < 200000; ++i)
         text += "Node";

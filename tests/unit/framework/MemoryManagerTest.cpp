@@ -19,7 +19,7 @@ Model ModelWith(const char* name, const MemoryType& area) {
     return model;
 }
 
-TEST(MemoryType, StartsAsAnEmptyBitArea) {
+TEST(MemoryManagerTest, MemoryTypeStartsAsAnEmptyBitArea) {
     const MemoryType area;
     EXPECT_EQ("", area.getName());
     EXPECT_EQ(1, static_cast<int>(area.getNaturalType()));
@@ -35,7 +35,7 @@ TEST(MemoryType, StartsAsAnEmptyBitArea) {
     }
 }
 
-TEST(MemoryType, KeepsEveryNumber) {
+TEST(MemoryManagerTest, MemoryTypeKeepsEveryNumber) {
     MemoryType area;
     area.setName("HREG");
     area.setNaturalType(ICU_Type::unsignedShort);
@@ -55,7 +55,7 @@ TEST(MemoryType, KeepsEveryNumber) {
 }
 
 // One setter at a time: no flag may move another one.
-TEST(MemoryType, KeepsEachFlagApart) {
+TEST(MemoryManagerTest, MemoryTypeKeepsEachFlagApart) {
     using Setter = void (MemoryType::*)(bool);
     using Getter = bool (MemoryType::*)() const;
     const std::pair<Setter, Getter> flags[] = {
@@ -79,7 +79,7 @@ TEST(MemoryType, KeepsEachFlagApart) {
     }
 }
 
-TEST(Model, StartsEmpty) {
+TEST(MemoryManagerTest, ModelStartsEmpty) {
     const Model model("Modicon");
     EXPECT_EQ("Modicon", model.getName());
     EXPECT_EQ(0, model.getMaxDatagramItems());
@@ -87,7 +87,7 @@ TEST(Model, StartsEmpty) {
     EXPECT_TRUE(model.getMemoryTypes().empty());
 }
 
-TEST(Model, KeepsItsDatagramLimitsApart) {
+TEST(MemoryManagerTest, ModelKeepsItsDatagramLimitsApart) {
     Model model("Modicon");
     model.setMaxDatagramItems(3);
     model.setMaxDatagramLength(200);
@@ -95,7 +95,7 @@ TEST(Model, KeepsItsDatagramLimitsApart) {
     EXPECT_EQ(200, model.getMaxDatagramLength());
 }
 
-TEST(Model, KeepsMemoryTypesInTheOrderAdded) {
+TEST(MemoryManagerTest, ModelKeepsMemoryTypesInTheOrderAdded) {
     Model model("Modicon");
     model.addMemoryType(Area("HREG"));
     model.addMemoryType(Area("COIL"));
@@ -106,7 +106,7 @@ TEST(Model, KeepsMemoryTypesInTheOrderAdded) {
     EXPECT_EQ("hreg", model.getMemoryTypes()[2].getName());
 }
 
-TEST(Model, KeepsTheFirstMemoryTypeOfAName) {
+TEST(MemoryManagerTest, ModelKeepsTheFirstMemoryTypeOfAName) {
     Model model("Modicon");
     model.addMemoryType(Area("HREG", 10));
     model.addMemoryType(Area("HREG", 20));
@@ -114,13 +114,13 @@ TEST(Model, KeepsTheFirstMemoryTypeOfAName) {
     EXPECT_EQ(10, model.getMemoryTypes()[0].getMaxIndex());
 }
 
-TEST(MemoryManager, IsEmptyAtFirst) {
+TEST(MemoryManagerTest, IsEmptyAtFirst) {
     const MemoryManager manager;
     EXPECT_EQ(nullptr, manager.getModel("Modicon"));
     EXPECT_EQ(nullptr, manager.getMemoryType("Modicon", "HREG"));
 }
 
-TEST(MemoryManager, FindsModelsByTheirExactName) {
+TEST(MemoryManagerTest, FindsModelsByTheirExactName) {
     MemoryManager manager;
     manager.addModel(Model("Modicon"));
     manager.addModel(Model("Enron"));
@@ -128,7 +128,7 @@ TEST(MemoryManager, FindsModelsByTheirExactName) {
     EXPECT_EQ(&manager.getModels()[0], manager.getModel("Modicon"));
 }
 
-TEST(MemoryManager, TakesTheFirstModelForAnUnknownOne) {
+TEST(MemoryManagerTest, TakesTheFirstModelForAnUnknownOne) {
     MemoryManager manager;
     manager.addModel(Model("Modicon"));
     manager.addModel(Model("Enron"));
@@ -137,7 +137,7 @@ TEST(MemoryManager, TakesTheFirstModelForAnUnknownOne) {
     }
 }
 
-TEST(MemoryManager, KeepsModelsOfTheSameNameAndFindsTheFirst) {
+TEST(MemoryManagerTest, KeepsModelsOfTheSameNameAndFindsTheFirst) {
     MemoryManager manager;
     manager.addModel(ModelWith("Modicon", Area("HREG", 10)));
     manager.addModel(ModelWith("Modicon", Area("COIL", 20)));
@@ -146,7 +146,7 @@ TEST(MemoryManager, KeepsModelsOfTheSameNameAndFindsTheFirst) {
     EXPECT_EQ(nullptr, manager.getMemoryType("Modicon", "COIL"));
 }
 
-TEST(MemoryManager, HoldsCopies) {
+TEST(MemoryManagerTest, HoldsCopies) {
     MemoryManager manager;
     Model model = ModelWith("Modicon", Area("HREG", 10));
     manager.addModel(model);
@@ -156,7 +156,7 @@ TEST(MemoryManager, HoldsCopies) {
     EXPECT_EQ(10, manager.getMemoryType("Modicon", "HREG")->getMaxIndex());
 }
 
-TEST(MemoryManager, LooksForMemoryTypesInTheNamedModelOnly) {
+TEST(MemoryManagerTest, LooksForMemoryTypesInTheNamedModelOnly) {
     MemoryManager manager;
     manager.addModel(ModelWith("Modicon", Area("HREG", 10)));
     manager.addModel(ModelWith("Enron", Area("COIL", 20)));

@@ -15,7 +15,7 @@ constexpr const char* kOutOfRange = "accessing array item out of range";
 
 const TagShape kThreeShorts{ICU_Type::shortArray, ICU_Type::short_, 6};
 
-TEST(ProtocolBaseArray, ItemIsCutOutOfTheWholeArray) {
+TEST(ProtocolBaseArrayTest, ItemIsCutOutOfTheWholeArray) {
     TestProtocol protocol;
     protocol.device = {1, 2, 3, 4, 5, 6};
     const TestTag tag("1", kThreeShorts);
@@ -29,7 +29,7 @@ TEST(ProtocolBaseArray, ItemIsCutOutOfTheWholeArray) {
     EXPECT_EQ((std::vector<int>{6, 6, 6}), protocol.readLengths);
 }
 
-TEST(ProtocolBaseArray, WrittenItemTravelsWithTheWholeArray) {
+TEST(ProtocolBaseArrayTest, WrittenItemTravelsWithTheWholeArray) {
     TestProtocol protocol;
     protocol.device = {1, 2, 3, 4, 5, 6};
     const TestTag tag("1", kThreeShorts);
@@ -39,7 +39,7 @@ TEST(ProtocolBaseArray, WrittenItemTravelsWithTheWholeArray) {
     EXPECT_EQ((Bytes{1, 2, 0xAA, 0xBB, 5, 6}), protocol.written[0]);
 }
 
-TEST(ProtocolBaseArray, ItemsOfLongArraysAreReachedToTheLast) {
+TEST(ProtocolBaseArrayTest, ItemsOfLongArraysAreReachedToTheLast) {
     for (int length : {255, 256, 257, 1000}) {
         TestProtocol protocol;
         protocol.device.resize(static_cast<std::size_t>(length));
@@ -58,7 +58,7 @@ TEST(ProtocolBaseArray, ItemsOfLongArraysAreReachedToTheLast) {
     }
 }
 
-TEST(ProtocolBaseArray, BitItemsAreOneByteEach) {
+TEST(ProtocolBaseArrayTest, BitItemsAreOneByteEach) {
     TestProtocol protocol;
     protocol.device = {0b00010100};
     const TestTag tag("1", {ICU_Type::booleanArray, ICU_Type::boolean, 4, 0, 2});
@@ -74,7 +74,7 @@ TEST(ProtocolBaseArray, BitItemsAreOneByteEach) {
     EXPECT_EQ((Bytes{1, 0, 1, 1}), protocol.written[0]);
 }
 
-TEST(ProtocolBaseArray, ScalarsHaveNoItems) {
+TEST(ProtocolBaseArrayTest, ScalarsHaveNoItems) {
     TestProtocol protocol;
     const TestTag tag("1", {ICU_Type::short_, ICU_Type::none, 2});
     unsigned char item[2] = {0xEE, 0xEE};
@@ -94,7 +94,7 @@ TEST(ProtocolBaseArray, ScalarsHaveNoItems) {
     EXPECT_TRUE(protocol.written.empty());
 }
 
-TEST(ProtocolBaseArray, IndexOutsideTheArrayReachesNoDevice) {
+TEST(ProtocolBaseArrayTest, IndexOutsideTheArrayReachesNoDevice) {
     TestProtocol protocol;
     const TestTag tag("1", kThreeShorts);
     unsigned char item[2] = {0xEE, 0xEE};
@@ -112,7 +112,7 @@ TEST(ProtocolBaseArray, IndexOutsideTheArrayReachesNoDevice) {
     EXPECT_TRUE(protocol.written.empty());
 }
 
-TEST(ProtocolBaseArray, EmptyAndNegativeArraysHaveNoItems) {
+TEST(ProtocolBaseArrayTest, EmptyAndNegativeArraysHaveNoItems) {
     TestProtocol protocol;
     unsigned char item = 0xEE;
     for (int length : {0, -1, -300}) {
@@ -124,7 +124,7 @@ TEST(ProtocolBaseArray, EmptyAndNegativeArraysHaveNoItems) {
     EXPECT_EQ(0xEE, item);
 }
 
-TEST(ProtocolBaseArray, FailedReadStopsBothReadAndWrite) {
+TEST(ProtocolBaseArrayTest, FailedReadStopsBothReadAndWrite) {
     TestProtocol protocol;
     protocol.readResult = 0;
     const TestTag tag("1", kThreeShorts);
@@ -136,7 +136,7 @@ TEST(ProtocolBaseArray, FailedReadStopsBothReadAndWrite) {
     EXPECT_STREQ("nobody answered the read", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseArray, FailedWriteIsReported) {
+TEST(ProtocolBaseArrayTest, FailedWriteIsReported) {
     TestProtocol protocol;
     protocol.writeResult = 0;
     const TestTag tag("1", kThreeShorts);

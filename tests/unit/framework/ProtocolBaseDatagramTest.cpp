@@ -37,7 +37,7 @@ class Datagrams : public CountedTags {
     std::vector<int> counts;
 };
 
-class ProtocolBaseDatagram : public testing::Test {
+class ProtocolBaseDatagramTest : public testing::Test {
   protected:
     TestTag two_{"two", bytesShape(2)};
     TestTag three_{"three", bytesShape(3)};
@@ -47,20 +47,20 @@ class ProtocolBaseDatagram : public testing::Test {
     Datagrams protocol_;
 };
 
-TEST_F(ProtocolBaseDatagram, CandidateFitsUpToTheLastByte) {
+TEST_F(ProtocolBaseDatagramTest, CandidateFitsUpToTheLastByte) {
     EXPECT_TRUE(protocol_.CanAddToDatagram(list_, 2, &five_));
     protocol_.maxLength = 9;
     EXPECT_FALSE(protocol_.CanAddToDatagram(list_, 2, &five_));
 }
 
-TEST_F(ProtocolBaseDatagram, CandidateNeedsAFreeItem) {
+TEST_F(ProtocolBaseDatagramTest, CandidateNeedsAFreeItem) {
     protocol_.maxItems = 3;
     EXPECT_TRUE(protocol_.CanAddToDatagram(list_, 2, &five_));
     protocol_.maxItems = 2;
     EXPECT_FALSE(protocol_.CanAddToDatagram(list_, 2, &five_));
 }
 
-TEST_F(ProtocolBaseDatagram, OnlyTheFirstTagIsComparedWithTheCandidate) {
+TEST_F(ProtocolBaseDatagramTest, OnlyTheFirstTagIsComparedWithTheCandidate) {
     protocol_.refused = {&three_};
     EXPECT_TRUE(protocol_.CanAddToDatagram(list_, 2, &five_));
     const std::vector<std::pair<const ITag*, const ITag*>> compared{{&two_, &five_}};
@@ -69,18 +69,18 @@ TEST_F(ProtocolBaseDatagram, OnlyTheFirstTagIsComparedWithTheCandidate) {
     EXPECT_FALSE(protocol_.CanAddToDatagram(list_, 2, &five_));
 }
 
-TEST_F(ProtocolBaseDatagram, EmptyDatagramTakesATagThatFits) {
+TEST_F(ProtocolBaseDatagramTest, EmptyDatagramTakesATagThatFits) {
     EXPECT_TRUE(protocol_.CanAddToDatagram(nullptr, 0, &five_));
     protocol_.maxLength = 4;
     EXPECT_FALSE(protocol_.CanAddToDatagram(nullptr, 0, &five_));
 }
 
-TEST_F(ProtocolBaseDatagram, WithoutAnItemLimitNothingIsAdded) {
+TEST_F(ProtocolBaseDatagramTest, WithoutAnItemLimitNothingIsAdded) {
     CoexistingTags protocol;
     EXPECT_FALSE(protocol.CanAddToDatagram(list_, 1, &five_));
 }
 
-TEST_F(ProtocolBaseDatagram, WithoutALengthLimitOnlyEmptyTagsAreAdded) {
+TEST_F(ProtocolBaseDatagramTest, WithoutALengthLimitOnlyEmptyTagsAreAdded) {
     CountedTags protocol;
     const TestTag empty("empty", bytesShape(0));
     const ITag* empties[] = {&empty, &empty};
@@ -89,13 +89,13 @@ TEST_F(ProtocolBaseDatagram, WithoutALengthLimitOnlyEmptyTagsAreAdded) {
     EXPECT_FALSE(protocol.CanAddToDatagram(list_, 2, &empty));
 }
 
-TEST_F(ProtocolBaseDatagram, HugeTagsDoNotWrapTheSum) {
+TEST_F(ProtocolBaseDatagramTest, HugeTagsDoNotWrapTheSum) {
     const TestTag huge("huge", bytesShape(std::numeric_limits<int>::max()));
     const ITag* huges[] = {&huge, &huge};
     EXPECT_FALSE(protocol_.CanAddToDatagram(huges, 2, &huge));
 }
 
-TEST_F(ProtocolBaseDatagram, EveryItemOfASuccessfulReadIsDone) {
+TEST_F(ProtocolBaseDatagramTest, EveryItemOfASuccessfulReadIsDone) {
     idal_error_t status[3] = {-8, -8, -8};
     EXPECT_NE(protocol_.ReadDatagramWithStatus(list_, 2, data_, status), 0);
     EXPECT_EQ(1, status[0]);
@@ -104,7 +104,7 @@ TEST_F(ProtocolBaseDatagram, EveryItemOfASuccessfulReadIsDone) {
     EXPECT_EQ(std::vector<int>{2}, protocol_.counts);
 }
 
-TEST_F(ProtocolBaseDatagram, FailedReadLeavesStatusAndStamps) {
+TEST_F(ProtocolBaseDatagramTest, FailedReadLeavesStatusAndStamps) {
     protocol_.readResult = 0;
     idal_error_t status[2] = {-8, -8};
     unsigned long long stamps[2] = {4711, 4711};
@@ -116,7 +116,7 @@ TEST_F(ProtocolBaseDatagram, FailedReadLeavesStatusAndStamps) {
     }
 }
 
-TEST_F(ProtocolBaseDatagram, ProtocolWithoutDatagramsLeavesStatusAndStamps) {
+TEST_F(ProtocolBaseDatagramTest, ProtocolWithoutDatagramsLeavesStatusAndStamps) {
     TestProtocol protocol;
     idal_error_t status[2] = {-8, -8};
     unsigned long long stamps[2] = {4711, 4711};
@@ -126,7 +126,7 @@ TEST_F(ProtocolBaseDatagram, ProtocolWithoutDatagramsLeavesStatusAndStamps) {
     EXPECT_EQ(4711u, stamps[0]);
 }
 
-TEST_F(ProtocolBaseDatagram, AllItemsCarryOneStamp) {
+TEST_F(ProtocolBaseDatagramTest, AllItemsCarryOneStamp) {
     idal_error_t status[2] = {-8, -8};
     unsigned long long stamps[3] = {4711, 4712, 4713};
     const unsigned long long before = currentTimeStamp();
@@ -139,7 +139,7 @@ TEST_F(ProtocolBaseDatagram, AllItemsCarryOneStamp) {
     EXPECT_EQ(1, status[1]);
 }
 
-TEST_F(ProtocolBaseDatagram, NoItemsStoreNothing) {
+TEST_F(ProtocolBaseDatagramTest, NoItemsStoreNothing) {
     for (int count : {0, -1}) {
         idal_error_t status[1] = {-8};
         unsigned long long stamps[1] = {4711};
@@ -149,7 +149,7 @@ TEST_F(ProtocolBaseDatagram, NoItemsStoreNothing) {
     }
 }
 
-TEST_F(ProtocolBaseDatagram, DriversOwnStatusesAreStampedAsTheyAre) {
+TEST_F(ProtocolBaseDatagramTest, DriversOwnStatusesAreStampedAsTheyAre) {
     class OwnStatus : public TestProtocol {
       public:
         int ReadDatagramWithStatus(const ITag* const*, int, unsigned char*,

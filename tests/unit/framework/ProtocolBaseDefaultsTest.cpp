@@ -134,19 +134,19 @@ void expectDefaults(const std::vector<DefaultRow>& rows) {
     }
 }
 
-TEST(ProtocolBaseDefaults, TransfersThatADriverDoesNotOfferAreRefused) {
+TEST(ProtocolBaseDefaultsTest, TransfersThatADriverDoesNotOfferAreRefused) {
     expectDefaults(transferRows());
 }
 
-TEST(ProtocolBaseDefaults, EventsAlarmsAndTrendsAreRefused) {
+TEST(ProtocolBaseDefaultsTest, EventsAlarmsAndTrendsAreRefused) {
     expectDefaults(eventRows());
 }
 
-TEST(ProtocolBaseDefaults, NothingElseIsPromised) {
+TEST(ProtocolBaseDefaultsTest, NothingElseIsPromised) {
     expectDefaults(otherRows());
 }
 
-TEST(ProtocolBaseOrder, OffsetsAreComparedUnsigned) {
+TEST(ProtocolBaseDefaultsTest, OffsetsAreComparedUnsigned) {
     struct Row {
         unsigned int a;
         unsigned int b;
@@ -166,7 +166,7 @@ TEST(ProtocolBaseOrder, OffsetsAreComparedUnsigned) {
     }
 }
 
-TEST(ProtocolBaseOrder, TagIsAdjacentToTheOneThatEndsWhereItBegins) {
+TEST(ProtocolBaseDefaultsTest, TagIsAdjacentToTheOneThatEndsWhereItBegins) {
     const TestTag first("a", {ICU_Type::short_, ICU_Type::none, 2, 10});
     const TestTag next("b", {ICU_Type::short_, ICU_Type::none, 2, 12});
     const TestTag later("c", {ICU_Type::short_, ICU_Type::none, 2, 13});
@@ -177,7 +177,7 @@ TEST(ProtocolBaseOrder, TagIsAdjacentToTheOneThatEndsWhereItBegins) {
     EXPECT_FALSE(protocol.IsAdjacent(&first, &first));
 }
 
-TEST(ProtocolBaseOrder, BitTagsAreAdjacentToTheBit) {
+TEST(ProtocolBaseDefaultsTest, BitTagsAreAdjacentToTheBit) {
     const TestTag three("a", {ICU_Type::booleanArray, ICU_Type::boolean, 3, 4, 5});
     const TestTag next("b", {ICU_Type::boolean, ICU_Type::none, 1, 5, 0});
     const TestTag gap("c", {ICU_Type::boolean, ICU_Type::none, 1, 5, 1});

@@ -27,9 +27,9 @@ constexpr const char* kIdentityLines =
     "ProtocolBase v.100\n"
     "ProtLib v.200\n";
 
-class ProtocolBaseInfo : public testing::Test {
+class ProtocolBaseInfoTest : public testing::Test {
   protected:
-    ~ProtocolBaseInfo() override {
+    ~ProtocolBaseInfoTest() override {
         piMultiTask = nullptr;
         piSerialFactory = nullptr;
         piSocketFactory = nullptr;
@@ -52,11 +52,11 @@ class ProtocolBaseInfo : public testing::Test {
     TestProtocol protocol_;
 };
 
-TEST_F(ProtocolBaseInfo, WithoutServicesItDescribesTheProtocolAlone) {
+TEST_F(ProtocolBaseInfoTest, WithoutServicesItDescribesTheProtocolAlone) {
     EXPECT_EQ(kIdentityLines, infoOf(protocol_));
 }
 
-TEST_F(ProtocolBaseInfo, PresentServicesFollowInFixedOrder) {
+TEST_F(ProtocolBaseInfoTest, PresentServicesFollowInFixedOrder) {
     piSocketFactory = &sockets_;
     piMultiTask = &tasks_;
     piSerialFactory = &serial_;
@@ -64,19 +64,19 @@ TEST_F(ProtocolBaseInfo, PresentServicesFollowInFixedOrder) {
               infoOf(protocol_));
 }
 
-TEST_F(ProtocolBaseInfo, MissingServiceIsPassedOver) {
+TEST_F(ProtocolBaseInfoTest, MissingServiceIsPassedOver) {
     piMultiTask = &tasks_;
     piSocketFactory = &sockets_;
     EXPECT_EQ(std::string(kIdentityLines) + "PanelTasks v.2\nPanelSockets v.-4\n",
               infoOf(protocol_));
 }
 
-TEST_F(ProtocolBaseInfo, OtherServicesAreNotNamed) {
+TEST_F(ProtocolBaseInfoTest, OtherServicesAreNotNamed) {
     piDiag = &tasks_;
     EXPECT_EQ(kIdentityLines, infoOf(protocol_));
 }
 
-TEST_F(ProtocolBaseInfo, ConvertedProtocolKeepsQuietAboutServices) {
+TEST_F(ProtocolBaseInfoTest, ConvertedProtocolKeepsQuietAboutServices) {
     class Converted : public TestProtocol {
         bool IsConverted() const override { return true; }
     };
@@ -84,7 +84,7 @@ TEST_F(ProtocolBaseInfo, ConvertedProtocolKeepsQuietAboutServices) {
     EXPECT_EQ(kIdentityLines, infoOf(Converted()));
 }
 
-TEST_F(ProtocolBaseInfo, EverySizeCutsTheTextWithoutATerminator) {
+TEST_F(ProtocolBaseInfoTest, EverySizeCutsTheTextWithoutATerminator) {
     piMultiTask = &tasks_;
     const std::string whole = infoOf(protocol_);
     for (int size = -2; size <= static_cast<int>(whole.size()) + 2; ++size) {
@@ -100,28 +100,28 @@ TEST_F(ProtocolBaseInfo, EverySizeCutsTheTextWithoutATerminator) {
     }
 }
 
-TEST_F(ProtocolBaseInfo, TenByteBufferGivesTenBytesAndNoZero) {
+TEST_F(ProtocolBaseInfoTest, TenByteBufferGivesTenBytesAndNoZero) {
     EXPECT_EQ("Protocol: ", infoOf(protocol_, 10));
 }
 
-TEST_F(ProtocolBaseInfo, NoBufferIsNeededForNoBytes) {
+TEST_F(ProtocolBaseInfoTest, NoBufferIsNeededForNoBytes) {
     EXPECT_EQ(0, protocol_.GetInfo(nullptr, 0));
     EXPECT_EQ(0, protocol_.GetInfo(nullptr, -5));
 }
 
-TEST_F(ProtocolBaseInfo, NullProtocolNameSuppressesEverythingBehindIt) {
+TEST_F(ProtocolBaseInfoTest, NullProtocolNameSuppressesEverythingBehindIt) {
     piMultiTask = &tasks_;
     protocol_.name = nullptr;
     EXPECT_EQ("Protocol: ", infoOf(protocol_));
 }
 
-TEST_F(ProtocolBaseInfo, NullImplementationNameSuppressesEverythingBehindIt) {
+TEST_F(ProtocolBaseInfoTest, NullImplementationNameSuppressesEverythingBehindIt) {
     piMultiTask = &tasks_;
     protocol_.implementation = nullptr;
     EXPECT_EQ("Protocol: TEST (7) v.12\nImplementation: ", infoOf(protocol_));
 }
 
-TEST_F(ProtocolBaseInfo, NullServiceNameSuppressesTheServicesBehindIt) {
+TEST_F(ProtocolBaseInfoTest, NullServiceNameSuppressesTheServicesBehindIt) {
     NamedService nameless(nullptr, 5);
     piMultiTask = &tasks_;
     piSerialFactory = &nameless;
@@ -129,7 +129,7 @@ TEST_F(ProtocolBaseInfo, NullServiceNameSuppressesTheServicesBehindIt) {
     EXPECT_EQ(std::string(kIdentityLines) + "PanelTasks v.2\n", infoOf(protocol_));
 }
 
-TEST_F(ProtocolBaseInfo, WidestNumbersAreWrittenWhole) {
+TEST_F(ProtocolBaseInfoTest, WidestNumbersAreWrittenWhole) {
     NamedService low("Low", -2147483647 - 1);
     NamedService high("High", 2147483647);
     piMultiTask = &low;

@@ -34,7 +34,7 @@ class FrugalProtocol : public TestProtocol {
     int transfers = 0;
 };
 
-class ProtocolBaseMemory : public testing::Test {
+class ProtocolBaseMemoryTest : public testing::Test {
   protected:
     void expectOutOfMemory() const {
         EXPECT_EQ(-1, protocol_.GetLastError());
@@ -45,7 +45,7 @@ class ProtocolBaseMemory : public testing::Test {
     std::vector<unsigned char> value_ = std::vector<unsigned char>(300, 0xEE);
 };
 
-TEST_F(ProtocolBaseMemory, LongTagIsNotReadWithoutMemory) {
+TEST_F(ProtocolBaseMemoryTest, LongTagIsNotReadWithoutMemory) {
     const TestTag tag("1", bytesShape(65));
     int ok = 1;
     {
@@ -58,7 +58,7 @@ TEST_F(ProtocolBaseMemory, LongTagIsNotReadWithoutMemory) {
     EXPECT_EQ(0xEE, value_[0]);
 }
 
-TEST_F(ProtocolBaseMemory, ShortTagNeedsNoMemory) {
+TEST_F(ProtocolBaseMemoryTest, ShortTagNeedsNoMemory) {
     const TestTag tag("1", bytesShape(64));
     protocol_.device = {1};
     int ok = 0;
@@ -71,7 +71,7 @@ TEST_F(ProtocolBaseMemory, ShortTagNeedsNoMemory) {
     EXPECT_EQ(0, value_[63]);
 }
 
-TEST_F(ProtocolBaseMemory, LongArrayIsNeitherReadNorWrittenWithoutMemory) {
+TEST_F(ProtocolBaseMemoryTest, LongArrayIsNeitherReadNorWrittenWithoutMemory) {
     const TestTag tag("1", bytesShape(257));
     int read = 1;
     int written = 1;
@@ -86,7 +86,7 @@ TEST_F(ProtocolBaseMemory, LongArrayIsNeitherReadNorWrittenWithoutMemory) {
     EXPECT_EQ(0, protocol_.transfers);
 }
 
-TEST_F(ProtocolBaseMemory, TagThatCannotBeListedIsDestroyed) {
+TEST_F(ProtocolBaseMemoryTest, TagThatCannotBeListedIsDestroyed) {
     int destroyed = 0;
     protocol_.ready = new TestTag("1", bytesShape(1), &destroyed);
     const ITag* tag = nullptr;
@@ -99,7 +99,7 @@ TEST_F(ProtocolBaseMemory, TagThatCannotBeListedIsDestroyed) {
     expectOutOfMemory();
 }
 
-TEST_F(ProtocolBaseMemory, CommonErrorTextsNeedNoMemory) {
+TEST_F(ProtocolBaseMemoryTest, CommonErrorTextsNeedNoMemory) {
     const std::string text(256, 'x');
     {
         const MemoryShortage shortage;
@@ -108,7 +108,7 @@ TEST_F(ProtocolBaseMemory, CommonErrorTextsNeedNoMemory) {
     EXPECT_EQ(text, protocol_.GetLastErrorString());
 }
 
-TEST_F(ProtocolBaseMemory, LongErrorTextIsCutWithoutMemory) {
+TEST_F(ProtocolBaseMemoryTest, LongErrorTextIsCutWithoutMemory) {
     const std::string text(5000, 'x');
     {
         const MemoryShortage shortage;
@@ -120,7 +120,7 @@ TEST_F(ProtocolBaseMemory, LongErrorTextIsCutWithoutMemory) {
     EXPECT_EQ(text.substr(0, kept.size()), kept);
 }
 
-TEST_F(ProtocolBaseMemory, IdentStaysWithoutMemory) {
+TEST_F(ProtocolBaseMemoryTest, IdentStaysWithoutMemory) {
     protocol_.SetIdent("line");
     const std::string ident(100, 'i');
     {
@@ -131,7 +131,7 @@ TEST_F(ProtocolBaseMemory, IdentStaysWithoutMemory) {
     expectOutOfMemory();
 }
 
-TEST_F(ProtocolBaseMemory, CommonTagErrorsNeedNoMemory) {
+TEST_F(ProtocolBaseMemoryTest, CommonTagErrorsNeedNoMemory) {
     const TestTag tag("a URI that is longer than a short string", bytesShape(1));
     {
         const MemoryShortage shortage;
@@ -141,7 +141,7 @@ TEST_F(ProtocolBaseMemory, CommonTagErrorsNeedNoMemory) {
                  protocol_.GetLastErrorString());
 }
 
-TEST_F(ProtocolBaseMemory, LongTagErrorIsReplacedByTheShortage) {
+TEST_F(ProtocolBaseMemoryTest, LongTagErrorIsReplacedByTheShortage) {
     const TestTag tag(std::string(300, 'u'), bytesShape(1));
     {
         const MemoryShortage shortage;
@@ -183,7 +183,7 @@ Outcome runShort(const std::string& command, int requests) {
     return outcome;
 }
 
-TEST(ConsoleMemory, EveryShortageIsToldAndLeavesNothingBehind) {
+TEST_F(ProtocolBaseMemoryTest, ConsoleTellsEveryShortageAndLeavesNothingBehind) {
     const std::string uri = "a-uri-that-is-longer-than-a-short-string";
     for (const std::string& command :
          {"read " + uri, "write " + uri + " " + std::string(130, '0')}) {
@@ -199,7 +199,7 @@ TEST(ConsoleMemory, EveryShortageIsToldAndLeavesNothingBehind) {
     }
 }
 
-TEST(ConsoleMemory, WhatQuotesNothingNeedsNone) {
+TEST_F(ProtocolBaseMemoryTest, ConsoleNeedsNoneWhereItQuotesNothing) {
     for (const char* command : {"help", "info", "xml", "lasterror", "getmaxtm", "deletetags"})
         EXPECT_FALSE(runShort(command, 0).ranShort) << command;
 }

@@ -1,7 +1,6 @@
-// Reads of one tag, and their time stamps.
+// Reads of one tag.
 #include <gtest/gtest.h>
 
-#include <chrono>
 #include <numeric>
 #include <vector>
 
@@ -9,30 +8,12 @@
 
 namespace {
 
-unsigned long long systemMilliseconds() {
-    using namespace std::chrono;
-    const auto sinceEpoch = system_clock::now().time_since_epoch();
-    return static_cast<unsigned long long>(duration_cast<milliseconds>(sinceEpoch).count());
-}
-
-/// A protocol that reads bits; `device` is their image.
-class BitProtocol : public TestProtocol {
-  public:
-    bool CanReadBitBlock(const ITag*) const override { return true; }
-    int ReadBitBlock(const ITag*, unsigned char* data, int bits) override {
-        bitCounts.push_back(bits);
-        if (readResult != 0) answer(data, static_cast<int>(device.size()));
-        return readResult;
-    }
-    std::vector<int> bitCounts;
-};
-
 class BitsWithoutBlock : public TestProtocol {
   public:
     bool CanReadBitBlock(const ITag*) const override { return true; }
 };
 
-TEST(ProtocolBaseRead, ValueArrivesAtEveryLength) {
+TEST(ProtocolBaseReadTest, ValueArrivesAtEveryLength) {
     for (int length : {1, 2, 63, 64, 65, 255, 256, 257, 5000}) {
         TestProtocol protocol;
         protocol.device.resize(static_cast<std::size_t>(length));
@@ -45,7 +26,7 @@ TEST(ProtocolBaseRead, ValueArrivesAtEveryLength) {
     }
 }
 
-TEST(ProtocolBaseRead, BytesThatTheDeviceDoesNotFillAreZero) {
+TEST(ProtocolBaseReadTest, BytesThatTheDeviceDoesNotFillAreZero) {
     for (int length : {1, 64, 65, 300}) {
         TestProtocol protocol;
         const TestTag tag("1", bytesShape(length));
@@ -55,7 +36,7 @@ TEST(ProtocolBaseRead, BytesThatTheDeviceDoesNotFillAreZero) {
     }
 }
 
-TEST(ProtocolBaseRead, EmptyAndNegativeLengthsTouchNothing) {
+TEST(ProtocolBaseReadTest, EmptyAndNegativeLengthsTouchNothing) {
     for (int length : {0, -1, -65, -2147483647 - 1}) {
         TestProtocol protocol;
         protocol.device = {1, 2, 3};
@@ -67,7 +48,7 @@ TEST(ProtocolBaseRead, EmptyAndNegativeLengthsTouchNothing) {
     }
 }
 
-TEST(ProtocolBaseRead, FailureLeavesTheValueAndKeepsTheDriversError) {
+TEST(ProtocolBaseReadTest, FailureLeavesTheValueAndKeepsTheDriversError) {
     TestProtocol protocol;
     protocol.device = {1};
     protocol.readResult = 0;
@@ -79,7 +60,7 @@ TEST(ProtocolBaseRead, FailureLeavesTheValueAndKeepsTheDriversError) {
     EXPECT_STREQ("nobody answered the read", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseRead, RefusedConversionIsReportedAndLeavesTheValue) {
+TEST(ProtocolBaseReadTest, RefusedConversionIsReportedAndLeavesTheValue) {
     TestProtocol protocol;
     protocol.device = {1, 2, 3};
     TagShape shape = bytesShape(3);
@@ -93,7 +74,7 @@ TEST(ProtocolBaseRead, RefusedConversionIsReportedAndLeavesTheValue) {
         EXPECT_EQ(0xEE, byte);
 }
 
-TEST(ProtocolBaseRead, ConversionsRunInTheReadDirection) {
+TEST(ProtocolBaseReadTest, ConversionsRunInTheReadDirection) {
     TestProtocol protocol;
     protocol.device = {0x34, 0x12};
     const TestTag tag("1", {ICU_Type::unsignedShort, ICU_Type::none, 2, 0, 0, {"bcd"}});
@@ -103,7 +84,7 @@ TEST(ProtocolBaseRead, ConversionsRunInTheReadDirection) {
     EXPECT_EQ(0x04, value[1]);
 }
 
-TEST(ProtocolBaseRead, BitTagsAskForTheirBits) {
+TEST(ProtocolBaseReadTest, BitTagsAskForTheirBits) {
     BitProtocol protocol;
     protocol.device = {0b10101000, 0b00000011};
     const TestTag tag("1", {ICU_Type::booleanArray, ICU_Type::boolean, 7, 0, 3});
@@ -115,7 +96,7 @@ TEST(ProtocolBaseRead, BitTagsAskForTheirBits) {
     EXPECT_EQ(expected, std::vector<unsigned char>(value, value + 7));
 }
 
-TEST(ProtocolBaseRead, SingleBitAsksForOneBit) {
+TEST(ProtocolBaseReadTest, SingleBitAsksForOneBit) {
     BitProtocol protocol;
     protocol.device = {0x80};
     const TestTag tag("1", {ICU_Type::boolean, ICU_Type::none, 1, 0, 7});
@@ -125,7 +106,7 @@ TEST(ProtocolBaseRead, SingleBitAsksForOneBit) {
     EXPECT_EQ(1, value);
 }
 
-TEST(ProtocolBaseRead, OtherTagsInBitMemoryAskForEightBitsAByte) {
+TEST(ProtocolBaseReadTest, OtherTagsInBitMemoryAskForEightBitsAByte) {
     BitProtocol protocol;
     protocol.device = {0x34, 0x12};
     const TestTag tag("1", {ICU_Type::short_, ICU_Type::none, 2});
@@ -136,7 +117,7 @@ TEST(ProtocolBaseRead, OtherTagsInBitMemoryAskForEightBitsAByte) {
     EXPECT_EQ(0x12, value[1]);
 }
 
-TEST(ProtocolBaseRead, BitMemoryWithoutBitReadsFailsAndReadsNoBytes) {
+TEST(ProtocolBaseReadTest, BitMemoryWithoutBitReadsFailsAndReadsNoBytes) {
     BitsWithoutBlock protocol;
     const TestTag tag("1", {ICU_Type::boolean, ICU_Type::none, 1});
     unsigned char value = 0xEE;
@@ -144,90 +125,6 @@ TEST(ProtocolBaseRead, BitMemoryWithoutBitReadsFailsAndReadsNoBytes) {
     EXPECT_EQ(0xEE, value);
     EXPECT_TRUE(protocol.readLengths.empty());
     EXPECT_EQ(1, protocol.GetLastError());
-}
-
-TEST(CurrentTimeStamp, CountsMillisecondsOfTheSystemClock) {
-    const unsigned long long before = systemMilliseconds();
-    const unsigned long long stamp = currentTimeStamp();
-    EXPECT_LE(before, stamp);
-    EXPECT_LE(stamp, systemMilliseconds());
-}
-
-class ProtocolBaseTimestamp : public testing::Test {
-  protected:
-    static constexpr unsigned long long kUnstored = 4711;
-
-    void expectFresh() const {
-        EXPECT_LE(before_, stamp_);
-        EXPECT_LE(stamp_, systemMilliseconds());
-    }
-
-    const unsigned long long before_ = systemMilliseconds();
-    unsigned long long stamp_ = kUnstored;
-    unsigned char data_[4] = {};
-    TestTag tag_{"1", bytesShape(4)};
-};
-
-TEST_F(ProtocolBaseTimestamp, SuccessfulReadsAreStamped) {
-    TestProtocol protocol;
-    protocol.device = {1, 2, 3, 4};
-    EXPECT_NE(protocol.readWithTimestamp(&tag_, data_, &stamp_), 0);
-    expectFresh();
-    EXPECT_EQ(4, data_[3]);
-    stamp_ = kUnstored;
-    EXPECT_NE(protocol.readBlockWithTimestamp(&tag_, data_, 3, &stamp_), 0);
-    expectFresh();
-    EXPECT_EQ((std::vector<int>{4, 3}), protocol.readLengths);
-}
-
-TEST_F(ProtocolBaseTimestamp, SuccessfulBitReadIsStamped) {
-    BitProtocol protocol;
-    protocol.device = {0x05};
-    EXPECT_NE(protocol.readBitBlockWithTimestamp(&tag_, data_, 3, &stamp_), 0);
-    expectFresh();
-    EXPECT_EQ(std::vector<int>{3}, protocol.bitCounts);
-    EXPECT_EQ(0x05, data_[0]);
-}
-
-TEST_F(ProtocolBaseTimestamp, FailedReadsStoreNoStamp) {
-    BitProtocol protocol;
-    protocol.readResult = 0;
-    EXPECT_EQ(0, protocol.readWithTimestamp(&tag_, data_, &stamp_));
-    EXPECT_EQ(0, protocol.readBlockWithTimestamp(&tag_, data_, 4, &stamp_));
-    EXPECT_EQ(0, protocol.readBitBlockWithTimestamp(&tag_, data_, 4, &stamp_));
-    EXPECT_EQ(kUnstored, stamp_);
-}
-
-TEST_F(ProtocolBaseTimestamp, BitReadFailsWhereThereAreNoBitReads) {
-    TestProtocol protocol;
-    EXPECT_EQ(0, protocol.readBitBlockWithTimestamp(&tag_, data_, 4, &stamp_));
-    EXPECT_EQ(kUnstored, stamp_);
-    EXPECT_EQ(1, protocol.GetLastError());
-}
-
-TEST_F(ProtocolBaseTimestamp, RefusedConversionStoresNoStamp) {
-    TestProtocol protocol;
-    TagShape shape = bytesShape(3);
-    shape.conversions = {"swap2"};
-    const TestTag odd("1", shape);
-    EXPECT_EQ(0, protocol.readWithTimestamp(&odd, data_, &stamp_));
-    EXPECT_EQ(kUnstored, stamp_);
-    EXPECT_EQ(-9, protocol.GetLastError());
-}
-
-TEST_F(ProtocolBaseTimestamp, ReadOfADerivedProtocolIsTheOneThatIsStamped) {
-    class OwnRead : public TestProtocol {
-      public:
-        int Read(const ITag*, unsigned char* value) override {
-            value[0] = 0x42;
-            return 1;
-        }
-    };
-    OwnRead protocol;
-    EXPECT_NE(protocol.readWithTimestamp(&tag_, data_, &stamp_), 0);
-    expectFresh();
-    EXPECT_EQ(0x42, data_[0]);
-    EXPECT_TRUE(protocol.readLengths.empty());
 }
 
 }  // namespace

@@ -9,7 +9,7 @@
 
 namespace {
 
-TEST(ProtocolBaseIdentity, EveryGenerationOfTheFamilyIsTheSameObject) {
+TEST(ProtocolBaseTest, EveryGenerationOfTheFamilyIsTheSameObject) {
     TestProtocol protocol;
     for (const char* face : {"ProtocolBase", "IProtocol7", "IProtocol6", "IProtocol5", "IProtocol4",
                              "IProtocol3", "IProtocol2", "IProtocol"}) {
@@ -17,7 +17,7 @@ TEST(ProtocolBaseIdentity, EveryGenerationOfTheFamilyIsTheSameObject) {
     }
 }
 
-TEST(ProtocolBaseIdentity, OtherNamesConvertToNothing) {
+TEST(ProtocolBaseTest, OtherNamesConvertToNothing) {
     TestProtocol protocol;
     for (const char* face : {"IProtocol1", "IProtocol8", "iprotocol", "IProtocol ", " IProtocol",
                              "IInterface", "ProtgenProtocol", "TestProtocol", ""}) {
@@ -26,7 +26,7 @@ TEST(ProtocolBaseIdentity, OtherNamesConvertToNothing) {
     EXPECT_EQ(nullptr, protocol.ConvertTo(nullptr));
 }
 
-TEST(ProtocolBaseIdentity, IdentIsTheProtocolNameUntilOneIsSet) {
+TEST(ProtocolBaseTest, IdentIsTheProtocolNameUntilOneIsSet) {
     TestProtocol protocol;
     EXPECT_STREQ("TEST", protocol.GetIdent());
     protocol.SetIdent("line 2");
@@ -35,7 +35,7 @@ TEST(ProtocolBaseIdentity, IdentIsTheProtocolNameUntilOneIsSet) {
     EXPECT_STREQ("TEST", protocol.GetIdent());
 }
 
-TEST(ProtocolBaseIdentity, IdentIsACopyAndANullOneIsEmpty) {
+TEST(ProtocolBaseTest, IdentIsACopyAndANullOneIsEmpty) {
     TestProtocol protocol;
     std::string ident = "panel";
     protocol.SetIdent(ident.c_str());
@@ -45,19 +45,19 @@ TEST(ProtocolBaseIdentity, IdentIsACopyAndANullOneIsEmpty) {
     EXPECT_STREQ("TEST", protocol.GetIdent());
 }
 
-TEST(ProtocolBaseIdentity, NextInstanceHasTheSameName) {
+TEST(ProtocolBaseTest, NextInstanceHasTheSameName) {
     TestProtocol protocol;
     protocol.SetIdent("line 2");
     EXPECT_STREQ("TEST", protocol.GetNextInstanceName());
 }
 
-TEST(ProtocolBaseErrors, NewObjectHasCodeOneAndNoText) {
+TEST(ProtocolBaseTest, NewObjectHasCodeOneAndNoText) {
     const TestProtocol protocol;
     EXPECT_EQ(1, protocol.GetLastError());
     EXPECT_STREQ("", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseErrors, LastFailureReplacesTheOneBefore) {
+TEST(ProtocolBaseTest, LastFailureReplacesTheOneBefore) {
     TestProtocol protocol;
     protocol.SetError(-4, "no response");
     protocol.SetError(-6, "bad reply");
@@ -65,7 +65,7 @@ TEST(ProtocolBaseErrors, LastFailureReplacesTheOneBefore) {
     EXPECT_STREQ("bad reply", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseErrors, SuccessLeavesTheLastFailureInPlace) {
+TEST(ProtocolBaseTest, SuccessLeavesTheLastFailureInPlace) {
     TestProtocol protocol;
     protocol.SetError(-4, "no response");
     const TestTag tag("1", bytesShape(1));
@@ -75,7 +75,7 @@ TEST(ProtocolBaseErrors, SuccessLeavesTheLastFailureInPlace) {
     EXPECT_STREQ("no response", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseErrors, TextIsACopyAndANullOneIsEmpty) {
+TEST(ProtocolBaseTest, TextIsACopyAndANullOneIsEmpty) {
     TestProtocol protocol;
     std::string text = "first";
     protocol.SetError(-1, text.c_str());
@@ -86,21 +86,21 @@ TEST(ProtocolBaseErrors, TextIsACopyAndANullOneIsEmpty) {
     EXPECT_STREQ("", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseErrors, OwnTextMayBeSetAgain) {
+TEST(ProtocolBaseTest, OwnTextMayBeSetAgain) {
     TestProtocol protocol;
     protocol.SetError(-4, "no response");
     protocol.SetError(-6, protocol.GetLastErrorString());
     EXPECT_STREQ("no response", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseErrors, LongTextIsKeptWhole) {
+TEST(ProtocolBaseTest, LongTextIsKeptWhole) {
     TestProtocol protocol;
     const std::string text(5000, 'x');
     protocol.SetError(-1, text.c_str());
     EXPECT_EQ(text, protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseErrors, TagErrorNamesTheUriAndTheTagsOwnText) {
+TEST(ProtocolBaseTest, TagErrorNamesTheUriAndTheTagsOwnText) {
     TestProtocol protocol;
     const TestTag tag("1?HREG?400001?nonsense", bytesShape(1));
     tag.SetError("unknown data type");
@@ -111,7 +111,7 @@ TEST(ProtocolBaseErrors, TagErrorNamesTheUriAndTheTagsOwnText) {
                  protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseErrors, TagErrorOfATagWithoutUriLeavesItsPlaceEmpty) {
+TEST(ProtocolBaseTest, TagErrorOfATagWithoutUriLeavesItsPlaceEmpty) {
     TestProtocol protocol;
     TestTag tag("1", bytesShape(1));
     tag.forgetUri();
@@ -120,14 +120,14 @@ TEST(ProtocolBaseErrors, TagErrorOfATagWithoutUriLeavesItsPlaceEmpty) {
     EXPECT_STREQ("Tag URI error:  - broken", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseTags, UnknownUriGivesNoTagAndTheDriversError) {
+TEST(ProtocolBaseTest, UnknownUriGivesNoTagAndTheDriversError) {
     TestProtocol protocol;
     EXPECT_EQ(nullptr, protocol.CreateTag("nowhere"));
     EXPECT_EQ(-1, protocol.GetLastError());
     EXPECT_STREQ("Tag URI error: no such tag", protocol.GetLastErrorString());
 }
 
-TEST(ProtocolBaseTags, FreedTagIsDestroyedOnceAndNotAgainWithTheObject) {
+TEST(ProtocolBaseTest, FreedTagIsDestroyedOnceAndNotAgainWithTheObject) {
     int destroyed = 0;
     {
         TestProtocol protocol;
@@ -153,7 +153,7 @@ class OutlivedProtocol : public TestProtocol {
     int* destroyed_;
 };
 
-TEST(ProtocolBaseTags, TagsStillHeldDieWithTheObjectEachOnce) {
+TEST(ProtocolBaseTest, TagsStillHeldDieWithTheObjectEachOnce) {
     int destroyed = 0;
     {
         OutlivedProtocol protocol(&destroyed);
@@ -166,7 +166,7 @@ TEST(ProtocolBaseTags, TagsStillHeldDieWithTheObjectEachOnce) {
     EXPECT_EQ(3, destroyed);
 }
 
-TEST(ProtocolBaseTags, DeletedTagsAreDestroyedOnceAndTheObjectGoesOn) {
+TEST(ProtocolBaseTest, DeletedTagsAreDestroyedOnceAndTheObjectGoesOn) {
     int destroyed = 0;
     {
         OutlivedProtocol protocol(&destroyed);
@@ -181,7 +181,7 @@ TEST(ProtocolBaseTags, DeletedTagsAreDestroyedOnceAndTheObjectGoesOn) {
     EXPECT_EQ(3, destroyed);
 }
 
-TEST(ProtocolBaseTags, TagsMayBeFreedAfterStopping) {
+TEST(ProtocolBaseTest, TagsMayBeFreedAfterStopping) {
     int destroyed = 0;
     OutlivedProtocol protocol(&destroyed);
     ITag* tag = protocol.CreateTag("a");
@@ -192,7 +192,7 @@ TEST(ProtocolBaseTags, TagsMayBeFreedAfterStopping) {
     EXPECT_EQ(1, destroyed);
 }
 
-TEST(ProtocolBaseTags, FreeingNothingIsHarmless) {
+TEST(ProtocolBaseTest, FreeingNothingIsHarmless) {
     int destroyed = 0;
     OutlivedProtocol protocol(&destroyed);
     protocol.CreateTag("a");
@@ -200,7 +200,7 @@ TEST(ProtocolBaseTags, FreeingNothingIsHarmless) {
     EXPECT_EQ(0, destroyed);
 }
 
-TEST(ProtocolBaseTags, CloneIsDestroyedByFreeTagWithoutTouchingTheOriginal) {
+TEST(ProtocolBaseTest, CloneIsDestroyedByFreeTagWithoutTouchingTheOriginal) {
     int destroyed = 0;
     {
         OutlivedProtocol protocol(&destroyed);

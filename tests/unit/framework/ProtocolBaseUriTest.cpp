@@ -15,7 +15,7 @@ class NamedFields : public TestProtocol {
     }
 };
 
-TEST(ProtocolBaseUri, ProtocolWithoutNamesHasNoFields) {
+TEST(ProtocolBaseUriTest, ProtocolWithoutNamesHasNoFields) {
     const TestProtocol protocol;
     ASSERT_NE(protocol.tagUriNames(), nullptr);
     EXPECT_EQ(nullptr, protocol.tagUriNames()[0]);
@@ -24,7 +24,7 @@ TEST(ProtocolBaseUri, ProtocolWithoutNamesHasNoFields) {
     EXPECT_EQ(-1, protocol.getTagUriFieldPosition("nodeid"));
 }
 
-TEST(ProtocolBaseUri, FieldNamesEndAtTheirCount) {
+TEST(ProtocolBaseUriTest, FieldNamesEndAtTheirCount) {
     const NamedFields protocol;
     EXPECT_EQ(3, protocol.getTagUriFieldCount());
     EXPECT_STREQ("nodeid", protocol.getTagUriFieldName(0));
@@ -34,7 +34,7 @@ TEST(ProtocolBaseUri, FieldNamesEndAtTheirCount) {
         EXPECT_EQ(nullptr, protocol.getTagUriFieldName(index)) << index;
 }
 
-TEST(ProtocolBaseUri, FieldPositionsComeFromExactNames) {
+TEST(ProtocolBaseUriTest, FieldPositionsComeFromExactNames) {
     const NamedFields protocol;
     const std::pair<const char*, int> rows[] = {
         {"nodeid", 0}, {"area", 1},     {"offset", 2}, {"Area", -1},  {"area ", -1},
@@ -50,7 +50,7 @@ struct UriRow {
     const char* field;  ///< Null: there is none.
 };
 
-TEST(ProtocolBaseUri, FieldsAreCutAtEveryQuestionMark) {
+TEST(ProtocolBaseUriTest, FieldsAreCutAtEveryQuestionMark) {
     const UriRow rows[] = {
         {"1?HREG?400001", 0, "1"},
         {"1?HREG?400001", 1, "HREG"},
@@ -85,7 +85,7 @@ TEST(ProtocolBaseUri, FieldsAreCutAtEveryQuestionMark) {
     }
 }
 
-TEST(ProtocolBaseUri, FieldPointsIntoTheTagsOwnText) {
+TEST(ProtocolBaseUriTest, FieldPointsIntoTheTagsOwnText) {
     const NamedFields protocol;
     const TestTag tag("1?HREG?400001", bytesShape(1));
     int length = 0;
@@ -93,7 +93,7 @@ TEST(ProtocolBaseUri, FieldPointsIntoTheTagsOwnText) {
     EXPECT_EQ(4, length);
 }
 
-TEST(ProtocolBaseUri, TagWithoutUriHasNoFields) {
+TEST(ProtocolBaseUriTest, TagWithoutUriHasNoFields) {
     const NamedFields protocol;
     TestTag tag("1?HREG", bytesShape(1));
     tag.forgetUri();

@@ -11,23 +11,23 @@ namespace {
 
 using Pairs = std::vector<std::pair<int, int>>;
 
-class ReplacerAddress : public ReplacerTest {
+class ReplacerAddressTest : public ReplacerTest {
   protected:
     AddressReplacerID replacer_;
 };
 
-TEST_F(ReplacerAddress, KeysBeginWithTheirPrefix) {
+TEST_F(ReplacerAddressTest, KeysBeginWithTheirPrefix) {
     EXPECT_EQ("tempNode", replacer_.getPrefix());
 }
 
-TEST_F(ReplacerAddress, AddressesAreWrittenInDecimal) {
+TEST_F(ReplacerAddressTest, AddressesAreWrittenInDecimal) {
     EXPECT_EQ("0", replacer_.toString(0));
     EXPECT_EQ("247", replacer_.toString(247));
     EXPECT_EQ("-5", replacer_.toString(-5));
     EXPECT_EQ("-2147483648", replacer_.toString(std::numeric_limits<int>::min()));
 }
 
-TEST_F(ReplacerAddress, TextsAreReadWithAutomaticBase) {
+TEST_F(ReplacerAddressTest, TextsAreReadWithAutomaticBase) {
     const std::pair<const char*, int> rows[] = {
         {"12", 12},
         {"0x1F", 31},
@@ -49,7 +49,7 @@ TEST_F(ReplacerAddress, TextsAreReadWithAutomaticBase) {
         EXPECT_EQ(value, replacer_.fromString(text)) << text;
 }
 
-TEST_F(ReplacerAddress, UnlistedAddressesStandForThemselves) {
+TEST_F(ReplacerAddressTest, UnlistedAddressesStandForThemselves) {
     EXPECT_EQ(5, replacer_.replacementOf(5));
     replacer_.setValue(5, 9, nullptr);
     EXPECT_EQ(9, replacer_.replacementOf(5));
@@ -57,14 +57,14 @@ TEST_F(ReplacerAddress, UnlistedAddressesStandForThemselves) {
     EXPECT_EQ(6, replacer_.replacementOf(6));
 }
 
-TEST_F(ReplacerAddress, OverrideIsRecordedAndPersisted) {
+TEST_F(ReplacerAddressTest, OverrideIsRecordedAndPersisted) {
     replacer_.setValue(12, 7, "MRTU");
     EXPECT_EQ((Pairs{{12, 7}}), replacer_.replacements());
     EXPECT_EQ(std::vector<std::string>{"writeString(MRTU, tempNode12, 7)"}, storage_.calls());
     EXPECT_EQ("text:7", stored("tempNode12"));
 }
 
-TEST_F(ReplacerAddress, PairsStandInOrderOfInsertionOneForEachAddress) {
+TEST_F(ReplacerAddressTest, PairsStandInOrderOfInsertionOneForEachAddress) {
     replacer_.setValue(9, 1, "MRTU");
     replacer_.setValue(3, 2, "MRTU");
     replacer_.setValue(9, 4, "MRTU");
@@ -73,7 +73,7 @@ TEST_F(ReplacerAddress, PairsStandInOrderOfInsertionOneForEachAddress) {
     EXPECT_EQ("text:4", stored("tempNode9"));
 }
 
-TEST_F(ReplacerAddress, ReplacingAnAddressByItselfRemovesTheKeyAndKeepsThePair) {
+TEST_F(ReplacerAddressTest, ReplacingAnAddressByItselfRemovesTheKeyAndKeepsThePair) {
     replacer_.setValue(7, 9, "MRTU");
     ASSERT_EQ("text:9", stored("tempNode7"));
     replacer_.setValue(7, 7, "MRTU");
@@ -82,20 +82,20 @@ TEST_F(ReplacerAddress, ReplacingAnAddressByItselfRemovesTheKeyAndKeepsThePair) 
     EXPECT_EQ(1, storage_.count("removeKey"));
 }
 
-TEST_F(ReplacerAddress, ReplacingANewAddressByItselfIsListedToo) {
+TEST_F(ReplacerAddressTest, ReplacingANewAddressByItselfIsListedToo) {
     replacer_.setValue(5, 5, "MRTU");
     EXPECT_EQ((Pairs{{5, 5}}), replacer_.replacements());
     EXPECT_EQ(std::vector<std::string>{"removeKey(MRTU, tempNode5)"}, storage_.calls());
 }
 
-TEST_F(ReplacerAddress, WithoutSectionTheOverrideLivesInMemoryOnly) {
+TEST_F(ReplacerAddressTest, WithoutSectionTheOverrideLivesInMemoryOnly) {
     replacer_.setValue(5, 9, nullptr);
     replacer_.setValue(6, 6, nullptr);
     EXPECT_EQ((Pairs{{5, 9}, {6, 6}}), replacer_.replacements());
     EXPECT_TRUE(storage_.calls().empty());
 }
 
-TEST_F(ReplacerAddress, WithoutStorageTheOverrideLivesInMemoryOnly) {
+TEST_F(ReplacerAddressTest, WithoutStorageTheOverrideLivesInMemoryOnly) {
     useNoStorage();
     replacer_.setValue(5, 9, "MRTU");
     replacer_.setValue(6, 6, "MRTU");

@@ -6,10 +6,10 @@
 
 namespace {
 
-using ReplacerAllocation = ReplacerTest;
+using ReplacerAllocationTest = ReplacerTest;
 using testing_support::AllocationCounter;
 
-TEST_F(ReplacerAllocation, CachedParametersAreFoundWithoutTheHeap) {
+TEST_F(ReplacerAllocationTest, CachedParametersAreFoundWithoutTheHeap) {
     ParameterReplacer replacer;
     replacer.setSection("MRTU");
     int baud = 0;
@@ -32,7 +32,7 @@ TEST_F(ReplacerAllocation, CachedParametersAreFoundWithoutTheHeap) {
     EXPECT_EQ(9600, baud);
 }
 
-TEST_F(ReplacerAllocation, ReplacedAddressesAreFoundWithoutTheHeap) {
+TEST_F(ReplacerAllocationTest, ReplacedAddressesAreFoundWithoutTheHeap) {
     AddressReplacerID replacer;
     for (int node = 1; node < 248; ++node)
         replacer.setValue(node, node + 1, nullptr);

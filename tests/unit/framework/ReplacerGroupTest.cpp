@@ -8,14 +8,14 @@
 
 namespace {
 
-TEST(ReplacerGroup, NothingStagedLeavesTheOutputUntouched) {
+TEST(ReplacerGroupTest, NothingStagedLeavesTheOutputUntouched) {
     const GroupParameterReplacer staging;
     int value = 4711;
     EXPECT_FALSE(staging.get("baud", -1, value));
     EXPECT_EQ(4711, value);
 }
 
-TEST(ReplacerGroup, StagedValueIsRead) {
+TEST(ReplacerGroupTest, StagedValueIsRead) {
     GroupParameterReplacer staging;
     staging.set("baud", -1, 38400);
     int value = 0;
@@ -23,7 +23,7 @@ TEST(ReplacerGroup, StagedValueIsRead) {
     EXPECT_EQ(38400, value);
 }
 
-TEST(ReplacerGroup, LaterValueReplacesTheEarlier) {
+TEST(ReplacerGroupTest, LaterValueReplacesTheEarlier) {
     GroupParameterReplacer staging;
     staging.set("baud", -1, 38400);
     staging.set("baud", -1, 1200);
@@ -33,7 +33,7 @@ TEST(ReplacerGroup, LaterValueReplacesTheEarlier) {
     EXPECT_EQ(1u, staging.staged().size());
 }
 
-TEST(ReplacerGroup, GroupStandsBehindTheNameWithoutSeparator) {
+TEST(ReplacerGroupTest, GroupStandsBehindTheNameWithoutSeparator) {
     GroupParameterReplacer staging;
     staging.set("baud", 3, 1200);
     ASSERT_EQ(1u, staging.staged().count("baud3"));
@@ -47,7 +47,7 @@ TEST(ReplacerGroup, GroupStandsBehindTheNameWithoutSeparator) {
     EXPECT_EQ(4711, value);
 }
 
-TEST(ReplacerGroup, EntryKeepsThePlainNameAndTheGroup) {
+TEST(ReplacerGroupTest, EntryKeepsThePlainNameAndTheGroup) {
     GroupParameterReplacer staging;
     staging.set("stop", 12, 2);
     staging.set("mode", -1, 1);
@@ -62,7 +62,7 @@ TEST(ReplacerGroup, EntryKeepsThePlainNameAndTheGroup) {
     EXPECT_EQ(-1, staging.staged().at("mode").group);
 }
 
-TEST(ReplacerGroup, EntriesStandInKeyOrder) {
+TEST(ReplacerGroupTest, EntriesStandInKeyOrder) {
     GroupParameterReplacer staging;
     for (const char* name : {"stop", "baud", "parity", "mode", "Baud"})
         staging.set(name, -1, 1);

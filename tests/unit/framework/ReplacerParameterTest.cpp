@@ -7,9 +7,9 @@
 
 namespace {
 
-class ReplacerParameter : public ReplacerTest {
+class ReplacerParameterTest : public ReplacerTest {
   protected:
-    ReplacerParameter() { replacer_.setSection("MRTU"); }
+    ReplacerParameterTest() { replacer_.setSection("MRTU"); }
 
     int number(const std::string& name, int fallback, int node = -1) {
         int value = -12345;
@@ -34,7 +34,7 @@ class ReplacerParameter : public ReplacerTest {
     ParameterReplacer replacer_;
 };
 
-TEST_F(ReplacerParameter, FullNameCarriesTheNodeUnlessItIsMinusOne) {
+TEST_F(ReplacerParameterTest, FullNameCarriesTheNodeUnlessItIsMinusOne) {
     struct Row {
         const char* name;
         int node;
@@ -55,7 +55,7 @@ TEST_F(ReplacerParameter, FullNameCarriesTheNodeUnlessItIsMinusOne) {
         EXPECT_EQ(row.full, ParameterReplacer::makeFullName(row.name, row.node));
 }
 
-TEST_F(ReplacerParameter, NewVariantIsAFalseBoolean) {
+TEST_F(ReplacerParameterTest, NewVariantIsAFalseBoolean) {
     const ParameterReplacer::Variant value;
     EXPECT_EQ(0, value.type);
     EXPECT_FALSE(value.boolValue);
@@ -63,25 +63,25 @@ TEST_F(ReplacerParameter, NewVariantIsAFalseBoolean) {
     EXPECT_EQ("", value.stringValue);
 }
 
-TEST_F(ReplacerParameter, SectionIsKept) {
+TEST_F(ReplacerParameterTest, SectionIsKept) {
     EXPECT_EQ("MRTU", replacer_.section());
 }
 
-TEST_F(ReplacerParameter, FirstDefaultDecidesWhereNothingIsStored) {
+TEST_F(ReplacerParameterTest, FirstDefaultDecidesWhereNothingIsStored) {
     EXPECT_EQ(9600, number("baud", 9600));
     EXPECT_EQ(9600, number("baud", 19200));
     EXPECT_TRUE(flag("ModiconMode", 3, true));
     EXPECT_TRUE(flag("ModiconMode", 3, false));
 }
 
-TEST_F(ReplacerParameter, StoredValueWinsOverTheDefault) {
+TEST_F(ReplacerParameterTest, StoredValueWinsOverTheDefault) {
     contents_.put("MRTU", "baud", 38400);
     contents_.put("MRTU", "node3_ModiconMode", false);
     EXPECT_EQ(38400, number("baud", 9600));
     EXPECT_FALSE(flag("ModiconMode", 3, true));
 }
 
-TEST_F(ReplacerParameter, StorageIsConsultedOnce) {
+TEST_F(ReplacerParameterTest, StorageIsConsultedOnce) {
     contents_.put("MRTU", "baud", 38400);
     EXPECT_EQ(38400, number("baud", 9600));
     contents_.put("MRTU", "baud", 1200);
@@ -90,7 +90,7 @@ TEST_F(ReplacerParameter, StorageIsConsultedOnce) {
     EXPECT_TRUE(storage_.calls().empty());
 }
 
-TEST_F(ReplacerParameter, MissingKeyIsAskedForOnceAndNotRead) {
+TEST_F(ReplacerParameterTest, MissingKeyIsAskedForOnceAndNotRead) {
     EXPECT_EQ(2, number("stop", 2));
     const std::vector<std::string> calls{"hasKey(MRTU, stop)"};
     EXPECT_EQ(calls, storage_.calls());
@@ -99,7 +99,7 @@ TEST_F(ReplacerParameter, MissingKeyIsAskedForOnceAndNotRead) {
     EXPECT_EQ(calls, storage_.calls());
 }
 
-TEST_F(ReplacerParameter, EachFormReadsItsOwnType) {
+TEST_F(ReplacerParameterTest, EachFormReadsItsOwnType) {
     contents_.put("MRTU", "baud", 38400);
     contents_.put("MRTU", "node5_ModiconMode", true);
     number("baud", 9600);
@@ -110,14 +110,14 @@ TEST_F(ReplacerParameter, EachFormReadsItsOwnType) {
               storage_.calls());
 }
 
-TEST_F(ReplacerParameter, NodesHaveValuesOfTheirOwn) {
+TEST_F(ReplacerParameterTest, NodesHaveValuesOfTheirOwn) {
     EXPECT_TRUE(flag("ModiconMode", 1, true));
     EXPECT_FALSE(flag("ModiconMode", 2, false));
     EXPECT_FALSE(flag("ModiconMode", -1, false));
     EXPECT_TRUE(flag("ModiconMode", 1, false));
 }
 
-TEST_F(ReplacerParameter, SectionsAreTakenFromTheReplacer) {
+TEST_F(ReplacerParameterTest, SectionsAreTakenFromTheReplacer) {
     contents_.put("other", "baud", 1200);
     EXPECT_EQ(9600, number("baud", 9600));
     ParameterReplacer other;
@@ -127,14 +127,14 @@ TEST_F(ReplacerParameter, SectionsAreTakenFromTheReplacer) {
     EXPECT_EQ(1200, value);
 }
 
-TEST_F(ReplacerParameter, NewSectionKeepsCachedValues) {
+TEST_F(ReplacerParameterTest, NewSectionKeepsCachedValues) {
     EXPECT_EQ(9600, number("baud", 9600));
     contents_.put("other", "baud", 1200);
     replacer_.setSection("other");
     EXPECT_EQ(9600, number("baud", 300));
 }
 
-TEST_F(ReplacerParameter, WithoutStorageDefaultsAreCached) {
+TEST_F(ReplacerParameterTest, WithoutStorageDefaultsAreCached) {
     useNoStorage();
     EXPECT_EQ(9600, number("baud", 9600));
     piPermanentStorage = &storage_;
@@ -142,7 +142,7 @@ TEST_F(ReplacerParameter, WithoutStorageDefaultsAreCached) {
     EXPECT_EQ(9600, number("baud", 300));
 }
 
-TEST_F(ReplacerParameter, ExplicitValueReplacesTheCachedOneInMemoryOnly) {
+TEST_F(ReplacerParameterTest, ExplicitValueReplacesTheCachedOneInMemoryOnly) {
     EXPECT_EQ(9600, number("baud", 9600));
     storage_.forget();
     replacer_.set("baud", ofType(ParameterReplacer::integer));
@@ -150,13 +150,13 @@ TEST_F(ReplacerParameter, ExplicitValueReplacesTheCachedOneInMemoryOnly) {
     EXPECT_TRUE(storage_.calls().empty());
 }
 
-TEST_F(ReplacerParameter, ExplicitValueComesBeforeTheFirstLookUp) {
+TEST_F(ReplacerParameterTest, ExplicitValueComesBeforeTheFirstLookUp) {
     contents_.put("MRTU", "node3_ModiconMode", false);
     replacer_.set("node3_ModiconMode", ofType(ParameterReplacer::boolean));
     EXPECT_TRUE(flag("ModiconMode", 3, false));
 }
 
-TEST_F(ReplacerParameter, EachFormTakesItsOwnFieldOfAnEntry) {
+TEST_F(ReplacerParameterTest, EachFormTakesItsOwnFieldOfAnEntry) {
     ParameterReplacer::Variant value;
     value.type = ParameterReplacer::boolean;
     value.boolValue = true;
@@ -165,7 +165,7 @@ TEST_F(ReplacerParameter, EachFormTakesItsOwnFieldOfAnEntry) {
     EXPECT_TRUE(flag("mixed", -1, false));
 }
 
-TEST_F(ReplacerParameter, ValuesArePersistedByType) {
+TEST_F(ReplacerParameterTest, ValuesArePersistedByType) {
     replacer_.persist("flag", ofType(ParameterReplacer::boolean));
     replacer_.persist("number", ofType(ParameterReplacer::integer));
     replacer_.persist("name", ofType(ParameterReplacer::text));
@@ -175,26 +175,26 @@ TEST_F(ReplacerParameter, ValuesArePersistedByType) {
     EXPECT_EQ(3u, storage_.calls().size());
 }
 
-TEST_F(ReplacerParameter, OtherTypesAreNotPersisted) {
+TEST_F(ReplacerParameterTest, OtherTypesAreNotPersisted) {
     for (int type : {-1, 3, 99})
         replacer_.persist("odd", ofType(type));
     EXPECT_TRUE(storage_.calls().empty());
 }
 
-TEST_F(ReplacerParameter, PersistedValueIsNotCached) {
+TEST_F(ReplacerParameterTest, PersistedValueIsNotCached) {
     replacer_.persist("baud", ofType(ParameterReplacer::integer));
     EXPECT_EQ(42, number("baud", 9600));  // found in the storage at the first look-up
     replacer_.persist("baud", ofType(ParameterReplacer::text));
     EXPECT_EQ(42, number("baud", 9600));
 }
 
-TEST_F(ReplacerParameter, PersistingWithoutStorageIsHarmless) {
+TEST_F(ReplacerParameterTest, PersistingWithoutStorageIsHarmless) {
     useNoStorage();
     replacer_.persist("baud", ofType(ParameterReplacer::integer));
     EXPECT_EQ("none", stored("baud"));
 }
 
-TEST_F(ReplacerParameter, NamesOfAnyLengthAreKeptApart) {
+TEST_F(ReplacerParameterTest, NamesOfAnyLengthAreKeptApart) {
     for (std::size_t length : {1u, 111u, 112u, 113u, 128u, 500u}) {
         const std::string name(length, 'n');
         contents_.put("MRTU", "node-2147483648_" + name, static_cast<int>(length));
@@ -204,7 +204,7 @@ TEST_F(ReplacerParameter, NamesOfAnyLengthAreKeptApart) {
     }
 }
 
-TEST_F(ReplacerParameter, PlainStorageServesAsWell) {
+TEST_F(ReplacerParameterTest, PlainStorageServesAsWell) {
     usePlainStorage();
     contents_.put("MRTU", "baud", 38400);
     EXPECT_EQ(38400, number("baud", 9600));

@@ -29,21 +29,21 @@ Bytes Convert(const ITag& tag, const Bytes& src, bool toDevice, Bytes dst) {
     return dst;
 }
 
-TEST(TagBase, IsReadAndWritable) {
+TEST(TagBaseTest, IsReadAndWritable) {
     const ValueTag tag("int");
     EXPECT_FALSE(tag.IsReadOnly());
     EXPECT_FALSE(tag.IsWriteOnly());
     EXPECT_STREQ("", tag.GetError());
 }
 
-TEST(TagBase, KeepsAnErrorTextThoughConstant) {
+TEST(TagBaseTest, KeepsAnErrorTextThoughConstant) {
     const ValueTag tag("int");
     tag.SetError("first");
     tag.SetError("second");
     EXPECT_STREQ("second", tag.GetError());
 }
 
-TEST(PackedLen, IsTheLengthExceptForBits) {
+TEST(TagBaseTest, PackedLenIsTheLengthExceptForBits) {
     struct Row {
         const char* type;
         int bitIndex;
@@ -59,24 +59,24 @@ TEST(PackedLen, IsTheLengthExceptForBits) {
     }
 }
 
-TEST(Convert, CopiesBytesWithoutConversions) {
+TEST(TagBaseTest, ConvertCopiesBytesWithoutConversions) {
     const ValueTag tag("int");
     EXPECT_EQ((Bytes{1, 2, 3, 4, 0xEE}), Convert(tag, {1, 2, 3, 4}, kRead, Bytes(5, 0xEE)));
     EXPECT_EQ((Bytes{1, 2, 3, 4, 0xEE}), Convert(tag, {1, 2, 3, 4}, kWrite, Bytes(5, 0xEE)));
 }
 
-TEST(Convert, UnpacksBitsOnARead) {
+TEST(TagBaseTest, ConvertUnpacksBitsOnARead) {
     const ValueTag tag("boolean-5", 0, 6);
     EXPECT_EQ((Bytes{1, 0, 1, 0, 1, 0xEE}), Convert(tag, {0x40, 0x05}, kRead, Bytes(6, 0xEE)));
 }
 
-TEST(Convert, LeavesOtherBitsOnAWrite) {
+TEST(TagBaseTest, ConvertLeavesOtherBitsOnAWrite) {
     const ValueTag tag("boolean-3", 0, 6);
     EXPECT_EQ((Bytes{0x40, 0x01}), Convert(tag, {1, 0, 9}, kWrite, {0x00, 0x00}));
     EXPECT_EQ((Bytes{0x7F, 0xFF}), Convert(tag, {1, 0, 9}, kWrite, {0xFF, 0xFF}));
 }
 
-TEST(Convert, InvertsBits) {
+TEST(TagBaseTest, ConvertInvertsBits) {
     const ValueTag tag("boolean-3(inv)");
     EXPECT_EQ((Bytes{0, 1, 0}), Convert(tag, {0x05}, kRead, Bytes(3, 0xEE)));
     EXPECT_EQ((Bytes{0xFA}), Convert(tag, {1, 0, 1}, kWrite, {0xF8}));
@@ -96,19 +96,19 @@ class RecordingTag : public ValueTag {
     mutable std::string calls_;
 };
 
-TEST(Convert, GoesThroughTheListBackwardsOnARead) {
+TEST(TagBaseTest, ConvertGoesThroughTheListBackwardsOnARead) {
     const RecordingTag tag("int(swap2,swap4)");
     EXPECT_EQ((Bytes{3, 4, 1, 2}), Convert(tag, {1, 2, 3, 4}, kRead, Bytes(4)));
     EXPECT_EQ("<swap4<swap2", tag.calls());
 }
 
-TEST(Convert, GoesThroughTheListForwardsOnAWrite) {
+TEST(TagBaseTest, ConvertGoesThroughTheListForwardsOnAWrite) {
     const RecordingTag tag("short(bcd,swap2)");
     EXPECT_EQ((Bytes{0x12, 0x34}), Convert(tag, {0xD2, 0x04}, kWrite, Bytes(2)));
     EXPECT_EQ(">bcd>swap2", tag.calls());
 }
 
-TEST(Convert, ReadsBackWhatItWrote) {
+TEST(TagBaseTest, ConvertReadsBackWhatItWrote) {
     const ValueTag tag("unsignedShort-2(bcd,swapnibble,swap4)");
     const Bytes value = {0xD2, 0x04, 0x2E, 0x16};
     const Bytes device = Convert(tag, value, kWrite, Bytes(4));
@@ -116,7 +116,7 @@ TEST(Convert, ReadsBackWhatItWrote) {
     EXPECT_EQ(value, Convert(tag, device, kRead, Bytes(4)));
 }
 
-TEST(Convert, NamesTheConversionThatFailsAndLeavesTheDestination) {
+TEST(TagBaseTest, ConvertNamesTheConversionThatFailsAndLeavesTheDestination) {
     struct Row {
         const char* type;
         Bytes src;
@@ -150,7 +150,7 @@ TEST(Convert, NamesTheConversionThatFailsAndLeavesTheDestination) {
     }
 }
 
-TEST(Convert, LeavesTheErrorTextOfAnEarlierFailure) {
+TEST(TagBaseTest, ConvertLeavesTheErrorTextOfAnEarlierFailure) {
     const ValueTag tag("short(bcd)");
     Bytes dst(2);
     EXPECT_FALSE(tag.Convert(Bytes{0x3A, 0x12}.data(), dst.data(), kRead));
@@ -158,7 +158,7 @@ TEST(Convert, LeavesTheErrorTextOfAnEarlierFailure) {
     EXPECT_STREQ("Conversion error at: bcd", tag.GetError());
 }
 
-TEST(Convert, NegatesTheFrontPartOfAnArray) {
+TEST(TagBaseTest, ConvertNegatesTheFrontPartOfAnArray) {
     const ValueTag tag("short-4(neg)");
     EXPECT_EQ((Bytes{0xFF, 0xFF, 0xFF, 0xFF, 1, 0, 1, 0}),
               Convert(tag, {1, 0, 1, 0, 1, 0, 1, 0}, kRead, Bytes(8)));
@@ -166,7 +166,7 @@ TEST(Convert, NegatesTheFrontPartOfAnArray) {
               Convert(ValueTag("string-3(neg)"), {1, 2, 3}, kRead, Bytes(3)));
 }
 
-TEST(Convert, TakesTheItemsOfBinaryForUnsignedBytes) {
+TEST(TagBaseTest, ConvertTakesTheItemsOfBinaryForUnsignedBytes) {
     EXPECT_EQ((Bytes{0xF0, 0x0F}),
               Convert(ValueTag("binary-2(inv)"), {0x0F, 0xF0}, kRead, Bytes(2)));
 }
@@ -181,7 +181,7 @@ class PaddedTag : public ValueTag {
     int packedLen_;
 };
 
-TEST(Convert, FillsALongerDeviceFormWithZeroes) {
+TEST(TagBaseTest, ConvertFillsALongerDeviceFormWithZeroes) {
     const PaddedTag tag("string-3", 4);
     EXPECT_EQ((Bytes{'a', 'b', 'c', 0, 0xEE}),
               Convert(tag, {'a', 'b', 'c'}, kWrite, Bytes(5, 0xEE)));
@@ -189,14 +189,14 @@ TEST(Convert, FillsALongerDeviceFormWithZeroes) {
               Convert(tag, {'a', 'b', 'c', 'd'}, kRead, Bytes(4, 0xEE)));
 }
 
-TEST(Convert, FillsALongerValueWithZeroes) {
+TEST(TagBaseTest, ConvertFillsALongerValueWithZeroes) {
     const PaddedTag tag("string-4", 2);
     EXPECT_EQ((Bytes{'a', 'b', 0, 0, 0xEE}), Convert(tag, {'a', 'b'}, kRead, Bytes(5, 0xEE)));
     EXPECT_EQ((Bytes{'a', 'b', 0xEE}), Convert(tag, {'a', 'b', 'c', 'd'}, kWrite, Bytes(3, 0xEE)));
 }
 
 // On both sides of the size up to which the work is done without the heap.
-TEST(Convert, CarriesValuesOfAnySize) {
+TEST(TagBaseTest, ConvertCarriesValuesOfAnySize) {
     for (const int size : {1, 255, 256, 257, 258, 2000}) {
         const ValueTag tag("byte-" + std::to_string(size) + "(swapnibble)");
         const Bytes value = Counted(static_cast<std::size_t>(size));
@@ -206,7 +206,7 @@ TEST(Convert, CarriesValuesOfAnySize) {
     }
 }
 
-TEST(Convert, CarriesMoreBitsThanTheLocalBuffer) {
+TEST(TagBaseTest, ConvertCarriesMoreBitsThanTheLocalBuffer) {
     const ValueTag tag("boolean-2000", 0, 5);
     Bytes value(2000);
     for (std::size_t i = 0; i < value.size(); ++i)
@@ -215,7 +215,7 @@ TEST(Convert, CarriesMoreBitsThanTheLocalBuffer) {
     EXPECT_EQ(value, Convert(tag, device, kRead, Bytes(2000, 0xEE)));
 }
 
-TEST(Convert, DoesNothingWithoutALength) {
+TEST(TagBaseTest, ConvertDoesNothingWithoutALength) {
     for (const char* type : {"object", "int-0", "int--3", "boolean-0", "boolean--9", "wrong"}) {
         const ValueTag tag(type);
         EXPECT_EQ(Bytes(2, 0x11), Convert(tag, kUntouched, kRead, Bytes(2, 0x11))) << type;
@@ -232,7 +232,7 @@ class ScaledTag : public ValueTag {
     }
 };
 
-TEST(ConvertVariable, IsConvertUnlessATagOverridesIt) {
+TEST(TagBaseTest, ConvertVariableIsConvertUnlessATagOverridesIt) {
     const ScaledTag tag("byte");
     unsigned char dst = 0;
     EXPECT_TRUE(tag.ConvertVariable(nullptr, &dst, kWrite));
@@ -241,7 +241,7 @@ TEST(ConvertVariable, IsConvertUnlessATagOverridesIt) {
     EXPECT_EQ('r', dst);
 }
 
-TEST(Clone, HasConversionsOfItsOwn) {
+TEST(TagBaseTest, CloneHasConversionsOfItsOwn) {
     const std::unique_ptr<ITag> copy(ValueTag("short(swap2)").Clone());
     EXPECT_EQ((Bytes{2, 1}), Convert(*copy, {1, 2}, kRead, Bytes(2)));
 }

@@ -113,3 +113,15 @@ class TestProtocol : public ProtocolBase {
             data[i] = device[static_cast<std::size_t>(i)];
     }
 };
+
+/// A protocol that reads bits; `device` is their image.
+class BitProtocol : public TestProtocol {
+  public:
+    bool CanReadBitBlock(const ITag*) const override { return true; }
+    int ReadBitBlock(const ITag*, unsigned char* data, int bits) override {
+        bitCounts.push_back(bits);
+        if (readResult != 0) answer(data, static_cast<int>(device.size()));
+        return readResult;
+    }
+    std::vector<int> bitCounts;
+};

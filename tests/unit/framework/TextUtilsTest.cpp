@@ -12,7 +12,7 @@ namespace {
 
 using Pieces = std::vector<std::string>;
 
-TEST(Trim, RemovesBlanksAndTabsFromBothEndsOnly) {
+TEST(TextUtilsTest, TrimRemovesBlanksAndTabsFromBothEndsOnly) {
     const std::vector<std::pair<std::string, std::string>> rows = {
         {"", ""},
         {" ", ""},
@@ -33,12 +33,12 @@ TEST(Trim, RemovesBlanksAndTabsFromBothEndsOnly) {
     }
 }
 
-TEST(Trim, KeepsZeroBytes) {
+TEST(TextUtilsTest, TrimKeepsZeroBytes) {
     const std::string text(" a\0b ", 5);
     EXPECT_EQ(std::string("a\0b", 3), ProtUtilsN::GetTrim(text));
 }
 
-TEST(ParseSubstrings, SplitsTrimsAndKeepsEmptyPieces) {
+TEST(TextUtilsTest, ParseSubstringsSplitsTrimsAndKeepsEmptyPieces) {
     const std::vector<std::pair<std::string, Pieces>> rows = {
         {"", {""}},
         {"a", {"a"}},
@@ -55,19 +55,19 @@ TEST(ParseSubstrings, SplitsTrimsAndKeepsEmptyPieces) {
     }
 }
 
-TEST(ParseSubstrings, AppendsToWhatIsThere) {
+TEST(TextUtilsTest, ParseSubstringsAppendsToWhatIsThere) {
     Pieces pieces = {"first"};
     ProtUtilsN::ParseSubstrings("1?HREG?4.0?int", pieces, '?');
     EXPECT_EQ((Pieces{"first", "1", "HREG", "4.0", "int"}), pieces);
 }
 
-TEST(ParseSubstrings, TakesABlankAsDelimiter) {
+TEST(TextUtilsTest, ParseSubstringsTakesABlankAsDelimiter) {
     Pieces pieces;
     ProtUtilsN::ParseSubstrings("a b", pieces, ' ');
     EXPECT_EQ((Pieces{"a", "b"}), pieces);
 }
 
-TEST(GetConfigValue, TakesTheLettersAndDigitsBehindTheFirstKey) {
+TEST(TextUtilsTest, GetConfigValueTakesTheLettersAndDigitsBehindTheFirstKey) {
     struct Row {
         const char* text;
         const char* key;
@@ -91,7 +91,7 @@ TEST(GetConfigValue, TakesTheLettersAndDigitsBehindTheFirstKey) {
     }
 }
 
-TEST(GetConfigValue, LeavesTheValueWhenTheKeyIsMissing) {
+TEST(TextUtilsTest, GetConfigValueLeavesTheValueWhenTheKeyIsMissing) {
     for (const char* text : {"", "baud", "baud 9600", "Baud=9600", "bau=9600"}) {
         std::string value = "before";
         EXPECT_FALSE(ProtUtilsN::GetConfigValue(text, "baud", value)) << text;
@@ -104,7 +104,7 @@ struct NumberRow {
     std::int32_t value;
 };
 
-TEST(ParseInteger, TakesTheBaseFromThePrefix) {
+TEST(TextUtilsTest, ParseIntegerTakesTheBaseFromThePrefix) {
     const NumberRow rows[] = {
         {"0", 0},     {"16", 16}, {"0x10", 16},   {"0X1f", 31}, {"010", 8},    {"12abc", 12},
         {"abc", 0},   {"", 0},    {"  \t42", 42}, {"-5", -5},   {"+5", 5},     {"-0x10", -16},
@@ -116,7 +116,7 @@ TEST(ParseInteger, TakesTheBaseFromThePrefix) {
     }
 }
 
-TEST(ParseInteger, KeepsToThirtyTwoBits) {
+TEST(TextUtilsTest, ParseIntegerKeepsToThirtyTwoBits) {
     const NumberRow rows[] = {
         {"2147483647", INT32_MAX},
         {"2147483648", INT32_MAX},
@@ -132,7 +132,7 @@ TEST(ParseInteger, KeepsToThirtyTwoBits) {
     }
 }
 
-TEST(ParseDecimal, IgnoresPrefixes) {
+TEST(TextUtilsTest, ParseDecimalIgnoresPrefixes) {
     const NumberRow rows[] = {
         {"10", 10},
         {"010", 10},
@@ -149,7 +149,7 @@ TEST(ParseDecimal, IgnoresPrefixes) {
     }
 }
 
-TEST(CharacterClasses, AreThoseOfTheStandardLocale) {
+TEST(TextUtilsTest, CharacterClassesAreThoseOfTheStandardLocale) {
     for (int code = 0; code < 256; ++code) {
         const char c = static_cast<char>(code);
         EXPECT_EQ(std::isspace(code) != 0, ProtUtilsN::IsWhiteSpace(c)) << code;
@@ -164,23 +164,23 @@ std::string CopiedInto(const char* text, int size) {
     return out;
 }
 
-TEST(CopyBounded, PadsWithZeroes) {
+TEST(TextUtilsTest, CopyBoundedPadsWithZeroes) {
     EXPECT_EQ(CopiedInto("ab", 5), std::string("ab\0\0\0###", 8));
     EXPECT_EQ(CopiedInto("", 2), std::string("\0\0######", 8));
 }
 
-TEST(CopyBounded, LeavesOutTheEndWhenItDoesNotFit) {
+TEST(TextUtilsTest, CopyBoundedLeavesOutTheEndWhenItDoesNotFit) {
     EXPECT_EQ(CopiedInto("abcde", 3), "abc#####");
     EXPECT_EQ(CopiedInto("abc", 3), "abc#####");
 }
 
-TEST(CopyBounded, WritesNothingWithoutRoom) {
+TEST(TextUtilsTest, CopyBoundedWritesNothingWithoutRoom) {
     for (const int size : {0, -1, INT32_MIN}) {
         EXPECT_EQ("########", CopiedInto("abc", size)) << size;
     }
 }
 
-TEST(Itoa, WritesDigitsAndReturnsTheBuffer) {
+TEST(TextUtilsTest, ItoaWritesDigitsAndReturnsTheBuffer) {
     struct Row {
         int value;
         int base;
