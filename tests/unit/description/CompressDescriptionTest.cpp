@@ -13,7 +13,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-class CompressDescription : public testing::Test {
+class CompressDescriptionTest : public testing::Test {
   protected:
     void SetUp() override {
         std::string name = (fs::temp_directory_path() / "mrtu_compress_XXXXXX").string();
@@ -61,7 +61,7 @@ std::string zlibStream(const std::string& text) {
     return stream;
 }
 
-TEST_F(CompressDescription, FramesAnyDocumentWithItsOwnLength) {
+TEST_F(CompressDescriptionTest, FramesAnyDocumentWithItsOwnLength) {
     for (const std::string& text : {std::string("<a/>"), std::string(40000, 'x')}) {
         store(text);
         ASSERT_EQ(0, run(output()));
@@ -75,18 +75,18 @@ TEST_F(CompressDescription, FramesAnyDocumentWithItsOwnLength) {
     }
 }
 
-TEST_F(CompressDescription, RefusesAMissingDocument) {
+TEST_F(CompressDescriptionTest, RefusesAMissingDocument) {
     EXPECT_EQ(1, run(output()));
     EXPECT_FALSE(fs::exists(output()));
 }
 
-TEST_F(CompressDescription, RefusesAnEmptyDocument) {
+TEST_F(CompressDescriptionTest, RefusesAnEmptyDocument) {
     store("");
     EXPECT_EQ(1, run(output()));
     EXPECT_FALSE(fs::exists(output()));
 }
 
-TEST_F(CompressDescription, ReportsAnOutputThatCannotBeWritten) {
+TEST_F(CompressDescriptionTest, ReportsAnOutputThatCannotBeWritten) {
     store("<a/>");
     EXPECT_EQ(1, run("/dev/full"));
 }

@@ -78,7 +78,7 @@ Items mandatoryDefaults() {
     return items;
 }
 
-TEST(DescriptionAndConfiguration, KnowTheSameKeys) {
+TEST(ConfigurationAgreementTest, KnowTheSameKeys) {
     std::map<std::string, int> keys;
     for (const auto& parameter : configurable())
         ++keys[textOf(parameter)];
@@ -87,7 +87,7 @@ TEST(DescriptionAndConfiguration, KnowTheSameKeys) {
         EXPECT_EQ(1, keys[key]) << key;
 }
 
-TEST(DescriptionAndConfiguration, VersionIsTheMarkerOfTheFormat) {
+TEST(ConfigurationAgreementTest, VersionIsTheMarkerOfTheFormat) {
     const std::string body =
         configuration(mandatoryDefaults()).substr(std::string("CfgVer=1").size());
     const std::string marker =
@@ -96,13 +96,13 @@ TEST(DescriptionAndConfiguration, VersionIsTheMarkerOfTheFormat) {
     EXPECT_FALSE(ParamManager().parse(body.c_str()));
 }
 
-TEST(DescriptionAndConfiguration, MandatoryKeysAloneMakeAConfiguration) {
+TEST(ConfigurationAgreementTest, MandatoryKeysAloneMakeAConfiguration) {
     ParamManager manager;
     EXPECT_TRUE(manager.parse(configuration(mandatoryDefaults()).c_str()))
         << manager.getLastError();
 }
 
-TEST(DescriptionAndConfiguration, EveryMandatoryKeyIsMissedByTheReader) {
+TEST(ConfigurationAgreementTest, EveryMandatoryKeyIsMissedByTheReader) {
     for (const auto& [key, value] : mandatoryDefaults()) {
         Items items = mandatoryDefaults();
         items.erase(key);
@@ -112,7 +112,7 @@ TEST(DescriptionAndConfiguration, EveryMandatoryKeyIsMissedByTheReader) {
     }
 }
 
-TEST(DescriptionAndConfiguration, DefaultOfEveryOptionalKeyIsTheReadersDefault) {
+TEST(ConfigurationAgreementTest, DefaultOfEveryOptionalKeyIsTheReadersDefault) {
     ParamManager manager;
     ASSERT_TRUE(manager.parse(configuration(mandatoryDefaults()).c_str()));
     int compared = 0;
@@ -128,7 +128,7 @@ TEST(DescriptionAndConfiguration, DefaultOfEveryOptionalKeyIsTheReadersDefault) 
     EXPECT_EQ(10, compared);
 }
 
-TEST(DescriptionAndConfiguration, EveryDefaultIsAmongTheChoices) {
+TEST(ConfigurationAgreementTest, EveryDefaultIsAmongTheChoices) {
     for (const auto& parameter : configurable()) {
         if (parameter.child("list_entry").empty()) continue;
         EXPECT_FALSE(childWithText(parameter, parameter.attribute("default").value()).empty())
@@ -136,7 +136,7 @@ TEST(DescriptionAndConfiguration, EveryDefaultIsAmongTheChoices) {
     }
 }
 
-TEST(DescriptionAndConfiguration, EveryChoiceIsReadAsWritten) {
+TEST(ConfigurationAgreementTest, EveryChoiceIsReadAsWritten) {
     int compared = 0;
     for (const auto& parameter : configurable()) {
         const std::string key = textOf(parameter);
@@ -153,7 +153,7 @@ TEST(DescriptionAndConfiguration, EveryChoiceIsReadAsWritten) {
     EXPECT_EQ(2 + 2 + 2 + 16 + 11 + 3 + 2 + 2 + 3, compared);
 }
 
-TEST(DescriptionAndConfiguration, EveryChoiceOfLineSettingsHasACode) {
+TEST(ConfigurationAgreementTest, EveryChoiceOfLineSettingsHasACode) {
     for (const std::string& parity : childTexts(described("parity"))) {
         EXPECT_GE(_MRTU::parityCode(parity), 0) << parity;
     }
@@ -174,7 +174,7 @@ std::string anotherValue(const std::string& key, const pugi::xml_node& parameter
     return key == "model" ? "3" : "42";
 }
 
-TEST(DescriptionAndConfiguration, NodePropertiesMayBeGivenForOneNode) {
+TEST(ConfigurationAgreementTest, NodePropertiesMayBeGivenForOneNode) {
     int compared = 0;
     for (const auto& parameter : configurable()) {
         if (!flag(parameter, "isNodeProperty")) continue;
@@ -191,7 +191,7 @@ TEST(DescriptionAndConfiguration, NodePropertiesMayBeGivenForOneNode) {
     EXPECT_EQ(10, compared);
 }
 
-TEST(DescriptionAndConfiguration, OtherPropertiesOfOneNodeAreNotSeen) {
+TEST(ConfigurationAgreementTest, OtherPropertiesOfOneNodeAreNotSeen) {
     int compared = 0;
     for (const auto& parameter : configurable()) {
         if (flag(parameter, "isNodeProperty")) continue;
@@ -210,7 +210,7 @@ TEST(DescriptionAndConfiguration, OtherPropertiesOfOneNodeAreNotSeen) {
     EXPECT_EQ(7, compared);
 }
 
-TEST(DescriptionAndConfiguration, DistinctParameterHasNoCommonValueWhereThereAreNodes) {
+TEST(ConfigurationAgreementTest, DistinctParameterHasNoCommonValueWhereThereAreNodes) {
     for (const auto& parameter : configurable()) {
         const std::string key = textOf(parameter);
         Items items = mandatoryDefaults();
@@ -222,7 +222,7 @@ TEST(DescriptionAndConfiguration, DistinctParameterHasNoCommonValueWhereThereAre
     }
 }
 
-TEST(DescriptionAndConfiguration, LimitsOfTheRegisterBlockAreTheReadersLimits) {
+TEST(ConfigurationAgreementTest, LimitsOfTheRegisterBlockAreTheReadersLimits) {
     const auto parameter = described("maxOptLen");
     const int min = parameter.attribute("min").as_int(-1);
     const int max = parameter.attribute("max").as_int(-1);
@@ -241,20 +241,20 @@ TEST(DescriptionAndConfiguration, LimitsOfTheRegisterBlockAreTheReadersLimits) {
     EXPECT_FALSE(manager.parse(configuration(items).c_str()));
 }
 
-TEST(DescriptionAndConfiguration, DefaultModelIsADescribedModel) {
+TEST(ConfigurationAgreementTest, DefaultModelIsADescribedModel) {
     const std::string preset = described("model").attribute("default").value();
     EXPECT_FALSE(childWithText(root().child("models"), preset).empty());
 }
 
 // The listed differences.
 
-TEST(DescriptionAndConfiguration, MarkParityIsAcceptedThoughNotOffered) {
+TEST(ConfigurationAgreementTest, MarkParityIsAcceptedThoughNotOffered) {
     EXPECT_TRUE(childWithText(described("parity"), "mark").empty());
     EXPECT_EQ(3, _MRTU::parityCode("mark"));
     EXPECT_EQ(-1, _MRTU::parityCode("space")) << "no further difference";
 }
 
-TEST(DescriptionAndConfiguration, DataBitsAreMandatoryYetNotReadInRtu) {
+TEST(ConfigurationAgreementTest, DataBitsAreMandatoryYetNotReadInRtu) {
     const auto bits = described("bits");
     ASSERT_TRUE(flag(bits, "isMandatory"));
     const std::vector<std::string> modes =
@@ -269,7 +269,7 @@ TEST(DescriptionAndConfiguration, DataBitsAreMandatoryYetNotReadInRtu) {
     }
 }
 
-TEST(DescriptionAndConfiguration, DataBitsGivenInRtuAreNotStored) {
+TEST(ConfigurationAgreementTest, DataBitsGivenInRtuAreNotStored) {
     Items items = mandatoryDefaults();
     items["txMode"] = "RTU";
     items["bits"] = "7";

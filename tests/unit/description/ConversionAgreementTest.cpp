@@ -48,7 +48,7 @@ bool works(const std::string& conversion, const ProtUtilsN::DataType& type, bool
     return tag.DoConversion(value.data(), conversion.c_str(), toDevice);
 }
 
-TEST(DescriptionAndConversions, WhatIsOfferedForATypeWorksOnItInBothDirections) {
+TEST(ConversionAgreementTest, WhatIsOfferedForATypeWorksOnItInBothDirections) {
     int compared = 0;
     for (const auto& conversion : root().child("conversions").children("conversion")) {
         for (const ProtUtilsN::DataType& type : ProtUtilsN::DataTypes) {
@@ -69,7 +69,7 @@ bool worksUnoffered(std::string_view conversion, const ProtUtilsN::DataType& typ
     return conversion == "neg" && type.type == ICU_Type::string;
 }
 
-TEST(DescriptionAndConversions, TypesThatAreNotOfferedAreRefusedWhereTheTypeDecides) {
+TEST(ConversionAgreementTest, TypesThatAreNotOfferedAreRefusedWhereTheTypeDecides) {
     for (const char* name : {"inv", "neg"}) {
         const auto conversion = childWithText(root().child("conversions"), name);
         for (const ProtUtilsN::DataType& type : ProtUtilsN::DataTypes) {
@@ -80,7 +80,7 @@ TEST(DescriptionAndConversions, TypesThatAreNotOfferedAreRefusedWhereTheTypeDeci
     }
 }
 
-TEST(DescriptionAndConversions, WhatIsNotDescribedDoesNotExist) {
+TEST(ConversionAgreementTest, WhatIsNotDescribedDoesNotExist) {
     EXPECT_TRUE(childWithText(root().child("conversions"), "swap3").empty());
     EXPECT_FALSE(works("swap3", ProtUtilsN::DataTypes.at(3), false));
 }

@@ -22,11 +22,11 @@ const std::vector<Conversion> conversions{
     {"neg", "Negate", "0x298e18e"},
 };
 
-TEST(DescriptionConversions, SectionHasItsDisplayText) {
+TEST(DescribedConversionsTest, SectionHasItsDisplayText) {
     EXPECT_EQ((Attributes{{"display", "Conversions"}}), attributesOf(root().child("conversions")));
 }
 
-TEST(DescriptionConversions, NamesStandInOrder) {
+TEST(DescribedConversionsTest, NamesStandInOrder) {
     std::vector<std::string> names;
     names.reserve(conversions.size());
     for (const Conversion& conversion : conversions)
@@ -34,7 +34,7 @@ TEST(DescriptionConversions, NamesStandInOrder) {
     EXPECT_EQ(names, childTexts(root().child("conversions")));
 }
 
-TEST(DescriptionConversions, AttributesAreThoseOfTheConversionAndInOrder) {
+TEST(DescribedConversionsTest, AttributesAreThoseOfTheConversionAndInOrder) {
     for (const Conversion& conversion : conversions) {
         const auto element = childWithText(root().child("conversions"), conversion.name);
         EXPECT_STREQ("conversion", element.name()) << conversion.name;

@@ -16,7 +16,7 @@
 namespace description_test {
 namespace {
 
-class DescriptionAndDriver : public testing::Test {
+class DriverAgreementTest : public testing::Test {
   protected:
     void SetUp() override {
         module_ = static_cast<IProtModule*>(plugin_.CreateInterface("IProtModule"));
@@ -68,11 +68,11 @@ std::string fact(const char* element) {
     return root().child(element).child_value();
 }
 
-TEST_F(DescriptionAndDriver, ProtocolHandsOutTheBlock) {
+TEST_F(DriverAgreementTest, ProtocolHandsOutTheBlock) {
     EXPECT_EQ(GetXml_MRTU(), protocol().GetXml());
 }
 
-TEST_F(DescriptionAndDriver, AgreeOnNamesAndNumbers) {
+TEST_F(DriverAgreementTest, AgreeOnNamesAndNumbers) {
     EXPECT_EQ(protocol().GetName(), fact("name"));
     EXPECT_EQ(protocol().GetProtocolName(), fact("display"));
     EXPECT_EQ(std::to_string(protocol().GetProtocolType()), fact("code"));
@@ -82,7 +82,7 @@ TEST_F(DescriptionAndDriver, AgreeOnNamesAndNumbers) {
     EXPECT_EQ(markerTail, std::string(lengthLine - markerTail.size() - 1, markerTail.size()));
 }
 
-TEST_F(DescriptionAndDriver, AgreeOnTheFieldsOfATagUri) {
+TEST_F(DriverAgreementTest, AgreeOnTheFieldsOfATagUri) {
     std::vector<std::string> names;
     names.reserve(4);
     for (int i = 0; i < protocol7().getTagUriFieldCount(); ++i) {
@@ -91,14 +91,14 @@ TEST_F(DescriptionAndDriver, AgreeOnTheFieldsOfATagUri) {
     EXPECT_EQ(names, childTexts(root().child("tag_uri")));
 }
 
-TEST_F(DescriptionAndDriver, AgreeThatThereAreNoMultipleReadsAndWrites) {
+TEST_F(DriverAgreementTest, AgreeThatThereAreNoMultipleReadsAndWrites) {
     auto* later = static_cast<IProtocol3*>(protocol().ConvertTo("IProtocol3"));
     ASSERT_NE(later, nullptr);
     EXPECT_EQ(later->MultipleReadSupported(), fact("canMultipleRead") == "true");
     EXPECT_EQ(later->MultipleWriteSupported(), fact("canMultipleWrite") == "true");
 }
 
-TEST_F(DescriptionAndDriver, ConsoleShowsTheLengthLine) {
+TEST_F(DriverAgreementTest, ConsoleShowsTheLengthLine) {
     auto* console = static_cast<IProtocol2*>(protocol().ConvertTo("IProtocol2"));
     ASSERT_NE(console, nullptr);
     char answer[64];
@@ -118,7 +118,7 @@ std::string admittedType(const std::string& area) {
     return "none";
 }
 
-TEST_F(DescriptionAndDriver, TagsMayUseTheOfferedRangesAndNothingBeyond) {
+TEST_F(DriverAgreementTest, TagsMayUseTheOfferedRangesAndNothingBeyond) {
     int compared = 0;
     for (const auto& model : root().child("models").children("model")) {
         configure("model=" + textOf(model));
@@ -140,7 +140,7 @@ TEST_F(DescriptionAndDriver, TagsMayUseTheOfferedRangesAndNothingBeyond) {
     EXPECT_EQ(4 + 3 + 12 + 12, compared);
 }
 
-TEST_F(DescriptionAndDriver, WriteFunctionsOfferedAreTheFunctionsUsed) {
+TEST_F(DriverAgreementTest, WriteFunctionsOfferedAreTheFunctionsUsed) {
     const auto parameters = root().child("parameters");
     for (const std::string& choice : childTexts(childWithText(parameters, "presetFunction"))) {
         configure("presetFunction=" + choice);

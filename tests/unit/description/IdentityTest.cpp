@@ -46,12 +46,12 @@ constexpr std::array facts{
     Fact{"plcnet", ""},
 };
 
-TEST(DescriptionIdentity, RootIsTheProtocolConfiguration) {
+TEST(IdentityTest, RootIsTheProtocolConfiguration) {
     EXPECT_STREQ("protocol_cfg", root().name());
     EXPECT_TRUE(attributesOf(root()).empty());
 }
 
-TEST(DescriptionIdentity, FactsStandInOrderWithTheirValues) {
+TEST(IdentityTest, FactsStandInOrderWithTheirValues) {
     pugi::xml_node element = root().first_child();
     for (const Fact& fact : facts) {
         EXPECT_EQ(fact.element, element.name());
@@ -60,7 +60,7 @@ TEST(DescriptionIdentity, FactsStandInOrderWithTheirValues) {
     }
 }
 
-TEST(DescriptionIdentity, SectionsFollowTheFactsInOrder) {
+TEST(IdentityTest, SectionsFollowTheFactsInOrder) {
     std::vector<std::string> names;
     for (const pugi::xml_node& child : root().children())
         names.emplace_back(child.name());
@@ -71,7 +71,7 @@ TEST(DescriptionIdentity, SectionsFollowTheFactsInOrder) {
         names);
 }
 
-TEST(DescriptionIdentity, NodesAreLocatedByTheirSlaveNumber) {
+TEST(IdentityTest, NodesAreLocatedByTheirSlaveNumber) {
     EXPECT_EQ((Attributes{{"alwaysEnable", "false"}, {"locator", "slaveid"}}),
               attributesOf(root().child("plcnet")));
 }

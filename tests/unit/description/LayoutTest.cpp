@@ -12,7 +12,7 @@ namespace {
 
 constexpr std::string_view byteOrderMark = "\xEF\xBB\xBF";
 
-TEST(DescriptionLayout, IsWellFormed) {
+TEST(LayoutTest, IsWellFormed) {
     const std::unique_ptr<XML_ParserStruct, decltype(&XML_ParserFree)> parser(
         XML_ParserCreate(nullptr), &XML_ParserFree);
     const std::string text = inflateDocument().text;
@@ -22,18 +22,18 @@ TEST(DescriptionLayout, IsWellFormed) {
                                      << " in line " << XML_GetCurrentLineNumber(parser.get());
 }
 
-TEST(DescriptionLayout, StartsWithByteOrderMarkAndDeclaration) {
+TEST(LayoutTest, StartsWithByteOrderMarkAndDeclaration) {
     const std::string text = inflateDocument().text;
     ASSERT_TRUE(text.starts_with(byteOrderMark));
     EXPECT_TRUE(text.substr(byteOrderMark.size())
                     .starts_with("<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<protocol_cfg>\n"));
 }
 
-TEST(DescriptionLayout, EndsWithALineFeed) {
+TEST(LayoutTest, EndsWithALineFeed) {
     EXPECT_TRUE(inflateDocument().text.ends_with("\n</protocol_cfg>\n"));
 }
 
-TEST(DescriptionLayout, HasNeitherCarriageReturnsNorTabs) {
+TEST(LayoutTest, HasNeitherCarriageReturnsNorTabs) {
     EXPECT_EQ(std::string::npos, inflateDocument().text.find_first_of("\r\t"));
 }
 
@@ -43,7 +43,7 @@ int levelsOpened(const std::string& line) {
     return line.starts_with("<?") ? 0 : 1;
 }
 
-TEST(DescriptionLayout, EveryElementStandsOnItsOwnLineIndentedByFourSpacesALevel) {
+TEST(LayoutTest, EveryElementStandsOnItsOwnLineIndentedByFourSpacesALevel) {
     std::istringstream text(inflateDocument().text.substr(byteOrderMark.size()));
     std::size_t level = 0;
     for (std::string line; std::getline(text, line);) {
@@ -59,13 +59,13 @@ TEST(DescriptionLayout, EveryElementStandsOnItsOwnLineIndentedByFourSpacesALevel
     EXPECT_EQ(0U, level);
 }
 
-TEST(DescriptionLayout, EmptyElementEndsWithoutABlank) {
+TEST(LayoutTest, EmptyElementEndsWithoutABlank) {
     EXPECT_NE(
         inflateDocument().text.find("\n    <plcnet alwaysEnable=\"false\" locator=\"slaveid\"/>\n"),
         std::string::npos);
 }
 
-TEST(DescriptionLayout, GreaterThanStandsUnescapedInDisplayTexts) {
+TEST(LayoutTest, GreaterThanStandsUnescapedInDisplayTexts) {
     const std::string text = inflateDocument().text;
     EXPECT_NE(text.find("display=\"ABCD->CDAB\""), std::string::npos);
     EXPECT_EQ(std::string::npos, text.find('&'));

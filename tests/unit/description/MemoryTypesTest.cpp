@@ -64,7 +64,7 @@ Attributes expectedAttributes(const Area& area) {
     };
 }
 
-TEST(DescriptionMemoryTypes, NamesStandInOrder) {
+TEST(MemoryTypesTest, NamesStandInOrder) {
     std::vector<std::string> names;
     names.reserve(areas.size());
     for (const Area& area : areas)
@@ -72,7 +72,7 @@ TEST(DescriptionMemoryTypes, NamesStandInOrder) {
     EXPECT_EQ(names, childTexts(root().child("memtypes")));
 }
 
-TEST(DescriptionMemoryTypes, AttributesAreThoseOfTheAreaAndInOrder) {
+TEST(MemoryTypesTest, AttributesAreThoseOfTheAreaAndInOrder) {
     for (const Area& area : areas) {
         const auto element = childWithText(root().child("memtypes"), area.name);
         EXPECT_STREQ("memtype", element.name()) << area.name;

@@ -58,11 +58,11 @@ const std::vector<ModelRow> models{
       {"SP_Done", 0, 0}}},
 };
 
-TEST(DescriptionModels, ModelsStandInOrder) {
+TEST(ModelsTest, ModelsStandInOrder) {
     EXPECT_EQ((std::vector<std::string>{"1", "2", "3", "4"}), childTexts(root().child("models")));
 }
 
-TEST(DescriptionModels, ModelsCarryTheirDisplayTextAndNoDatagrams) {
+TEST(ModelsTest, ModelsCarryTheirDisplayTextAndNoDatagrams) {
     for (const ModelRow& model : models) {
         const auto element = childWithText(root().child("models"), model.name);
         EXPECT_STREQ("model", element.name());
@@ -73,7 +73,7 @@ TEST(DescriptionModels, ModelsCarryTheirDisplayTextAndNoDatagrams) {
     }
 }
 
-TEST(DescriptionModels, AreasStandInOrderWithTheirRanges) {
+TEST(ModelsTest, AreasStandInOrderWithTheirRanges) {
     for (const ModelRow& model : models) {
         const auto element = childWithText(root().child("models"), model.name);
         std::vector<std::string> names;

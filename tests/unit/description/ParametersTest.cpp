@@ -78,7 +78,7 @@ Attributes expectedAttributes(const Parameter& row) {
     return attributes;
 }
 
-TEST(DescriptionParameters, KeysStandInOrder) {
+TEST(ParametersTest, KeysStandInOrder) {
     std::vector<std::string> keys;
     keys.reserve(parameters.size());
     for (const Parameter& row : parameters)
@@ -86,7 +86,7 @@ TEST(DescriptionParameters, KeysStandInOrder) {
     EXPECT_EQ(keys, childTexts(root().child("parameters")));
 }
 
-TEST(DescriptionParameters, AttributesAreThoseOfTheirKeysAndInOrder) {
+TEST(ParametersTest, AttributesAreThoseOfTheirKeysAndInOrder) {
     for (const Parameter& row : parameters) {
         const auto element = childWithText(root().child("parameters"), row.key);
         EXPECT_STREQ("parameter", element.name()) << row.key;
@@ -94,7 +94,7 @@ TEST(DescriptionParameters, AttributesAreThoseOfTheirKeysAndInOrder) {
     }
 }
 
-TEST(DescriptionParameters, ChoicesAreListedInOrder) {
+TEST(ParametersTest, ChoicesAreListedInOrder) {
     for (const Parameter& row : parameters) {
         const auto element = childWithText(root().child("parameters"), row.key);
         EXPECT_EQ(row.choices, childTexts(element)) << row.key;
@@ -104,7 +104,7 @@ TEST(DescriptionParameters, ChoicesAreListedInOrder) {
     }
 }
 
-TEST(DescriptionParameters, KeyStandsRightBehindTheOpeningTag) {
+TEST(ParametersTest, KeyStandsRightBehindTheOpeningTag) {
     for (const Parameter& row : parameters) {
         const auto element = childWithText(root().child("parameters"), row.key);
         EXPECT_TRUE(std::string_view(element.child_value()).starts_with(row.key)) << row.key;

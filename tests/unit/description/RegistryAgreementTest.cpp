@@ -68,7 +68,7 @@ void expectSameSettings(const MemoryType& type, const pugi::xml_node& described)
     EXPECT_EQ(type.hasInternalConversion(), described.attribute("hasInternalConversion").as_bool());
 }
 
-TEST(DescriptionAndRegistry, HaveTheSameModels) {
+TEST(RegistryAgreementTest, HaveTheSameModels) {
     std::vector<std::string> names;
     for (const Model& model : registry().getModels()) {
         names.push_back(model.getName());
@@ -79,11 +79,11 @@ TEST(DescriptionAndRegistry, HaveTheSameModels) {
     EXPECT_EQ(names, childTexts(root().child("models")));
 }
 
-TEST(DescriptionAndRegistry, HaveTheSameMemoryTypesInTheSameOrder) {
+TEST(RegistryAgreementTest, HaveTheSameMemoryTypesInTheSameOrder) {
     EXPECT_EQ(registeredNames(*registry().getModel("3")), childTexts(root().child("memtypes")));
 }
 
-TEST(DescriptionAndRegistry, AgreeOnEveryMemoryTypeInEveryModel) {
+TEST(RegistryAgreementTest, AgreeOnEveryMemoryTypeInEveryModel) {
     for (const Model& model : registry().getModels()) {
         SCOPED_TRACE("model " + model.getName());
         for (const MemoryType& type : model.getMemoryTypes()) {
@@ -94,7 +94,7 @@ TEST(DescriptionAndRegistry, AgreeOnEveryMemoryTypeInEveryModel) {
     }
 }
 
-TEST(DescriptionAndRegistry, GeneralRangesAreThoseOfModelOneAndForLongThoseOfModelThree) {
+TEST(RegistryAgreementTest, GeneralRangesAreThoseOfModelOneAndForLongThoseOfModelThree) {
     for (const auto& described : root().child("memtypes").children("memtype")) {
         const std::string name = textOf(described);
         const MemoryType* type = registry().getMemoryType(name == "LONG" ? "3" : "1", name);
@@ -104,7 +104,7 @@ TEST(DescriptionAndRegistry, GeneralRangesAreThoseOfModelOneAndForLongThoseOfMod
     }
 }
 
-TEST(DescriptionAndRegistry, EveryAreaOfferedInAModelIsRegisteredWithTheSameRange) {
+TEST(RegistryAgreementTest, EveryAreaOfferedInAModelIsRegisteredWithTheSameRange) {
     for (const auto& described : root().child("models").children("model")) {
         for (const auto& reference : described.children("memtype_ref")) {
             SCOPED_TRACE("model " + textOf(described) + ", " + textOf(reference));
@@ -116,7 +116,7 @@ TEST(DescriptionAndRegistry, EveryAreaOfferedInAModelIsRegisteredWithTheSameRang
     }
 }
 
-TEST(DescriptionAndRegistry, DifferInExactlyTheListedAreas) {
+TEST(RegistryAgreementTest, DifferInExactlyTheListedAreas) {
     for (const auto& [model, missing] : notOffered) {
         const std::vector<std::string> offered = childTexts(describedModel(model));
         std::vector<std::string> difference;
@@ -129,7 +129,7 @@ TEST(DescriptionAndRegistry, DifferInExactlyTheListedAreas) {
     }
 }
 
-TEST(DescriptionAndRegistry, InputRegistersOfModelTwoAreRegisteredThoughNotOffered) {
+TEST(RegistryAgreementTest, InputRegistersOfModelTwoAreRegisteredThoughNotOffered) {
     const MemoryType* type = registry().getMemoryType("2", "IREG");
     ASSERT_NE(type, nullptr);
     EXPECT_EQ(300000, type->getMinIndex());

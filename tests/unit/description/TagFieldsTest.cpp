@@ -22,7 +22,7 @@ const std::vector<Field> fields{
     {"datatype", "Data Type", "boolean", "field", "prop_icomType", "true"},
 };
 
-TEST(DescriptionTagFields, FieldsStandInTheOrderOfTheAddress) {
+TEST(TagFieldsTest, FieldsStandInTheOrderOfTheAddress) {
     std::vector<std::string> names;
     names.reserve(fields.size());
     for (const Field& field : fields)
@@ -30,7 +30,7 @@ TEST(DescriptionTagFields, FieldsStandInTheOrderOfTheAddress) {
     EXPECT_EQ(names, childTexts(root().child("tag_uri")));
 }
 
-TEST(DescriptionTagFields, AttributesAreThoseOfTheFieldAndInOrder) {
+TEST(TagFieldsTest, AttributesAreThoseOfTheFieldAndInOrder) {
     for (const Field& field : fields) {
         const auto element = childWithText(root().child("tag_uri"), field.name);
         EXPECT_STREQ("tag_field", element.name()) << field.name;
