@@ -67,7 +67,7 @@ void expectDestructorInFront() {
     EXPECT_EQ("destructor", called);
 }
 
-TEST(SlotWalkTest, HeldServicesHaveTheCommonOperationsOnly) {
+TEST(SlotWalkPlatformTest, HeldServicesHaveTheCommonOperationsOnly) {
     Recorded<IDiag> diag;
     Recorded<ISocketFactory> sockets;
     Recorded<ICDSBuffer> buffer;
@@ -89,7 +89,7 @@ class RecordedInterfaceFactory final : public IInterfaceFactory {
     void ReleaseInterface(IInterface*) override { called = "ReleaseInterface"; }
 };
 
-TEST(SlotWalkTest, InterfaceFactoryHasTwoOperationsAndNothingInFront) {
+TEST(SlotWalkPlatformTest, InterfaceFactoryHasTwoOperationsAndNothingInFront) {
     RecordedInterfaceFactory factory;
     walk(static_cast<IInterfaceFactory*>(&factory), 0,
          {{"CreateInterface", zeroes<IInterface*, const char*>()},
@@ -102,7 +102,7 @@ class RecordedProtocolFactory final : public Recorded<IProtocolFactory> {
     void DeleteProtocol(IProtocol*) override { called = "DeleteProtocol"; }
 };
 
-TEST(SlotWalkTest, ProtocolFactory) {
+TEST(SlotWalkPlatformTest, ProtocolFactory) {
     RecordedProtocolFactory factory;
     walkService(&factory, {{"CreateProtocol", zeroes<IProtocol*, const char*>()},
                            {"DeleteProtocol", zeroes<void, IProtocol*>()}});
@@ -115,7 +115,7 @@ class RecordedModule final : public Recorded<IProtModule> {
     const char* GetLastError() const override { return note<const char*>("GetLastError"); }
 };
 
-TEST(SlotWalkTest, Module) {
+TEST(SlotWalkPlatformTest, Module) {
     RecordedModule module;
     walkService(&module, {{"Init", zeroes<int, IInterfaceFactory*>()},
                           {"Close", zeroes<void>()},
@@ -129,7 +129,7 @@ class RecordedMultiTask final : public Recorded<IMultiTask2> {
     void sleep(int) override { called = "sleep"; }
 };
 
-TEST(SlotWalkTest, MultiTask) {
+TEST(SlotWalkPlatformTest, MultiTask) {
     RecordedMultiTask tasks;
     walkService(&tasks, {{"createLock", zeroes<ILock*, int>()},
                          {"deleteLock", zeroes<void, ILock*>()},
@@ -142,7 +142,7 @@ class RecordedLock final : public ILock {
     void unlock() override { called = "unlock"; }
 };
 
-TEST(SlotWalkTest, LockHasTwoOperationsAndNothingInFront) {
+TEST(SlotWalkPlatformTest, LockHasTwoOperationsAndNothingInFront) {
     RecordedLock lock;
     walk(static_cast<ILock*>(&lock), 0, {{"lock", zeroes<void>()}, {"unlock", zeroes<void>()}});
 }
@@ -153,7 +153,7 @@ class RecordedSerialFactory final : public Recorded<ISerialFactory> {
     void releasePort(ISerialPort*) override { called = "releasePort"; }
 };
 
-TEST(SlotWalkTest, SerialFactory) {
+TEST(SlotWalkPlatformTest, SerialFactory) {
     RecordedSerialFactory factory;
     walkService(&factory, {{"openPort", zeroes<ISerialPort*, const char*>()},
                            {"releasePort", zeroes<void, ISerialPort*>()}});
@@ -176,7 +176,7 @@ class RecordedPort final : public ISerialPort {
     }
 };
 
-TEST(SlotWalkTest, SerialPort) {
+TEST(SlotWalkPlatformTest, SerialPort) {
     RecordedPort port;
     walk(static_cast<ISerialPort*>(&port), 0,
          {{"configure", zeroes<int, int, int, int, int, int>()},
@@ -203,7 +203,7 @@ class RecordedStorage final : public Recorded<IPermanentStorage2> {
     int keyNameInto(Text, int, char*, int) override { return note<int>("keyNameInto"); }
 };
 
-TEST(SlotWalkTest, PermanentStorageWithItsExtensionBehind) {
+TEST(SlotWalkPlatformTest, PermanentStorageWithItsExtensionBehind) {
     using Text = const char*;
     RecordedStorage storage;
     walkService(&storage, {{"writeString", zeroes<void, Text, Text, Text>()},
@@ -250,7 +250,7 @@ class RecordedTag final : public ITag {
     }
 };
 
-TEST(SlotWalkTest, Tag) {
+TEST(SlotWalkPlatformTest, Tag) {
     using Data = unsigned char;
     RecordedTag tag;
     walk(static_cast<ITag*>(&tag), kDestructors,
