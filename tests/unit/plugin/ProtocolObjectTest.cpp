@@ -104,15 +104,4 @@ TEST_F(ProtocolObjectTest, TagsStillHeldDieWithTheProtocol) {
     EXPECT_NE(nullptr, protocol->CreateTag("1?OUTP?1?boolean"));
 }
 
-TEST(ProtocolWithoutHostTest, CreationAndDeletionCostNoServiceCalls) {
-    FakeHost host;
-    const driver_test::BoundModule module(host);
-    host.forget();
-    auto* factory = static_cast<IProtocolFactory*>(
-        GetInterfaceFactory()->CreateInterface("IProtocolFactory")->ConvertTo("IProtocolFactory"));
-    factory->DeleteProtocol(factory->CreateProtocol("MRTU"));
-    EXPECT_TRUE(host.calls().empty());
-    EXPECT_EQ(0, host.multiTask.locksAlive());
-}
-
 }  // namespace
