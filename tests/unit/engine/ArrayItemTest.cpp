@@ -30,7 +30,7 @@ std::vector<std::string> arrays() {
     return types;
 }
 
-class ArrayItem : public testing::Test {
+class ArrayItemTest : public testing::Test {
   protected:
     static std::size_t itemLength(const ITag* tag) {
         return static_cast<std::size_t>(ProtUtilsN::GetBasicLength(tag));
@@ -58,7 +58,7 @@ class ArrayItem : public testing::Test {
     FakeDriver driver_;
 };
 
-void ArrayItem::expectItemsEqualTheWhole(const std::string& uri) {
+void ArrayItemTest::expectItemsEqualTheWhole(const std::string& uri) {
     const ITag* tag = driver_.tag(uri);
     Bytes whole(static_cast<std::size_t>(tag->GetVarLength()), kUntouched);
     if (driver_.Read(tag, whole.data()) == 0) return;
@@ -67,7 +67,8 @@ void ArrayItem::expectItemsEqualTheWhole(const std::string& uri) {
 }
 
 // The framework's own way, the whole array read and written, is the model.
-void ArrayItem::expectItemWriteEqualsTheWhole(const std::string& uri, const std::string& memory) {
+void ArrayItemTest::expectItemWriteEqualsTheWhole(const std::string& uri,
+                                                  const std::string& memory) {
     const ITag* tag = driver_.tag(uri);
     for (int i = 0; i < ProtUtilsN::GetItemCount(tag); ++i) {
         const FakeMemory before = driver_.memory(memory);
@@ -85,14 +86,14 @@ void ArrayItem::expectItemWriteEqualsTheWhole(const std::string& uri, const std:
 
 }  // namespace
 
-TEST_F(ArrayItem, ReadEqualsTheWholeReadInRegisters) {
+TEST_F(ArrayItemTest, ReadEqualsTheWholeReadInRegisters) {
     for (const char* memory : {"REG", "LONG", "BYTE"}) {
         for (const std::string& type : arrays())
             expectItemsEqualTheWhole(std::string("1?") + memory + "?300.5?" + type);
     }
 }
 
-TEST_F(ArrayItem, ReadEqualsTheWholeReadInBitMemories) {
+TEST_F(ArrayItemTest, ReadEqualsTheWholeReadInBitMemories) {
     for (const char* type : {"boolean-1", "boolean-9", "boolean-40", "boolean-40(swap2)",
                              "boolean-40(swap8)", "boolean-9(inv)"}) {
         for (const char* offset : {"0", "3", "13"})
@@ -100,7 +101,7 @@ TEST_F(ArrayItem, ReadEqualsTheWholeReadInBitMemories) {
     }
 }
 
-TEST_F(ArrayItem, WriteEqualsTheWholeWriteInRegisters) {
+TEST_F(ArrayItemTest, WriteEqualsTheWholeWriteInRegisters) {
     for (const char* memory : {"REG", "LONG", "BYTE"}) {
         FakeMemory& area = driver_.memory(memory);
         area.setBytes(300, Bytes(1000, 0x11));  // decimal digits, so that "bcd" takes part
@@ -112,7 +113,7 @@ TEST_F(ArrayItem, WriteEqualsTheWholeWriteInRegisters) {
     }
 }
 
-TEST_F(ArrayItem, WriteEqualsTheWholeWriteInBitMemories) {
+TEST_F(ArrayItemTest, WriteEqualsTheWholeWriteInBitMemories) {
     for (const char* type : {"boolean-1", "boolean-9", "boolean-40", "boolean-40(swap2)",
                              "boolean-40(swap8)", "boolean-9(inv)"}) {
         for (const char* offset : {"0", "3", "13"})
@@ -120,7 +121,7 @@ TEST_F(ArrayItem, WriteEqualsTheWholeWriteInBitMemories) {
     }
 }
 
-TEST_F(ArrayItem, OnlyTheItemsOwnPartOfTheMemoryTravels) {
+TEST_F(ArrayItemTest, OnlyTheItemsOwnPartOfTheMemoryTravels) {
     struct Row {
         const char* uri;
         int index;
@@ -151,14 +152,14 @@ TEST_F(ArrayItem, OnlyTheItemsOwnPartOfTheMemoryTravels) {
     }
 }
 
-TEST_F(ArrayItem, NegationKeepsItsBoundOnBytes) {
+TEST_F(ArrayItemTest, NegationKeepsItsBoundOnBytes) {
     driver_.memory("REG").setBytes(0, Bytes(20, 0x01));
     const ITag* tag = driver_.tag("1?REG?0?short-10(neg)");
     EXPECT_EQ((Bytes{0xFF, 0xFE}), readItem(tag, 4));
     EXPECT_EQ((Bytes{0x01, 0x01}), readItem(tag, 5));
 }
 
-TEST_F(ArrayItem, NeighbourThatConvertsBadlyDoesNotMatter) {
+TEST_F(ArrayItemTest, NeighbourThatConvertsBadlyDoesNotMatter) {
     driver_.memory("REG").setBytes(0, {0x12, 0xFF, 0x34, 0xFF});
     const ITag* tag = driver_.tag("1?REG?0?unsignedByte-4(bcd)");
     EXPECT_EQ((Bytes{12}), readItem(tag, 0));
@@ -167,7 +168,7 @@ TEST_F(ArrayItem, NeighbourThatConvertsBadlyDoesNotMatter) {
     EXPECT_EQ((Bytes{0x12, 0xFF, 0x56, 0xFF}), driver_.memory("REG").bytes(0, 4));
 }
 
-TEST_F(ArrayItem, BadConversionIsReported) {
+TEST_F(ArrayItemTest, BadConversionIsReported) {
     driver_.memory("REG").setBytes(0, {0x1A, 0x00, 0x12, 0x00});
     const ITag* bcd = driver_.tag("1?REG?0?short-2(bcd)");
     Bytes item(2, kUntouched);
@@ -187,7 +188,7 @@ TEST_F(ArrayItem, BadConversionIsReported) {
     EXPECT_EQ("read 0+1, read 0+2", driver_.calls());
 }
 
-TEST_F(ArrayItem, FailedReadWritesNothing) {
+TEST_F(ArrayItemTest, FailedReadWritesNothing) {
     const Bytes before = driver_.memory("REG").image();
     driver_.failCall(1);
     const unsigned char value = 1;
@@ -200,7 +201,7 @@ TEST_F(ArrayItem, FailedReadWritesNothing) {
     EXPECT_EQ(kUntouched, item);
 }
 
-TEST_F(ArrayItem, ScalarsAndStrangeItemsAreRefused) {
+TEST_F(ArrayItemTest, ScalarsAndStrangeItemsAreRefused) {
     struct Row {
         const char* uri;
         int index;
@@ -228,7 +229,7 @@ TEST_F(ArrayItem, ScalarsAndStrangeItemsAreRefused) {
     EXPECT_EQ("", driver_.calls());
 }
 
-TEST_F(ArrayItem, ReadOnlyMemoryIsReadButNotWritten) {
+TEST_F(ArrayItemTest, ReadOnlyMemoryIsReadButNotWritten) {
     const ITag* tag = driver_.tag("1?IREG?50?short-4");
     EXPECT_EQ(driver_.memory("IREG").bytes(51, 2), readItem(tag, 1));
     const unsigned char value[] = {1, 2};
@@ -238,7 +239,7 @@ TEST_F(ArrayItem, ReadOnlyMemoryIsReadButNotWritten) {
     EXPECT_EQ("read 51+1", driver_.calls());
 }
 
-TEST_F(ArrayItem, WholeArrayTravelsUnlessTheDriverAddressesItems) {
+TEST_F(ArrayItemTest, WholeArrayTravelsUnlessTheDriverAddressesItems) {
     driver_.setArrayItemByTag(0);
     const ITag* tag = driver_.tag("1?REG?50?short-4");
     EXPECT_EQ(driver_.memory("REG").bytes(51, 2), readItem(tag, 1));
@@ -248,7 +249,7 @@ TEST_F(ArrayItem, WholeArrayTravelsUnlessTheDriverAddressesItems) {
     EXPECT_EQ("read 50+4, write 50+4", driver_.calls());
 }
 
-TEST_F(ArrayItem, AreaOfTheDriverItselfTravelsWhole) {
+TEST_F(ArrayItemTest, AreaOfTheDriverItselfTravelsWhole) {
     const ITag* tag = driver_.tag("1?AREA?0?unsignedByte-4");
     EXPECT_EQ(Bytes(1, driver_.memory("AREA").image()[2]), readItem(tag, 2));
     EXPECT_EQ("read 0+1", driver_.calls());

@@ -22,30 +22,30 @@ void PrintTo(const Blocks::Block& block, std::ostream* out) {
     *out << block.first << "+" << block.count;
 }
 
-TEST(Blocks, AFittingCountIsOneBlock) {
+TEST(BlocksTest, AFittingCountIsOneBlock) {
     EXPECT_THAT(blocks(1, 125), ElementsAre(Blocks::Block{0, 1}));
     EXPECT_THAT(blocks(125, 125), ElementsAre(Blocks::Block{0, 125}));
 }
 
-TEST(Blocks, OneMoreItemIsABlockOfItsOwn) {
+TEST(BlocksTest, OneMoreItemIsABlockOfItsOwn) {
     EXPECT_THAT(blocks(126, 125), ElementsAre(Blocks::Block{0, 125}, Blocks::Block{125, 1}));
 }
 
-TEST(Blocks, AMultipleOfTheLimitLeavesNoRest) {
+TEST(BlocksTest, AMultipleOfTheLimitLeavesNoRest) {
     EXPECT_THAT(blocks(250, 125), ElementsAre(Blocks::Block{0, 125}, Blocks::Block{125, 125}));
 }
 
-TEST(Blocks, NothingGivesNoBlock) {
+TEST(BlocksTest, NothingGivesNoBlock) {
     EXPECT_THAT(blocks(0, 125), IsEmpty());
     EXPECT_THAT(blocks(-3, 125), IsEmpty());
 }
 
-TEST(Blocks, ALimitBelowOneCountsAsOne) {
+TEST(BlocksTest, ALimitBelowOneCountsAsOne) {
     EXPECT_THAT(blocks(2, 0), ElementsAre(Blocks::Block{0, 1}, Blocks::Block{1, 1}));
     EXPECT_THAT(blocks(2, -7), ElementsAre(Blocks::Block{0, 1}, Blocks::Block{1, 1}));
 }
 
-TEST(Blocks, EveryItemIsCoveredOnceInOrder) {
+TEST(BlocksTest, EveryItemIsCoveredOnceInOrder) {
     for (int count = 0; count < 60; ++count) {
         for (int limit = 1; limit < 20; ++limit) {
             int next = 0;

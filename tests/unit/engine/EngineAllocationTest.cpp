@@ -10,9 +10,9 @@ namespace {
 
 using testing_support::AllocationCounter;
 
-class Allocation : public testing::Test {
+class EngineAllocationTest : public testing::Test {
   protected:
-    Allocation() { driver_.setLogging(false); }
+    EngineAllocationTest() { driver_.setLogging(false); }
 
     FakeDriver driver_;
     std::array<unsigned char, 2000> value_{};
@@ -20,7 +20,7 @@ class Allocation : public testing::Test {
 
 }  // namespace
 
-TEST_F(Allocation, BlockReadsOfOneRequestTakeNothingFromTheHeap) {
+TEST_F(EngineAllocationTest, BlockReadsOfOneRequestTakeNothingFromTheHeap) {
     struct Row {
         const char* uri;
         int length;
@@ -38,7 +38,7 @@ TEST_F(Allocation, BlockReadsOfOneRequestTakeNothingFromTheHeap) {
     }
 }
 
-TEST_F(Allocation, TagReadsAndWritesOfOneRequestTakeNothingFromTheHeap) {
+TEST_F(EngineAllocationTest, TagReadsAndWritesOfOneRequestTakeNothingFromTheHeap) {
     for (const char* uri : {"1?REG?0?short", "1?REG?0.5?boolean", "1?REG?0?double-8",
                             "1?REG?0?string-63", "1?LONG?0?float", "1?COIL?3?boolean-100"}) {
         const ITag* tag = driver_.tag(uri);
@@ -50,7 +50,7 @@ TEST_F(Allocation, TagReadsAndWritesOfOneRequestTakeNothingFromTheHeap) {
     }
 }
 
-TEST_F(Allocation, BitBlocksAndArrayItemsTakeNothingFromTheHeap) {
+TEST_F(EngineAllocationTest, BitBlocksAndArrayItemsTakeNothingFromTheHeap) {
     const ITag* coils = driver_.tag("1?COIL?3?boolean-1968");
     const ITag* array = driver_.tag("1?REG?0?short-120(swap4)");
     const AllocationCounter counter;
@@ -63,7 +63,7 @@ TEST_F(Allocation, BitBlocksAndArrayItemsTakeNothingFromTheHeap) {
     EXPECT_TRUE(item);
 }
 
-TEST_F(Allocation, CounterSeesWhatTheHeapGives) {
+TEST_F(EngineAllocationTest, CounterSeesWhatTheHeapGives) {
     const ITag* tag = driver_.tag("1?REG?0?short-300");
     const AllocationCounter counter;
     EXPECT_NE(driver_.ReadBlock(tag, value_.data(), 600), 0);

@@ -13,7 +13,7 @@ using Bytes = std::vector<unsigned char>;
 
 constexpr unsigned char kUntouched = 0xA5;
 
-class Read : public testing::Test {
+class EngineReadTest : public testing::Test {
   protected:
     Bytes read(const std::string& uri) {
         const ITag* tag = driver_.tag(uri);
@@ -43,7 +43,7 @@ class Read : public testing::Test {
 
 }  // namespace
 
-TEST_F(Read, EveryTypeAtEveryLengthEqualsTheRegisters) {
+TEST_F(EngineReadTest, EveryTypeAtEveryLengthEqualsTheRegisters) {
     for (const char* memory : {"REG", "IREG", "LONG", "BYTE"}) {
         const int itemLength = driver_.memory(memory).itemLength();
         for (const TypeText& type : registerTypes()) {
@@ -55,7 +55,7 @@ TEST_F(Read, EveryTypeAtEveryLengthEqualsTheRegisters) {
     }
 }
 
-TEST_F(Read, BitsInsideRegistersBeginAtTheSubIndex) {
+TEST_F(EngineReadTest, BitsInsideRegistersBeginAtTheSubIndex) {
     for (const char* memory : {"REG", "LONG"}) {
         const int itemBits = driver_.memory(memory).itemLength() * 8;
         for (int subIndex = 0; subIndex < 40; ++subIndex) {
@@ -69,11 +69,11 @@ TEST_F(Read, BitsInsideRegistersBeginAtTheSubIndex) {
     }
 }
 
-TEST_F(Read, SubIndexMovesBitsOnly) {
+TEST_F(EngineReadTest, SubIndexMovesBitsOnly) {
     EXPECT_EQ(driver_.memory("REG").bytes(77, 2), read("1?REG?77.5?short"));
 }
 
-TEST_F(Read, BitsOfABitMemoryBeginAtTheOffset) {
+TEST_F(EngineReadTest, BitsOfABitMemoryBeginAtTheOffset) {
     for (int offset = 0; offset < 18; ++offset) {
         for (const int count : {1, 2, 7, 8, 9, 64, 500, 2000, 2001, 4100}) {
             const std::string uri =
@@ -83,7 +83,7 @@ TEST_F(Read, BitsOfABitMemoryBeginAtTheOffset) {
     }
 }
 
-TEST_F(Read, RequestsAreCutAtTheBlockLimit) {
+TEST_F(EngineReadTest, RequestsAreCutAtTheBlockLimit) {
     struct Row {
         const char* uri;
         const char* calls;
@@ -114,13 +114,13 @@ TEST_F(Read, RequestsAreCutAtTheBlockLimit) {
     }
 }
 
-TEST_F(Read, LimitThatIsNoMultipleOfEightKeepsTheBitPositions) {
+TEST_F(EngineReadTest, LimitThatIsNoMultipleOfEightKeepsTheBitPositions) {
     driver_.setLimit(13);
     EXPECT_EQ(bitsOf("COIL", 5, 40), read("1?COIL?5?boolean-40"));
     EXPECT_EQ("readBits 5+13, readBits 18+13, readBits 31+13, readBits 44+1", driver_.calls());
 }
 
-TEST_F(Read, LimitBelowOneItemReadsItemByItem) {
+TEST_F(EngineReadTest, LimitBelowOneItemReadsItemByItem) {
     driver_.setLimit(0);
     EXPECT_EQ(driver_.memory("REG").bytes(10, 4), read("1?REG?10?int"));
     EXPECT_EQ("read 10+1, read 11+1", driver_.calls());
@@ -128,7 +128,7 @@ TEST_F(Read, LimitBelowOneItemReadsItemByItem) {
     EXPECT_EQ("readBits 6+1, readBits 7+1, readBits 8+1", driver_.calls());
 }
 
-TEST_F(Read, AreaOfTheDriverItselfIsOneCall) {
+TEST_F(EngineReadTest, AreaOfTheDriverItselfIsOneCall) {
     EXPECT_EQ(driver_.memory("AREA").bytes(0, 4), read("1?AREA?0?unsignedInt"));
     EXPECT_EQ("read 0+1", driver_.calls());
     EXPECT_EQ(bitsOf("FLAG", 0, 1), read("1?FLAG?0?boolean"));
@@ -137,14 +137,14 @@ TEST_F(Read, AreaOfTheDriverItselfIsOneCall) {
     EXPECT_EQ("readBits 0+8", driver_.calls());
 }
 
-TEST_F(Read, LastAddressIsReached) {
+TEST_F(EngineReadTest, LastAddressIsReached) {
     EXPECT_EQ(driver_.memory("REG").bytes(65535, 2), read("1?REG?65535?short"));
     EXPECT_EQ(driver_.memory("REG").bytes(65535, 1), read("1?REG?65535?byte"));
     EXPECT_EQ(bitsOf("COIL", 65535, 1), read("1?COIL?65535?boolean"));
     EXPECT_EQ(bitsOf("SMALL", 9, 1), read("1?SMALL?9?boolean"));
 }
 
-TEST_F(Read, TagsOutsideTheMemoryAreRefusedBeforeAnythingIsSent) {
+TEST_F(EngineReadTest, TagsOutsideTheMemoryAreRefusedBeforeAnythingIsSent) {
     const std::string outside = "Tag exceeds the memory area";
     expectRefused("1?REG?65535?int", -1, outside);
     expectRefused("1?REG?65534?string-5", -1, outside);
@@ -156,14 +156,14 @@ TEST_F(Read, TagsOutsideTheMemoryAreRefusedBeforeAnythingIsSent) {
     EXPECT_EQ("", driver_.calls());
 }
 
-TEST_F(Read, TagsWithoutLengthAreRefusedBeforeAnythingIsSent) {
+TEST_F(EngineReadTest, TagsWithoutLengthAreRefusedBeforeAnythingIsSent) {
     for (const char* uri : {"1?REG?0?int-0", "1?REG?0?int--3", "1?REG?0?string-", "1?REG?0?object",
                             "1?REG?0.3?boolean-0", "1?COIL?3?boolean-0", "1?COIL?3?boolean--20"})
         expectRefused(uri, -1, "Tag length is not positive");
     EXPECT_EQ("", driver_.calls());
 }
 
-TEST_F(Read, OtherUnusableTagsAreRefusedBeforeAnythingIsSent) {
+TEST_F(EngineReadTest, OtherUnusableTagsAreRefusedBeforeAnythingIsSent) {
     expectRefused("1?REG?5.-1?boolean", -1, "Tag's bit index is negative");
     expectRefused("1?REG?5.-3?boolean-16", -1, "Tag's bit index is negative");
     expectRefused("1?NOWHERE?5?short", -1, "Tag has no memory type");
@@ -171,7 +171,7 @@ TEST_F(Read, OtherUnusableTagsAreRefusedBeforeAnythingIsSent) {
     EXPECT_EQ("", driver_.calls());
 }
 
-TEST_F(Read, ConversionsAreApplied) {
+TEST_F(EngineReadTest, ConversionsAreApplied) {
     driver_.memory("REG").setBytes(4, {0x34, 0x12, 0x78, 0x56});
     EXPECT_EQ((Bytes{0xD2, 0x04}), read("1?REG?4?short(bcd)"));
     EXPECT_EQ((Bytes{0x12, 0x34, 0x56, 0x78}), read("1?REG?4?int(swap2)"));
@@ -180,13 +180,13 @@ TEST_F(Read, ConversionsAreApplied) {
     EXPECT_EQ((Bytes{0}), read("1?COIL?9?boolean(inv)"));
 }
 
-TEST_F(Read, RefusedConversionLeavesTheValue) {
+TEST_F(EngineReadTest, RefusedConversionLeavesTheValue) {
     driver_.memory("REG").setBytes(4, {0x3A, 0x12});
     expectRefused("1?REG?4?short(bcd)", -9, "read conversion error");
     expectRefused("1?REG?4?string-3(swap2)", -9, "read conversion error");
 }
 
-TEST_F(Read, FailureInAnyBlockLeavesTheValue) {
+TEST_F(EngineReadTest, FailureInAnyBlockLeavesTheValue) {
     for (const char* uri : {"1?REG?10?short-300", "1?COIL?3?boolean-4100"}) {
         const ITag* tag = driver_.tag(uri);
         for (int call = 1; call <= 3; ++call) {

@@ -11,9 +11,9 @@ namespace {
 
 constexpr int kRounds = 10000;
 
-class Threads : public testing::Test {
+class EngineThreadsTest : public testing::Test {
   protected:
-    Threads() {
+    EngineThreadsTest() {
         driver_.setLogging(false);
         driver_.onCall(std::this_thread::yield);
         driver_.memory("REG").setBytes(40, {0, 0, 0, 0});
@@ -32,7 +32,7 @@ class Threads : public testing::Test {
 }  // namespace
 
 // Each thread reads its own bit back after every write: no one else may change it.
-TEST_F(Threads, WritingDifferentBitsOfOneRegisterLosesNoUpdate) {
+TEST_F(EngineThreadsTest, WritingDifferentBitsOfOneRegisterLosesNoUpdate) {
     std::array<int, 2> lost{};
     const auto flip = [this](const ITag* tag, int& mistakes) {
         for (int round = 0; round <= kRounds; ++round) {
@@ -52,7 +52,7 @@ TEST_F(Threads, WritingDifferentBitsOfOneRegisterLosesNoUpdate) {
 
 // Three bytes are written with a read of both registers in front: its write back must not bring
 // the old fourth byte back when the other thread has written all four meanwhile.
-TEST_F(Threads, WholeWriteIsNotUndoneByAWriteBack) {
+TEST_F(EngineThreadsTest, WholeWriteIsNotUndoneByAWriteBack) {
     const ITag* threeBytes = driver_.tag("1?REG?40?string-3");
     const ITag* fourBytes = driver_.tag("1?REG?40?unsignedInt");
     std::array<int, 2> lost{};
@@ -76,7 +76,7 @@ TEST_F(Threads, WholeWriteIsNotUndoneByAWriteBack) {
     EXPECT_EQ(0, lost[1]);
 }
 
-TEST_F(Threads, WritingDifferentItemsOfOneRegisterLosesNoUpdate) {
+TEST_F(EngineThreadsTest, WritingDifferentItemsOfOneRegisterLosesNoUpdate) {
     const ITag* array = driver_.tag("1?REG?40?unsignedByte-4");
     std::array<int, 2> lost{};
     const auto count = [this, array](int index, int& mistakes) {

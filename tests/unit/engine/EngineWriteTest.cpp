@@ -11,7 +11,7 @@ namespace {
 
 using Bytes = std::vector<unsigned char>;
 
-class Write : public testing::Test {
+class EngineWriteTest : public testing::Test {
   protected:
     static Bytes value(int length, bool bits) {
         Bytes bytes;
@@ -33,7 +33,7 @@ class Write : public testing::Test {
 
 }  // namespace
 
-TEST_F(Write, EveryTypeAtEveryLengthChangesItsOwnBytesOnly) {
+TEST_F(EngineWriteTest, EveryTypeAtEveryLengthChangesItsOwnBytesOnly) {
     for (const char* memory : {"REG", "LONG", "BYTE"}) {
         FakeMemory& area = driver_.memory(memory);
         for (const TypeText& type : registerTypes()) {
@@ -49,7 +49,7 @@ TEST_F(Write, EveryTypeAtEveryLengthChangesItsOwnBytesOnly) {
     }
 }
 
-TEST_F(Write, BitsInsideRegistersLeaveTheirNeighboursAlone) {
+TEST_F(EngineWriteTest, BitsInsideRegistersLeaveTheirNeighboursAlone) {
     for (const char* memory : {"REG", "LONG"}) {
         FakeMemory& area = driver_.memory(memory);
         for (int subIndex = 0; subIndex < 40; ++subIndex) {
@@ -70,7 +70,7 @@ TEST_F(Write, BitsInsideRegistersLeaveTheirNeighboursAlone) {
     }
 }
 
-TEST_F(Write, BitsOfABitMemoryLeaveTheirNeighboursAlone) {
+TEST_F(EngineWriteTest, BitsOfABitMemoryLeaveTheirNeighboursAlone) {
     for (const int limit : {1968, 13}) {
         driver_.setLimit(limit);
         for (int offset = 0; offset < 18; ++offset) {
@@ -88,7 +88,7 @@ TEST_F(Write, BitsOfABitMemoryLeaveTheirNeighboursAlone) {
     }
 }
 
-TEST_F(Write, RequestsAreCutAtTheBlockLimit) {
+TEST_F(EngineWriteTest, RequestsAreCutAtTheBlockLimit) {
     struct Row {
         const char* uri;
         const char* calls;
@@ -109,7 +109,7 @@ TEST_F(Write, RequestsAreCutAtTheBlockLimit) {
     }
 }
 
-TEST_F(Write, PartOfARegisterIsReadFirst) {
+TEST_F(EngineWriteTest, PartOfARegisterIsReadFirst) {
     struct Row {
         const char* uri;
         const char* calls;
@@ -128,23 +128,23 @@ TEST_F(Write, PartOfARegisterIsReadFirst) {
     }
 }
 
-TEST_F(Write, RegistersInFrontOfTheBitAreNotTouched) {
+TEST_F(EngineWriteTest, RegistersInFrontOfTheBitAreNotTouched) {
     EXPECT_NE(write("1?REG?10.37?boolean", {1}), 0);
     EXPECT_EQ("read 12+1, write 12+1", driver_.calls());
 }
 
-TEST_F(Write, WholeRegistersOfBitsNeedNoRead) {
+TEST_F(EngineWriteTest, WholeRegistersOfBitsNeedNoRead) {
     EXPECT_NE(write("1?REG?10.16?boolean-32", value(32, true)), 0);
     EXPECT_EQ("write 11+2", driver_.calls());
 }
 
-TEST_F(Write, LimitBelowOneItemWritesItemByItem) {
+TEST_F(EngineWriteTest, LimitBelowOneItemWritesItemByItem) {
     driver_.setLimit(0);
     EXPECT_NE(write("1?REG?10?int", value(4, false)), 0);
     EXPECT_EQ("write 10+1, write 11+1", driver_.calls());
 }
 
-TEST_F(Write, AreaOfTheDriverItselfIsOneCallWithoutARead) {
+TEST_F(EngineWriteTest, AreaOfTheDriverItselfIsOneCallWithoutARead) {
     EXPECT_NE(write("1?AREA?0?unsignedInt", {1, 2, 3, 4}), 0);
     EXPECT_EQ("write 0+1", driver_.calls());
     EXPECT_EQ((Bytes{1, 2, 3, 4}), driver_.memory("AREA").bytes(0, 4));
@@ -158,7 +158,7 @@ TEST_F(Write, AreaOfTheDriverItselfIsOneCallWithoutARead) {
     EXPECT_EQ("writeBits 0+1", driver_.calls());
 }
 
-TEST_F(Write, NothingIsWrittenWhenTheReadFails) {
+TEST_F(EngineWriteTest, NothingIsWrittenWhenTheReadFails) {
     for (const char* uri : {"1?REG?10.3?boolean", "1?REG?10?byte", "1?REG?10?string-301"}) {
         const Bytes before = driver_.memory("REG").image();
         driver_.failCall(1);
@@ -169,20 +169,20 @@ TEST_F(Write, NothingIsWrittenWhenTheReadFails) {
     }
 }
 
-TEST_F(Write, FailureEndsTheBlocks) {
+TEST_F(EngineWriteTest, FailureEndsTheBlocks) {
     driver_.failCall(2);
     EXPECT_EQ(0, write("1?REG?10?short-300", value(600, false)));
     EXPECT_EQ(-4, driver_.GetLastError());
     EXPECT_EQ("write 10+123, write 133+123", driver_.calls());
 }
 
-TEST_F(Write, ReadOnlyMemoryIsRefused) {
+TEST_F(EngineWriteTest, ReadOnlyMemoryIsRefused) {
     expectRefused("1?IREG?10?short", -1, "Memory type is read only");
     expectRefused("1?IREG?10.3?boolean", -1, "Memory type is read only");
     EXPECT_EQ("", driver_.calls());
 }
 
-TEST_F(Write, UnusableTagsAreRefusedBeforeAnythingIsSent) {
+TEST_F(EngineWriteTest, UnusableTagsAreRefusedBeforeAnythingIsSent) {
     expectRefused("1?REG?65535?int", -1, "Tag exceeds the memory area");
     expectRefused("1?REG?65535.16?boolean", -1, "Tag exceeds the memory area");
     expectRefused("1?COIL?65535?boolean-2", -1, "Tag exceeds the memory area");
@@ -194,7 +194,7 @@ TEST_F(Write, UnusableTagsAreRefusedBeforeAnythingIsSent) {
     EXPECT_EQ("", driver_.calls());
 }
 
-TEST_F(Write, ConversionsAreApplied) {
+TEST_F(EngineWriteTest, ConversionsAreApplied) {
     EXPECT_NE(write("1?REG?4?short(bcd)", {0xD2, 0x04}), 0);
     EXPECT_EQ((Bytes{0x34, 0x12}), driver_.memory("REG").bytes(4, 2));
     EXPECT_NE(write("1?REG?4?int(swap2)", {1, 2, 3, 4}), 0);
@@ -203,7 +203,7 @@ TEST_F(Write, ConversionsAreApplied) {
     EXPECT_EQ((Bytes{2}), driver_.memory("REG").bytes(4, 1));
 }
 
-TEST_F(Write, RefusedConversionWritesNothing) {
+TEST_F(EngineWriteTest, RefusedConversionWritesNothing) {
     expectRefused("1?REG?4?short(neg,bcd)", -9, "write conversion error");
     expectRefused("1?REG?4?string-3(swap2)", -9, "write conversion error");
     expectRefused("1?COIL?4?boolean(bcd,neg)", -9, "write conversion error");

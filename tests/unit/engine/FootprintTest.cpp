@@ -28,7 +28,7 @@ void PrintTo(const Footprint& place, std::ostream* out) {
 
 }  // namespace engine
 
-TEST(Footprint, WholeTagCoversItsItems) {
+TEST(FootprintTest, WholeTagCoversItsItems) {
     struct Row {
         const char* uri;
         BitRange range;
@@ -59,7 +59,7 @@ TEST(Footprint, WholeTagCoversItsItems) {
     }
 }
 
-TEST(Footprint, ArrayItemTakesItsSwapPartnersAlong) {
+TEST(FootprintTest, ArrayItemTakesItsSwapPartnersAlong) {
     struct Row {
         const char* uri;
         int index;
@@ -86,14 +86,14 @@ TEST(Footprint, ArrayItemTakesItsSwapPartnersAlong) {
     }
 }
 
-TEST(Footprint, PartOfABitMemoryKeepsTheBitPosition) {
+TEST(FootprintTest, PartOfABitMemoryKeepsTheBitPosition) {
     FakeDriver driver;
     const ProtgenTag& tag = make(driver, "1?COIL?11?boolean-20");
     EXPECT_EQ((Footprint{17, 1, 8, 1, false}), engine::footprint(tag, {9, 10}));
     EXPECT_EQ((Footprint{15, 2, 0, 2, false}), engine::footprint(tag, {7, 9}));
 }
 
-TEST(Footprint, BufferByteFollowsTheItem) {
+TEST(FootprintTest, BufferByteFollowsTheItem) {
     FakeDriver driver;
     EXPECT_EQ(14, engine::byteOfItem(make(driver, "1?REG?5?short"), 5, 7));
     EXPECT_EQ(28, engine::byteOfItem(make(driver, "1?LONG?5?int"), 5, 7));
@@ -102,7 +102,7 @@ TEST(Footprint, BufferByteFollowsTheItem) {
     EXPECT_EQ(250, engine::byteOfItem(make(driver, "1?COIL?5?boolean"), 5, 2000));
 }
 
-TEST(Footprint, FaultsAreNamed) {
+TEST(FootprintTest, FaultsAreNamed) {
     struct Row {
         const char* uri;
         const char* fault;

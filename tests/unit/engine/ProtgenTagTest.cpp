@@ -19,7 +19,7 @@ const ProtgenTag& asProtgen(const ITag* tag) {
 
 }  // namespace
 
-TEST(ProtgenTag, AddressFieldGivesOffsetAndSubIndex) {
+TEST(ProtgenTagTest, AddressFieldGivesOffsetAndSubIndex) {
     struct Row {
         const char* uri;
         int offset;
@@ -50,7 +50,7 @@ TEST(ProtgenTag, AddressFieldGivesOffsetAndSubIndex) {
     }
 }
 
-TEST(ProtgenTag, AddressFieldIsFoundByName) {
+TEST(ProtgenTagTest, AddressFieldIsFoundByName) {
     constexpr const char* kOther[] = {"arrayindex.subindex", "memorytype", nullptr};
     EXPECT_EQ(5, ProtgenTag("5.2?REG", kOther).offset());
     EXPECT_EQ(2, ProtgenTag("5.2?REG", kOther).subIndex());
@@ -59,14 +59,14 @@ TEST(ProtgenTag, AddressFieldIsFoundByName) {
     EXPECT_EQ(0, ProtgenTag("5.2?REG", nullptr).offset());
 }
 
-TEST(ProtgenTag, RegisterTagKeepsItemAddressAndSubIndex) {
+TEST(ProtgenTagTest, RegisterTagKeepsItemAddressAndSubIndex) {
     FakeDriver driver;
     const ITag* tag = driver.tag("1?REG?1000.21?boolean-4");
     EXPECT_EQ(1000U, tag->GetByteOffset());
     EXPECT_EQ(21, tag->GetBitIndex());
 }
 
-TEST(ProtgenTag, BitMemoryTagTakesItsBitFromTheOffset) {
+TEST(ProtgenTagTest, BitMemoryTagTakesItsBitFromTheOffset) {
     FakeDriver driver;
     const ITag* tag = driver.tag("1?COIL?1003.5?boolean");
     EXPECT_EQ(125U, tag->GetByteOffset());
@@ -74,14 +74,14 @@ TEST(ProtgenTag, BitMemoryTagTakesItsBitFromTheOffset) {
     EXPECT_EQ(1003, ProtUtilsN::getStartingBit(tag));
 }
 
-TEST(ProtgenTag, BitPositionFollowsTheNormalisedOffset) {
+TEST(ProtgenTagTest, BitPositionFollowsTheNormalisedOffset) {
     FakeDriver driver;
     const std::unique_ptr<ITag> copy(driver.tag("1?COIL?1003?boolean")->Clone());
     static_cast<ProtgenTag*>(copy.get())->setOffset(14);
     EXPECT_EQ(14, ProtUtilsN::getStartingBit(copy.get()));
 }
 
-TEST(ProtgenTag, PackedLengthReachesFromTheFirstItemToTheLastBit) {
+TEST(ProtgenTagTest, PackedLengthReachesFromTheFirstItemToTheLastBit) {
     struct Row {
         const char* uri;
         int length;
@@ -105,20 +105,20 @@ TEST(ProtgenTag, PackedLengthReachesFromTheFirstItemToTheLastBit) {
         EXPECT_EQ(row.length, driver.tag(row.uri)->PackedLen()) << row.uri;
 }
 
-TEST(ProtgenTag, PackedLengthOfAHugeTagDoesNotWrap) {
+TEST(ProtgenTagTest, PackedLengthOfAHugeTagDoesNotWrap) {
     FakeDriver driver;
     EXPECT_EQ(static_cast<int>((2LL * std::numeric_limits<int>::max() + 7) / 8),
               driver.tag("1?REG?0.2147483647?boolean-2147483647")->PackedLen());
 }
 
-TEST(ProtgenTag, ReadOnlyComesFromTheMemoryType) {
+TEST(ProtgenTagTest, ReadOnlyComesFromTheMemoryType) {
     FakeDriver driver;
     EXPECT_TRUE(driver.tag("1?IREG?0?short")->IsReadOnly());
     EXPECT_FALSE(driver.tag("1?REG?0?short")->IsReadOnly());
     EXPECT_FALSE(driver.tag("1?NOWHERE?0?short")->IsReadOnly());
 }
 
-TEST(ProtgenTag, ItemLengthIsThatOfTheMemory) {
+TEST(ProtgenTagTest, ItemLengthIsThatOfTheMemory) {
     FakeDriver driver;
     EXPECT_EQ(2, asProtgen(driver.tag("1?REG?0?double")).memoryItemLength());
     EXPECT_EQ(4, asProtgen(driver.tag("1?LONG?0?double")).memoryItemLength());
@@ -130,7 +130,7 @@ TEST(ProtgenTag, ItemLengthIsThatOfTheMemory) {
     EXPECT_FALSE(asProtgen(driver.tag("1?NOWHERE?0?boolean")).inBitMemory());
 }
 
-TEST(ProtgenTag, CloneCarriesEverything) {
+TEST(ProtgenTagTest, CloneCarriesEverything) {
     FakeDriver driver;
     const ProtgenTag& tag = asProtgen(driver.tag("3?REG?20.4?short-3(swap2, neg)"));
     const std::unique_ptr<ITag> clone(tag.Clone());

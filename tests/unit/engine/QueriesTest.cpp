@@ -7,7 +7,7 @@
 
 namespace {
 
-class Queries : public testing::Test {
+class QueriesTest : public testing::Test {
   protected:
     const ITag* tag(const std::string& uri) { return driver_.tag(uri); }
     bool optimized(const char* a, const char* b, bool write) {
@@ -20,13 +20,13 @@ class Queries : public testing::Test {
 
 }  // namespace
 
-TEST_F(Queries, OneBlockServesTagsOfTheSameMemoryOfOneNode) {
+TEST_F(QueriesTest, OneBlockServesTagsOfTheSameMemoryOfOneNode) {
     EXPECT_TRUE(optimized("1?REG?0?short", "1?REG?900?double", false));
     EXPECT_TRUE(optimized("1?REG?0?short", "1?REG?900?double", true));
     EXPECT_TRUE(optimized("1?COIL?0?boolean", "1?COIL?9?boolean-7", false));
 }
 
-TEST_F(Queries, NodesModelsAndMemoriesNeverMix) {
+TEST_F(QueriesTest, NodesModelsAndMemoriesNeverMix) {
     EXPECT_FALSE(optimized("1?REG?0?short", "2?REG?1?short", false));
     EXPECT_FALSE(optimized("1?REG?0?short", "9?REG?1?short", false));
     EXPECT_FALSE(optimized("1?REG?0?short", "1?IREG?1?short", false));
@@ -34,17 +34,17 @@ TEST_F(Queries, NodesModelsAndMemoriesNeverMix) {
     EXPECT_FALSE(optimized("1?NOWHERE?0?short", "1?NOWHERE?1?short", false));
 }
 
-TEST_F(Queries, ReadOnlyMemoryIsOptimizedForReadingOnly) {
+TEST_F(QueriesTest, ReadOnlyMemoryIsOptimizedForReadingOnly) {
     EXPECT_TRUE(optimized("1?IREG?0?short", "1?IREG?1?short", false));
     EXPECT_FALSE(optimized("1?IREG?0?short", "1?IREG?1?short", true));
 }
 
-TEST_F(Queries, AreasOfTheDriverItselfAreNotOptimized) {
+TEST_F(QueriesTest, AreasOfTheDriverItselfAreNotOptimized) {
     EXPECT_FALSE(optimized("1?AREA?0?unsignedInt", "1?AREA?0?unsignedInt", false));
     EXPECT_FALSE(optimized("1?FLAG?0?boolean", "1?FLAG?0?boolean", true));
 }
 
-TEST_F(Queries, RegisterTagsAreOrderedByBit) {
+TEST_F(QueriesTest, RegisterTagsAreOrderedByBit) {
     EXPECT_TRUE(before("1?REG?1?short", "1?REG?2?short"));
     EXPECT_FALSE(before("1?REG?2?short", "1?REG?2?int"));
     EXPECT_TRUE(before("1?REG?2.3?boolean", "1?REG?2.4?boolean"));
@@ -54,24 +54,24 @@ TEST_F(Queries, RegisterTagsAreOrderedByBit) {
     EXPECT_FALSE(before("1?REG?2.0?short", "1?REG?2.9?short")) << "no bits, no sub-index";
 }
 
-TEST_F(Queries, BitTagsAreOrderedByTheirBit) {
+TEST_F(QueriesTest, BitTagsAreOrderedByTheirBit) {
     EXPECT_TRUE(before("1?COIL?8?boolean", "1?COIL?9?boolean"));
     EXPECT_FALSE(before("1?COIL?9?boolean", "1?COIL?8?boolean"));
     EXPECT_FALSE(before("1?COIL?9.1?boolean", "1?COIL?9.2?boolean"));
 }
 
-TEST_F(Queries, NodeIsTheTagsNode) {
+TEST_F(QueriesTest, NodeIsTheTagsNode) {
     EXPECT_EQ(7, driver_.GetNodeID(tag("7?REG?0?short")));
 }
 
-TEST_F(Queries, BitBlocksBelongToBitMemories) {
+TEST_F(QueriesTest, BitBlocksBelongToBitMemories) {
     EXPECT_TRUE(driver_.CanReadBitBlock(tag("1?COIL?0?boolean")));
     EXPECT_TRUE(driver_.CanWriteBitBlock(tag("1?COIL?0?boolean")));
     EXPECT_FALSE(driver_.CanReadBitBlock(tag("1?REG?0?boolean")));
     EXPECT_FALSE(driver_.CanWriteBitBlock(tag("1?REG?0?boolean")));
 }
 
-TEST_F(Queries, PartOfARegisterNeedsAReadBeforeAWrite) {
+TEST_F(QueriesTest, PartOfARegisterNeedsAReadBeforeAWrite) {
     struct Row {
         const char* uri;
         bool needed;
@@ -90,17 +90,17 @@ TEST_F(Queries, PartOfARegisterNeedsAReadBeforeAWrite) {
         EXPECT_EQ(row.needed, driver_.NeedsReadBeforeWrite(tag(row.uri))) << row.uri;
 }
 
-TEST_F(Queries, BitLimitFollowsTheItemLimit) {
+TEST_F(QueriesTest, BitLimitFollowsTheItemLimit) {
     const auto* coil = static_cast<const ProtgenTag*>(tag("1?COIL?0?boolean"));
     EXPECT_EQ(2000, driver_.getMaxBitCount(coil, false));
     EXPECT_EQ(1968, driver_.getMaxBitCount(coil, true));
 }
 
-TEST_F(Queries, ItemsOfArraysAreNotAddressedUnlessTheDriverSaysSo) {
+TEST_F(QueriesTest, ItemsOfArraysAreNotAddressedUnlessTheDriverSaysSo) {
     EXPECT_EQ(0, driver_.ProtgenProtocol::arrayItemByTag());
 }
 
-TEST_F(Queries, DatagramLimitsComeFromTheModel) {
+TEST_F(QueriesTest, DatagramLimitsComeFromTheModel) {
     EXPECT_EQ(3, driver_.MaxDatagramItems(tag("1?REG?0?short")));
     EXPECT_EQ(10, driver_.MaxDatagramLength(tag("1?REG?0?short")));
     const ProtgenTag loose("1?REG?0?short", nullptr);
@@ -108,7 +108,7 @@ TEST_F(Queries, DatagramLimitsComeFromTheModel) {
     EXPECT_EQ(0, driver_.MaxDatagramLength(&loose));
 }
 
-TEST_F(Queries, DatagramHoldsTagsOfOneNodeWhoseMemoriesTakePart) {
+TEST_F(QueriesTest, DatagramHoldsTagsOfOneNodeWhoseMemoriesTakePart) {
     const ITag* reg = tag("1?REG?0?short");
     EXPECT_TRUE(driver_.CanCoexistInDatagram(reg, tag("1?LONG?0?int")));
     EXPECT_FALSE(driver_.CanCoexistInDatagram(reg, tag("1?COIL?0?boolean")));
@@ -118,7 +118,7 @@ TEST_F(Queries, DatagramHoldsTagsOfOneNodeWhoseMemoriesTakePart) {
     EXPECT_FALSE(driver_.CanCoexistInDatagram(reg, tag("1?NOWHERE?0?short")));
 }
 
-TEST_F(Queries, DatagramGrowsToItsLimits) {
+TEST_F(QueriesTest, DatagramGrowsToItsLimits) {
     const std::array<const ITag*, 3> tags = {tag("1?REG?0?int"), tag("1?REG?4?int"),
                                              tag("1?REG?8?byte")};
     EXPECT_TRUE(driver_.CanAddToDatagram(tags.data(), 0, tags[0]));
@@ -128,7 +128,7 @@ TEST_F(Queries, DatagramGrowsToItsLimits) {
     EXPECT_FALSE(driver_.CanAddToDatagram(tags.data(), 1, tag("2?REG?9?byte")));
 }
 
-TEST_F(Queries, DatagramReadIsRefusedUnlessTheDriverHasIt) {
+TEST_F(QueriesTest, DatagramReadIsRefusedUnlessTheDriverHasIt) {
     const ITag* reg = tag("1?REG?0?short");
     unsigned char data[2] = {7, 7};
     idal_error_t status = 5;
@@ -157,7 +157,7 @@ class DatagramDriver : public FakeDriver {
 
 }  // namespace
 
-TEST(DatagramHook, ReceivesTheTagsAndStoresTheStatus) {
+TEST_F(QueriesTest, DatagramHookReceivesTheTagsAndStoresTheStatus) {
     DatagramDriver driver;
     const std::array<const ITag*, 2> tags = {driver.tag("1?REG?4?byte"),
                                              driver.tag("1?REG?6?byte")};

@@ -12,7 +12,7 @@ using Bytes = std::vector<unsigned char>;
 
 constexpr unsigned char kUntouched = 0xA5;
 
-class ReadBlock : public testing::Test {
+class ReadBlockTest : public testing::Test {
   protected:
     // A guard byte behind the buffer shows a write past its end.
     Bytes read(const std::string& uri, int length) {
@@ -29,7 +29,7 @@ class ReadBlock : public testing::Test {
 
 }  // namespace
 
-TEST_F(ReadBlock, AnyLengthBeginsWithTheTagsFirstItem) {
+TEST_F(ReadBlockTest, AnyLengthBeginsWithTheTagsFirstItem) {
     for (const char* memory : {"REG", "LONG", "BYTE"}) {
         for (const int length : {1, 2, 3, 4, 5, 247, 248, 249, 250, 251, 252, 501, 1003}) {
             const std::string uri = std::string("1?") + memory + "?33?short";
@@ -39,12 +39,12 @@ TEST_F(ReadBlock, AnyLengthBeginsWithTheTagsFirstItem) {
     }
 }
 
-TEST_F(ReadBlock, PartOfTheLastItemIsReadWhole) {
+TEST_F(ReadBlockTest, PartOfTheLastItemIsReadWhole) {
     read("1?REG?33?short", 5);
     EXPECT_EQ("read 33+3", driver_.calls());
 }
 
-TEST_F(ReadBlock, FailureInAnyBlockLeavesTheBuffer) {
+TEST_F(ReadBlockTest, FailureInAnyBlockLeavesTheBuffer) {
     for (const int length : {500, 501}) {
         for (int call = 1; call <= 2; ++call) {
             Bytes data(static_cast<std::size_t>(length), kUntouched);
@@ -55,7 +55,7 @@ TEST_F(ReadBlock, FailureInAnyBlockLeavesTheBuffer) {
     }
 }
 
-TEST_F(ReadBlock, UnusableLengthsAreRefused) {
+TEST_F(ReadBlockTest, UnusableLengthsAreRefused) {
     struct Row {
         const char* uri;
         int length;
@@ -81,7 +81,7 @@ TEST_F(ReadBlock, UnusableLengthsAreRefused) {
     EXPECT_EQ("", driver_.calls());
 }
 
-TEST_F(ReadBlock, BitMemoryDeliversTheTagsOwnBits) {
+TEST_F(ReadBlockTest, BitMemoryDeliversTheTagsOwnBits) {
     Bytes data(2, 0);
     ASSERT_NE(driver_.ReadBlock(driver_.tag("1?COIL?21?boolean-10"), data.data(), 2), 0);
     EXPECT_EQ("readBits 21+10", driver_.calls());
@@ -91,13 +91,13 @@ TEST_F(ReadBlock, BitMemoryDeliversTheTagsOwnBits) {
     }
 }
 
-TEST_F(ReadBlock, BitMemoryFillsLongerBuffersToTheLastBit) {
+TEST_F(ReadBlockTest, BitMemoryFillsLongerBuffersToTheLastBit) {
     Bytes data(3, 0);
     ASSERT_NE(driver_.ReadBlock(driver_.tag("1?COIL?21?boolean"), data.data(), 3), 0);
     EXPECT_EQ("readBits 21+19", driver_.calls());
 }
 
-TEST_F(ReadBlock, BitBlockLandsAtTheOffsetsBitAndSparesTheOthers) {
+TEST_F(ReadBlockTest, BitBlockLandsAtTheOffsetsBitAndSparesTheOthers) {
     for (const int limit : {2000, 7}) {
         driver_.setLimit(limit);
         for (int offset = 16; offset < 24; ++offset) {
@@ -115,7 +115,7 @@ TEST_F(ReadBlock, BitBlockLandsAtTheOffsetsBitAndSparesTheOthers) {
     }
 }
 
-TEST_F(ReadBlock, BitBlockFailureInTheSecondRequestLeavesTheBuffer) {
+TEST_F(ReadBlockTest, BitBlockFailureInTheSecondRequestLeavesTheBuffer) {
     driver_.setLimit(10);
     driver_.failCall(2);
     Bytes data(4, kUntouched);
@@ -124,7 +124,7 @@ TEST_F(ReadBlock, BitBlockFailureInTheSecondRequestLeavesTheBuffer) {
     EXPECT_EQ("readBits 3+10, readBits 13+10", driver_.calls());
 }
 
-TEST_F(ReadBlock, RegistersHaveNoBitBlocks) {
+TEST_F(ReadBlockTest, RegistersHaveNoBitBlocks) {
     unsigned char data = kUntouched;
     EXPECT_EQ(0, driver_.ReadBitBlock(driver_.tag("1?REG?3?boolean"), &data, 1));
     EXPECT_EQ(-3, driver_.GetLastError());

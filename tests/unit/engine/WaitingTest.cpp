@@ -12,9 +12,9 @@
 
 namespace {
 
-class Waiting : public testing::Test {
+class WaitingTest : public testing::Test {
   protected:
-    Waiting() { driver_.setLogging(false); }
+    WaitingTest() { driver_.setLogging(false); }
 
     /// While `slow` hangs in its first hook call, the test's own thread runs `quick`.
     void whileHanging(const std::function<void()>& slow, const std::function<void()>& quick) {
@@ -58,7 +58,7 @@ constexpr const char* kWord = "1?REG?40?short";
 
 }  // namespace
 
-TEST_F(Waiting, OwnAreasOfTheDriverWaitForNobody) {
+TEST_F(WaitingTest, OwnAreasOfTheDriverWaitForNobody) {
     for (const char* slow : {kBit, kWord, "1?REG?40?short-200", "1?AREA?0?unsignedInt"})
         whileHanging(writing(slow), [this] {
             write("1?AREA?0?unsignedInt");
@@ -67,7 +67,7 @@ TEST_F(Waiting, OwnAreasOfTheDriverWaitForNobody) {
         });
 }
 
-TEST_F(Waiting, WholeWritesWaitForNoWholeWrite) {
+TEST_F(WaitingTest, WholeWritesWaitForNoWholeWrite) {
     whileHanging(writing(kWord), [this] {
         write(kWord);
         write("1?REG?40?short-200");
@@ -76,7 +76,7 @@ TEST_F(Waiting, WholeWritesWaitForNoWholeWrite) {
     });
 }
 
-TEST_F(Waiting, ChangeKeepsNobodyOutOfOtherNodesAndAreas) {
+TEST_F(WaitingTest, ChangeKeepsNobodyOutOfOtherNodesAndAreas) {
     whileHanging(writing(kBit), [this] {
         for (const char* uri : {"2?REG?40?short", "2?REG?40.3?boolean", "1?LONG?40.3?boolean",
                                 "1?COIL?40?boolean-9", "9?REG?40?string-3"})
@@ -84,7 +84,7 @@ TEST_F(Waiting, ChangeKeepsNobodyOutOfOtherNodesAndAreas) {
     });
 }
 
-TEST_F(Waiting, ReadsWaitForNoWrite) {
+TEST_F(WaitingTest, ReadsWaitForNoWrite) {
     whileHanging(writing(kBit), [this] {
         std::array<unsigned char, 2> value{};
         EXPECT_NE(0, driver_.Read(driver_.tag(kWord), value.data()));
@@ -92,7 +92,7 @@ TEST_F(Waiting, ReadsWaitForNoWrite) {
 }
 
 /// What a write back would bring back is written before or after it, never in between.
-TEST_F(Waiting, WholeWriteOfTheSameAreaWaitsForTheWriteBack) {
+TEST_F(WaitingTest, WholeWriteOfTheSameAreaWaitsForTheWriteBack) {
     driver_.memory("REG").setBytes(40, {0, 0});
     std::thread whole;
     std::atomic<int> calls = 0;
@@ -112,7 +112,7 @@ TEST_F(Waiting, WholeWriteOfTheSameAreaWaitsForTheWriteBack) {
     EXPECT_EQ((std::vector<unsigned char>{0xFF, 0xFF}), driver_.memory("REG").bytes(40, 2));
 }
 
-TEST_F(Waiting, ItemsOfADriverWithoutItemAddressesLoseNoUpdate) {
+TEST_F(WaitingTest, ItemsOfADriverWithoutItemAddressesLoseNoUpdate) {
     driver_.setArrayItemByTag(0);
     driver_.onCall(std::this_thread::yield);
     const ITag* array = driver_.tag("1?REG?40?unsignedByte-4");

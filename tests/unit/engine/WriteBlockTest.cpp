@@ -10,7 +10,7 @@ namespace {
 
 using Bytes = std::vector<unsigned char>;
 
-class WriteBlock : public testing::Test {
+class WriteBlockTest : public testing::Test {
   protected:
     static Bytes image(int length) {
         Bytes bytes;
@@ -24,7 +24,7 @@ class WriteBlock : public testing::Test {
 
 }  // namespace
 
-TEST_F(WriteBlock, AnyLengthChangesItsOwnBytesOnly) {
+TEST_F(WriteBlockTest, AnyLengthChangesItsOwnBytesOnly) {
     for (const char* memory : {"REG", "LONG", "BYTE"}) {
         FakeMemory& area = driver_.memory(memory);
         for (const int length : {1, 2, 3, 4, 5, 243, 244, 245, 246, 247, 248, 501, 1003}) {
@@ -38,7 +38,7 @@ TEST_F(WriteBlock, AnyLengthChangesItsOwnBytesOnly) {
     }
 }
 
-TEST_F(WriteBlock, OnlyAPartialLastItemIsAReasonToRead) {
+TEST_F(WriteBlockTest, OnlyAPartialLastItemIsAReasonToRead) {
     const Bytes bytes = image(4);
     const ITag* tag = driver_.tag("1?REG?33?short");
     EXPECT_NE(driver_.WriteBlock(tag, bytes.data(), 4), 0);
@@ -47,7 +47,7 @@ TEST_F(WriteBlock, OnlyAPartialLastItemIsAReasonToRead) {
     EXPECT_EQ("read 33+2, write 33+2", driver_.calls());
 }
 
-TEST_F(WriteBlock, NothingIsWrittenWhenTheReadFails) {
+TEST_F(WriteBlockTest, NothingIsWrittenWhenTheReadFails) {
     const Bytes before = driver_.memory("REG").image();
     driver_.failCall(1);
     EXPECT_EQ(0, driver_.WriteBlock(driver_.tag("1?REG?33?short"), image(3).data(), 3));
@@ -56,13 +56,13 @@ TEST_F(WriteBlock, NothingIsWrittenWhenTheReadFails) {
     EXPECT_EQ("read 33+2", driver_.calls());
 }
 
-TEST_F(WriteBlock, AreaOfTheDriverItselfIsNeverReadFirst) {
+TEST_F(WriteBlockTest, AreaOfTheDriverItselfIsNeverReadFirst) {
     EXPECT_NE(driver_.WriteBlock(driver_.tag("1?AREA?0?unsignedInt"), image(3).data(), 3), 0);
     EXPECT_EQ("write 0+1", driver_.calls());
     EXPECT_EQ((Bytes{5, 16, 27, 0}), driver_.memory("AREA").bytes(0, 4));
 }
 
-TEST_F(WriteBlock, UnusableBlocksAreRefused) {
+TEST_F(WriteBlockTest, UnusableBlocksAreRefused) {
     struct Row {
         const char* uri;
         int length;
@@ -85,7 +85,7 @@ TEST_F(WriteBlock, UnusableBlocksAreRefused) {
     EXPECT_EQ("", driver_.calls());
 }
 
-TEST_F(WriteBlock, BitMemoryTakesTheTagsOwnBits) {
+TEST_F(WriteBlockTest, BitMemoryTakesTheTagsOwnBits) {
     const Bytes bytes = image(2);
     EXPECT_NE(driver_.WriteBlock(driver_.tag("1?COIL?21?boolean-10"), bytes.data(), 2), 0);
     EXPECT_EQ("writeBits 21+10", driver_.calls());
@@ -95,7 +95,7 @@ TEST_F(WriteBlock, BitMemoryTakesTheTagsOwnBits) {
     }
 }
 
-TEST_F(WriteBlock, BitBlockIsTakenFromTheOffsetsBitOn) {
+TEST_F(WriteBlockTest, BitBlockIsTakenFromTheOffsetsBitOn) {
     const Bytes bytes = image(8);
     for (const int limit : {1968, 7}) {
         driver_.setLimit(limit);
@@ -113,7 +113,7 @@ TEST_F(WriteBlock, BitBlockIsTakenFromTheOffsetsBitOn) {
     }
 }
 
-TEST_F(WriteBlock, BitBlocksBelongToBitMemories) {
+TEST_F(WriteBlockTest, BitBlocksBelongToBitMemories) {
     const unsigned char byte = 1;
     EXPECT_EQ(0, driver_.WriteBitBlock(driver_.tag("1?REG?3?boolean"), &byte, 1));
     EXPECT_EQ(-3, driver_.GetLastError());

@@ -18,9 +18,9 @@ int withMemory(int requests, Access access) {
     return access();
 }
 
-class Shortage : public testing::Test {
+class EngineShortageTest : public testing::Test {
   protected:
-    Shortage() { driver_.setLogging(false); }
+    EngineShortageTest() { driver_.setLogging(false); }
 
     /// Runs `access` with ever more memory until it succeeds; each failure must be the clear one,
     /// with nothing sent.
@@ -42,7 +42,7 @@ class Shortage : public testing::Test {
     std::array<unsigned char, 5000> value_{};
 };
 
-TEST_F(Shortage, LongReadsAreRefused) {
+TEST_F(EngineShortageTest, LongReadsAreRefused) {
     const ITag* registers = driver_.tag("1?REG?0?short-400");
     expectClearFailures("ReadBlock", 1,
                         [&] { return driver_.ReadBlock(registers, value_.data(), 800); });
@@ -51,14 +51,14 @@ TEST_F(Shortage, LongReadsAreRefused) {
                         [&] { return driver_.ReadBitBlock(coils, value_.data(), 4000); });
 }
 
-TEST_F(Shortage, LongWritesAreRefused) {
+TEST_F(EngineShortageTest, LongWritesAreRefused) {
     const ITag* registers = driver_.tag("1?REG?0?short-400");
     expectClearFailures("Write", 1, [&] { return driver_.Write(registers, value_.data()); });
     expectClearFailures("WriteBlock", 1,
                         [&] { return driver_.WriteBlock(registers, value_.data(), 801); });
 }
 
-TEST_F(Shortage, ItemsOfLongArraysAreRefused) {
+TEST_F(EngineShortageTest, ItemsOfLongArraysAreRefused) {
     const ITag* array = driver_.tag("1?REG?0?short-400");
     expectClearFailures("readArrayItem", 2,
                         [&] { return driver_.readArrayItem(array, 7, value_.data()); });
@@ -66,7 +66,7 @@ TEST_F(Shortage, ItemsOfLongArraysAreRefused) {
                         [&] { return driver_.writeArrayItem(array, 7, value_.data()); });
 }
 
-TEST_F(Shortage, DatagramsAreRefused) {
+TEST_F(EngineShortageTest, DatagramsAreRefused) {
     const std::vector<const ITag*> tags = {driver_.tag("1?REG?0?short")};
     for (int memory = 0; memory < 2; ++memory) {
         const int done =
@@ -76,7 +76,7 @@ TEST_F(Shortage, DatagramsAreRefused) {
     }
 }
 
-TEST_F(Shortage, OneRequestNeedsNoMemory) {
+TEST_F(EngineShortageTest, OneRequestNeedsNoMemory) {
     const ITag* tag = driver_.tag("1?REG?0?string-63");
     const int done = withMemory(
         0, [&] { return driver_.Read(tag, value_.data()) & driver_.Write(tag, value_.data()); });
