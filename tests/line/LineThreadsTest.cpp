@@ -8,7 +8,9 @@ namespace {
 
 constexpr int kRounds = 100;
 
-TEST_F(LineTest, SettingsMayChangeWhileAnotherThreadSendsAndReceives) {
+using LineThreadsTest = LineTest;
+
+TEST_F(LineThreadsTest, SettingsMayChangeWhileAnotherThreadSendsAndReceives) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(nullptr, port);
     ASSERT_EQ(0, ::fcntl(terminal.far(), F_SETFL, O_NONBLOCK));

@@ -57,6 +57,14 @@ struct StorageFileTest : ::testing::Test {
         std::ifstream in(file, std::ios::binary);
         return {std::istreambuf_iterator<char>(in), {}};
     }
+    /// Key and reason of what is not used, one line each.
+    static std::string unusedIn(runtime::SqliteStorage& storage,
+                                const std::string& section = "MRTU") {
+        std::string text;
+        for (const runtime::UnusedEntry& entry : storage.unused(section))
+            text += entry.key + ": " + entry.why + '\n';
+        return text;
+    }
     static unsigned modeOf(const std::string& file) {
         struct stat info {};
         EXPECT_EQ(0, ::stat(file.c_str(), &info)) << file;

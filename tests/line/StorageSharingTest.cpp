@@ -23,7 +23,9 @@ int writeOwnAndSharedKeys(const std::string& path, int process) {
     return storage.failed() ? 2 : 0;
 }
 
-TEST_F(StorageFileTest, TwoProcessesCreateAndFillOneFile) {
+using StorageSharingTest = StorageFileTest;
+
+TEST_F(StorageSharingTest, TwoProcessesCreateAndFillOneFile) {
     pid_t children[2];
     for (int process = 0; process < 2; ++process) {
         children[process] = ::fork();
@@ -43,7 +45,7 @@ TEST_F(StorageFileTest, TwoProcessesCreateAndFillOneFile) {
     EXPECT_EQ("ok\n", ask("PRAGMA integrity_check"));
 }
 
-TEST_F(StorageFileTest, OtherStoragesWritesAreSeen) {
+TEST_F(StorageSharingTest, OtherStoragesWritesAreSeen) {
     const auto one = open();
     const auto other = open();
     one->writeInt("line1", "baud", 9600);
@@ -52,7 +54,7 @@ TEST_F(StorageFileTest, OtherStoragesWritesAreSeen) {
     EXPECT_EQ(0, one->hasKey("line1", "baud"));
 }
 
-TEST_F(StorageFileTest, WriteThatWaitedTooLongFailsVisibly) {
+TEST_F(StorageSharingTest, WriteThatWaitedTooLongFailsVisibly) {
     const auto patient = open();
     patient->writeInt("line1", "baud", 9600);
     auto impatient = SqliteStorage::open(path, 10);

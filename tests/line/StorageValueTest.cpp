@@ -1,4 +1,4 @@
-// Stored values that must not be used, values of an earlier layout, and the listing of names.
+// Stored values that must not be used, and the listing of names.
 #include <gmock/gmock.h>
 
 #include "tests/line/StorageFile.h"
@@ -11,7 +11,7 @@ using ::testing::ElementsAre;
 using ::testing::HasSubstr;
 
 /// Node 5's address, seen the way a driver looks for it.
-struct StoredValueTest : StorageFileTest {
+struct StorageValueTest : StorageFileTest {
     void SetUp() override {
         open()->writeString("MRTU", "tempNode5", "7");
         open()->writeString("MRTU", "tempNode6", "8");
@@ -24,22 +24,15 @@ struct StoredValueTest : StorageFileTest {
             names[index] = storage.keyName(section, static_cast<int>(index));
         return names;
     }
-    /// Key and reason, one line each.
-    static std::string unusedIn(SqliteStorage& storage, const std::string& section = "MRTU") {
-        std::string text;
-        for (const runtime::UnusedEntry& entry : storage.unused(section))
-            text += entry.key + ": " + entry.why + '\n';
-        return text;
-    }
 };
 
-TEST_F(StoredValueTest, ThatWasNotAlteredIsUsed) {
+TEST_F(StorageValueTest, ThatWasNotAlteredIsUsed) {
     const auto storage = open();
     EXPECT_THAT(namesIn(*storage), ElementsAre("flag", "tempNode5", "tempNode6"));
     EXPECT_EQ("", unusedIn(*storage));
 }
 
-TEST_F(StoredValueTest, ThatWasAlteredIsKeptFromItsReaders) {
+TEST_F(StorageValueTest, ThatWasAlteredIsKeptFromItsReaders) {
     ask("UPDATE settings SET value='0' WHERE key='tempNode5'");
     const auto storage = open();
     EXPECT_STREQ("", storage->readString("MRTU", "tempNode5"));
@@ -52,7 +45,7 @@ TEST_F(StoredValueTest, ThatWasAlteredIsKeptFromItsReaders) {
     EXPECT_FALSE(storage->failed()) << storage->lastError();
 }
 
-TEST_F(StoredValueTest, AnyPartOfTheRowThatWasAlteredIsNoticed) {
+TEST_F(StorageValueTest, AnyPartOfTheRowThatWasAlteredIsNoticed) {
     const struct {
         const char* change;
         const char* section;
@@ -73,7 +66,7 @@ TEST_F(StoredValueTest, AnyPartOfTheRowThatWasAlteredIsNoticed) {
     }
 }
 
-TEST_F(StoredValueTest, ThatWasAlteredIsReplacedByAWriteAndCanBeRemoved) {
+TEST_F(StorageValueTest, ThatWasAlteredIsReplacedByAWriteAndCanBeRemoved) {
     ask("UPDATE settings SET value='0' WHERE key LIKE 'tempNode%'");
     const auto storage = open();
     storage->writeString("MRTU", "tempNode5", "9");
@@ -83,7 +76,7 @@ TEST_F(StoredValueTest, ThatWasAlteredIsReplacedByAWriteAndCanBeRemoved) {
     EXPECT_EQ("flag\ntempNode5\n", ask("SELECT key FROM settings"));
 }
 
-TEST_F(StoredValueTest, ThatTheJudgeRefusesIsKeptFromItsReaders) {
+TEST_F(StorageValueTest, ThatTheJudgeRefusesIsKeptFromItsReaders) {
     const auto judge = [](const std::string& key, const StoredValue& value) -> std::string {
         return key == "tempNode5" ? "not " + runtime::storedText(value) : "";
     };
@@ -95,7 +88,7 @@ TEST_F(StoredValueTest, ThatTheJudgeRefusesIsKeptFromItsReaders) {
     EXPECT_EQ("tempNode5: not 7\n", unusedIn(storage));
 }
 
-TEST_F(StoredValueTest, NamesFollowTheWritesOfThisAndOtherStorages) {
+TEST_F(StorageValueTest, NamesFollowTheWritesOfThisAndOtherStorages) {
     const auto storage = open();
     EXPECT_THAT(namesIn(*storage), ElementsAre("flag", "tempNode5", "tempNode6"));
     storage->removeKey("MRTU", "flag");
@@ -108,68 +101,13 @@ TEST_F(StoredValueTest, NamesFollowTheWritesOfThisAndOtherStorages) {
     EXPECT_STREQ("", storage->keyName("MRTU", 3));
 }
 
-TEST_F(StoredValueTest, NamesOfTwoSectionsMayBeListedTurnByTurn) {
+TEST_F(StorageValueTest, NamesOfTwoSectionsMayBeListedTurnByTurn) {
     const auto storage = open();
     storage->writeInt("line2", "a", 1);
     storage->writeInt("line2", "b", 2);
     EXPECT_STREQ("tempNode5", storage->keyName("MRTU", 1));
     EXPECT_STREQ("b", storage->keyName("line2", 1));
     EXPECT_STREQ("tempNode6", storage->keyName("MRTU", 2));
-}
-
-/// A storage as versions before the check sums wrote it.
-struct EarlierStorageTest : StoredValueTest {
-    void SetUp() override {
-        ask("PRAGMA journal_mode=WAL;"
-            "CREATE TABLE settings(section TEXT NOT NULL, key TEXT NOT NULL,"
-            " type TEXT NOT NULL CHECK(type IN ('text','bool','int')),"
-            " value NOT NULL CHECK(typeof(value) = CASE type WHEN 'text' THEN 'text' ELSE 'integer'"
-            " END), PRIMARY KEY(section, key)) WITHOUT ROWID;"
-            "PRAGMA application_id=1836217461; PRAGMA user_version=1;"
-            "INSERT INTO settings VALUES('MRTU','tempNode5','text','7'),('MRTU','baud','int',300)");
-    }
-};
-
-TEST_F(EarlierStorageTest, IsBroughtUpToDateWithItsValues) {
-    {
-        const auto storage = open();
-        ASSERT_NE(storage, nullptr);
-        EXPECT_STREQ("7", storage->readString("MRTU", "tempNode5"));
-        EXPECT_EQ(300, storage->readInt("MRTU", "baud"));
-    }
-    EXPECT_EQ("2\n", ask("PRAGMA user_version"));
-    ask("UPDATE settings SET value='8' WHERE key='tempNode5'");
-    EXPECT_EQ("tempNode5: altered since it was written\n", unusedIn(*open()));
-    EXPECT_EQ("ok\n", ask("PRAGMA integrity_check"));
-}
-
-TEST_F(EarlierStorageTest, ThatMayOnlyBeReadIsReadAsItIs) {
-    ASSERT_EQ(0, ::chmod(path.c_str(), 0444));
-    const std::string before = contentOf(path);
-    {
-        const auto storage = open();
-        ASSERT_NE(storage, nullptr);
-        EXPECT_STREQ("7", storage->readString("MRTU", "tempNode5"));
-        EXPECT_EQ("", unusedIn(*storage));
-        storage->writeString("MRTU", "tempNode5", "8");
-        EXPECT_TRUE(storage->failed());
-        EXPECT_STREQ("7", storage->readString("MRTU", "tempNode5"));
-    }
-    EXPECT_TRUE(contentOf(path) == before);
-}
-
-TEST_F(EarlierStorageTest, IsBroughtUpToDateByOneOfTwoProcesses) {
-    pid_t children[2];
-    for (pid_t& child : children) {
-        child = ::fork();
-        if (child == 0) {
-            const auto opened = SqliteStorage::open(path);
-            ::_exit(opened && opened.value()->readInt("MRTU", "baud") == 300 ? 0 : 1);
-        }
-    }
-    for (const pid_t child : children)
-        EXPECT_EQ(0, endOf(child));
-    EXPECT_EQ("", unusedIn(*open()));
 }
 
 }  // namespace

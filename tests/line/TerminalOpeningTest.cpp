@@ -30,7 +30,9 @@ void expectSameSettings(const termios& a, const termios& b) {
         EXPECT_EQ(a.c_cc[i], b.c_cc[i]) << "character " << i;
 }
 
-TEST_F(LineTest, UnmappedNamesHaveNoPort) {
+using TerminalOpeningTest = LineTest;
+
+TEST_F(TerminalOpeningTest, UnmappedNamesHaveNoPort) {
     EXPECT_EQ(nullptr, factory.openPort("com2"));
     EXPECT_EQ("com2: no device is mapped to this port", factory.lastError());
     for (const char* name : {"com0", "com17", "COM1", "com01", "com1 ", ""}) {
@@ -40,7 +42,7 @@ TEST_F(LineTest, UnmappedNamesHaveNoPort) {
     EXPECT_EQ(nullptr, factory.openPort(nullptr));
 }
 
-TEST_F(LineTest, AllSixteenNamesCanBeMappedAndUnmapped) {
+TEST_F(TerminalOpeningTest, AllSixteenNamesCanBeMappedAndUnmapped) {
     for (int number = 1; number <= 16; ++number) {
         const std::string name = "com" + std::to_string(number);
         EXPECT_TRUE(factory.mapPort(name, "/dev/somewhere")) << name;
@@ -51,13 +53,13 @@ TEST_F(LineTest, AllSixteenNamesCanBeMappedAndUnmapped) {
     EXPECT_EQ("", factory.deviceOf("com3"));
 }
 
-TEST_F(LineTest, DeviceThatIsNotThereIsNamed) {
+TEST_F(TerminalOpeningTest, DeviceThatIsNotThereIsNamed) {
     factory.mapPort("com1", "/dev/ttyNowhere9");
     EXPECT_EQ(nullptr, factory.openPort("com1"));
     EXPECT_EQ("com1: /dev/ttyNowhere9: No such file or directory", factory.lastError());
 }
 
-TEST_F(LineTest, WhatIsNoTerminalIsRefused) {
+TEST_F(TerminalOpeningTest, WhatIsNoTerminalIsRefused) {
     factory.mapPort("com1", "/dev/null");
     EXPECT_EQ(nullptr, factory.openPort("com1"));
     EXPECT_EQ("com1: /dev/null: not a terminal", factory.lastError());
@@ -66,7 +68,7 @@ TEST_F(LineTest, WhatIsNoTerminalIsRefused) {
     EXPECT_EQ("com1: /: Is a directory", factory.lastError());
 }
 
-TEST_F(LineTest, FifoIsRefusedWithoutWaitingForItsOtherEnd) {
+TEST_F(TerminalOpeningTest, FifoIsRefusedWithoutWaitingForItsOtherEnd) {
     const std::string fifo = ::testing::TempDir() + "fifo" + std::to_string(::getpid());
     ASSERT_EQ(0, ::mkfifo(fifo.c_str(), 0600));
     factory.mapPort("com1", fifo);
@@ -75,13 +77,13 @@ TEST_F(LineTest, FifoIsRefusedWithoutWaitingForItsOtherEnd) {
     EXPECT_EQ("com1: " + fifo + ": not a terminal", factory.lastError());
 }
 
-TEST_F(LineTest, SuccessfulOpenClearsTheError) {
+TEST_F(TerminalOpeningTest, SuccessfulOpenClearsTheError) {
     EXPECT_EQ(nullptr, factory.openPort("com2"));
     EXPECT_NE(openPort(), nullptr);
     EXPECT_EQ("", factory.lastError());
 }
 
-TEST_F(LineTest, SettingsComeBackAtTheRelease) {
+TEST_F(TerminalOpeningTest, SettingsComeBackAtTheRelease) {
     termios unusual = terminal.settings();
     unusual.c_iflag = IXON | ICRNL;
     unusual.c_cc[VMIN] = 3;
@@ -104,7 +106,7 @@ TEST_F(LineTest, SettingsComeBackAtTheRelease) {
     expectSameSettings(terminal.settings(), before);
 }
 
-TEST_F(LineTest, DestroyedFactoryReleasesItsPorts) {
+TEST_F(TerminalOpeningTest, DestroyedFactoryReleasesItsPorts) {
     const termios before = terminal.settings();
     {
         PosixSerialFactory shortLived;
@@ -118,7 +120,7 @@ TEST_F(LineTest, DestroyedFactoryReleasesItsPorts) {
     EXPECT_NE(openPort(), nullptr);
 }
 
-TEST_F(LineTest, EveryListedSettingIsAccepted) {
+TEST_F(TerminalOpeningTest, EveryListedSettingIsAccepted) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
     for (const int baud : {150, 300, 600, 1200, 2400, 4800, 9600, 19200, 38400, 57600, 115200}) {
@@ -134,7 +136,7 @@ TEST_F(LineTest, EveryListedSettingIsAccepted) {
     }
 }
 
-TEST_F(LineTest, PortWithoutDirectionControlWorksInEveryMode) {
+TEST_F(TerminalOpeningTest, PortWithoutDirectionControlWorksInEveryMode) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
     for (int mode = 0; mode <= 3; ++mode) {
@@ -142,7 +144,7 @@ TEST_F(LineTest, PortWithoutDirectionControlWorksInEveryMode) {
     }
 }
 
-TEST_F(LineTest, RateOfZeroFailsWithItsReason) {
+TEST_F(TerminalOpeningTest, RateOfZeroFailsWithItsReason) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
     EXPECT_EQ(0, port->configure(0, 0, 8, 1, 0));
@@ -151,7 +153,7 @@ TEST_F(LineTest, RateOfZeroFailsWithItsReason) {
     EXPECT_EQ(0, port->send(&byte, 1));
 }
 
-TEST_F(LineTest, SecondOpenInThisProcessIsRefused) {
+TEST_F(TerminalOpeningTest, SecondOpenInThisProcessIsRefused) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
     PosixSerialFactory other;
@@ -163,7 +165,7 @@ TEST_F(LineTest, SecondOpenInThisProcessIsRefused) {
     EXPECT_NE(other.openPort("com7"), nullptr) << other.lastError();
 }
 
-TEST_F(LineTest, RefusedSecondOpenLeavesTheFirstExclusive) {
+TEST_F(TerminalOpeningTest, RefusedSecondOpenLeavesTheFirstExclusive) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
     PosixSerialFactory other;
@@ -192,7 +194,7 @@ int inChild(Check check) {
     return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
 }
 
-TEST_F(LineTest, SecondOpenByAnotherProcessIsRefused) {
+TEST_F(TerminalOpeningTest, SecondOpenByAnotherProcessIsRefused) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
     const auto tryToOpen = [this] {
@@ -205,14 +207,14 @@ TEST_F(LineTest, SecondOpenByAnotherProcessIsRefused) {
     EXPECT_EQ(7, inChild(tryToOpen));
 }
 
-TEST_F(LineTest, DescriptorIsNotInheritedByOtherPrograms) {
+TEST_F(TerminalOpeningTest, DescriptorIsNotInheritedByOtherPrograms) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
     EXPECT_NE(::fcntl(descriptorOf(port), F_GETFD) & FD_CLOEXEC, 0);
     EXPECT_NE(::fcntl(descriptorOf(port), F_GETFL) & O_NONBLOCK, 0);
 }
 
-TEST_F(LineTest, PortDoesNotBecomeTheControllingTerminal) {
+TEST_F(TerminalOpeningTest, PortDoesNotBecomeTheControllingTerminal) {
     const auto openAsLeader = [this] {
         if (::setsid() < 0) return 1;
         PosixSerialFactory other;
@@ -224,7 +226,7 @@ TEST_F(LineTest, PortDoesNotBecomeTheControllingTerminal) {
     EXPECT_EQ(7, inChild(openAsLeader));
 }
 
-TEST_F(LineTest, ForeignPortsAreNotReleased) {
+TEST_F(TerminalOpeningTest, ForeignPortsAreNotReleased) {
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
     PosixSerialFactory other;
@@ -236,7 +238,7 @@ TEST_F(LineTest, ForeignPortsAreNotReleased) {
     EXPECT_EQ(0, factory.openPorts());
 }
 
-TEST_F(LineTest, PortOfAVanishedTerminalCanStillBeReleased) {
+TEST_F(TerminalOpeningTest, PortOfAVanishedTerminalCanStillBeReleased) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.hangUp();

@@ -50,7 +50,9 @@ class Meanwhile {
     std::thread thread_;
 };
 
-TEST_F(LineTest, EveryByteValuePassesBothWays) {
+using TerminalTransferTest = LineTest;
+
+TEST_F(TerminalTransferTest, EveryByteValuePassesBothWays) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     Bytes all(256);
@@ -67,7 +69,7 @@ TEST_F(LineTest, EveryByteValuePassesBothWays) {
     EXPECT_EQ(0u, raw.c_oflag & OPOST);
 }
 
-TEST_F(LineTest, FirstByteThenTheRest) {
+TEST_F(TerminalTransferTest, FirstByteThenTheRest) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.put({1, 3, 2, 0xAB});
@@ -79,7 +81,7 @@ TEST_F(LineTest, FirstByteThenTheRest) {
     EXPECT_THAT(rest.bytes, ElementsAre(3, 2, 0xAB));
 }
 
-TEST_F(LineTest, TimeoutOfZeroOnlyLooks) {
+TEST_F(TerminalTransferTest, TimeoutOfZeroOnlyLooks) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     unsigned char byte = 0x77;
@@ -90,14 +92,14 @@ TEST_F(LineTest, TimeoutOfZeroOnlyLooks) {
     EXPECT_EQ(5, byte);
 }
 
-TEST_F(LineTest, SilenceEndsAFrame) {
+TEST_F(TerminalTransferTest, SilenceEndsAFrame) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.put({1, 2, 3, 4, 5});
     EXPECT_THAT(receiveFrame(*port, 512, kForEver, 20).bytes, ElementsAre(1, 2, 3, 4, 5));
 }
 
-TEST_F(LineTest, MaximumEndsAFrame) {
+TEST_F(TerminalTransferTest, MaximumEndsAFrame) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.put({1, 2, 3, 4, 5});
@@ -105,7 +107,7 @@ TEST_F(LineTest, MaximumEndsAFrame) {
     EXPECT_THAT(receiveFrame(*port, 3, kForEver, kForEver).bytes, ElementsAre(3, 4, 5));
 }
 
-TEST_F(LineTest, DeadlineEndsAFrameThatIsSilentTooShortly) {
+TEST_F(TerminalTransferTest, DeadlineEndsAFrameThatIsSilentTooShortly) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.put({1, 2});
@@ -114,7 +116,7 @@ TEST_F(LineTest, DeadlineEndsAFrameThatIsSilentTooShortly) {
     EXPECT_THAT(frame.bytes, ElementsAre(1, 2));
 }
 
-TEST_F(LineTest, DripsForEverAreBoundedByTheDeadline) {
+TEST_F(TerminalTransferTest, DripsForEverAreBoundedByTheDeadline) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     const Meanwhile dripping([this](const std::atomic<bool>& stopped) {
@@ -130,7 +132,7 @@ TEST_F(LineTest, DripsForEverAreBoundedByTheDeadline) {
     EXPECT_LT(frame.bytes.size(), 1'000'000u);
 }
 
-TEST_F(LineTest, FrameOfNothingFails) {
+TEST_F(TerminalTransferTest, FrameOfNothingFails) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     const Frame frame = receiveFrame(*port, 512, kForEver, 1);
@@ -138,7 +140,7 @@ TEST_F(LineTest, FrameOfNothingFails) {
     EXPECT_TRUE(frame.bytes.empty());
 }
 
-TEST_F(LineTest, GapFloorBridgesPausesThatTheDriverWouldNot) {
+TEST_F(TerminalTransferTest, GapFloorBridgesPausesThatTheDriverWouldNot) {
     factory.setGapFloor(kForEver);
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
@@ -151,7 +153,7 @@ TEST_F(LineTest, GapFloorBridgesPausesThatTheDriverWouldNot) {
     EXPECT_THAT(receiveFrame(*port, 3, kForEver, 1).bytes, ElementsAre(1, 2, 3));
 }
 
-TEST_F(LineTest, PurgeThrowsAwayWhatWasReceived) {
+TEST_F(TerminalTransferTest, PurgeThrowsAwayWhatWasReceived) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.put({1, 2, 3});
@@ -161,7 +163,7 @@ TEST_F(LineTest, PurgeThrowsAwayWhatWasReceived) {
     EXPECT_EQ(0, port->receiveByte(&byte, 0, 0));
 }
 
-TEST_F(LineTest, ConfigureStartsWithAnEmptyLine) {
+TEST_F(TerminalTransferTest, ConfigureStartsWithAnEmptyLine) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.put({1, 2, 3});
@@ -171,7 +173,7 @@ TEST_F(LineTest, ConfigureStartsWithAnEmptyLine) {
     EXPECT_EQ(0, port->receiveByte(&byte, 0, 0));
 }
 
-TEST_F(LineTest, NegativeLengthIsRefused) {
+TEST_F(TerminalTransferTest, NegativeLengthIsRefused) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     const unsigned char byte = 1;
@@ -179,7 +181,7 @@ TEST_F(LineTest, NegativeLengthIsRefused) {
     EXPECT_NE(port->send(&byte, 0), 0);
 }
 
-TEST_F(LineTest, SendWithoutSettingsStillHasATime) {
+TEST_F(TerminalTransferTest, SendWithoutSettingsStillHasATime) {
     // A port that was never configured sends at the default rate of its settings.
     ISerialPort* port = openPort();
     ASSERT_NE(port, nullptr);
@@ -188,7 +190,7 @@ TEST_F(LineTest, SendWithoutSettingsStillHasATime) {
     EXPECT_THAT(terminal.take(1), ElementsAre('x'));
 }
 
-TEST_F(LineTest, HangUpFailsEveryTransferAtOnceAndForGood) {
+TEST_F(TerminalTransferTest, HangUpFailsEveryTransferAtOnceAndForGood) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.hangUp();
@@ -205,14 +207,14 @@ TEST_F(LineTest, HangUpFailsEveryTransferAtOnceAndForGood) {
 }
 
 /// Each transfer must be the one that notices, so each gets a line of its own.
-TEST_F(LineTest, HangUpFailsAFrameFirst) {
+TEST_F(TerminalTransferTest, HangUpFailsAFrameFirst) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.hangUp();
     EXPECT_EQ(0, receiveFrame(*port, 512, kForEver, kForEver).good);
 }
 
-TEST_F(LineTest, HangUpFailsASendFirst) {
+TEST_F(TerminalTransferTest, HangUpFailsASendFirst) {
     ISerialPort* port = openConfigured(150);
     ASSERT_NE(port, nullptr);
     terminal.hangUp();
@@ -220,7 +222,7 @@ TEST_F(LineTest, HangUpFailsASendFirst) {
     EXPECT_EQ(0, port->send(data.data(), static_cast<int>(data.size())));
 }
 
-TEST_F(LineTest, HangUpEndsAWaitForTheFirstByte) {
+TEST_F(TerminalTransferTest, HangUpEndsAWaitForTheFirstByte) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     const Meanwhile hangingUp([this](const std::atomic<bool>&) {
@@ -231,7 +233,7 @@ TEST_F(LineTest, HangUpEndsAWaitForTheFirstByte) {
     EXPECT_EQ(0, port->receiveByte(&byte, kForEver, 0));
 }
 
-TEST_F(LineTest, HangUpEndsAFrameAndKeepsWhatCame) {
+TEST_F(TerminalTransferTest, HangUpEndsAFrameAndKeepsWhatCame) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     terminal.put({1});
@@ -244,7 +246,7 @@ TEST_F(LineTest, HangUpEndsAFrameAndKeepsWhatCame) {
     EXPECT_EQ(0, receiveFrame(*port, 512, kForEver, kForEver).good);
 }
 
-TEST_F(LineTest, SendToAReaderThatNeverReadsEndsAtItsDeadline) {
+TEST_F(TerminalTransferTest, SendToAReaderThatNeverReadsEndsAtItsDeadline) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     // What the kernel holds for a pseudo terminal is finite; a jammed line must not hold us.
@@ -261,7 +263,7 @@ TEST_F(LineTest, SendToAReaderThatNeverReadsEndsAtItsDeadline) {
 
 std::atomic<int> signalsSeen{0};
 
-TEST_F(LineTest, SignalsDoNotCutWaitsShort) {
+TEST_F(TerminalTransferTest, SignalsDoNotCutWaitsShort) {
     ISerialPort* port = openConfigured();
     ASSERT_NE(port, nullptr);
     struct sigaction action {};
