@@ -41,7 +41,9 @@ std::vector<int> someOf(const std::vector<int>& registers, std::size_t count) {
     return {registers.begin(), registers.begin() + static_cast<std::ptrdiff_t>(count)};
 }
 
-TEST_P(OtherSlavesTest, EveryByteOrderReadsWhatTheSlaveHolds) {
+using OtherByteOrdersTest = OtherSlavesTest;
+
+TEST_P(OtherByteOrdersTest, EveryByteOrderReadsWhatTheSlaveHolds) {
     std::vector<std::string> words{"read"};
     std::string expected;
     for (const auto& [type, orders] :
@@ -57,7 +59,7 @@ TEST_P(OtherSlavesTest, EveryByteOrderReadsWhatTheSlaveHolds) {
     EXPECT_EQ(expected, mrtu(words).output);
 }
 
-TEST_P(OtherSlavesTest, EveryOrderOf32BitsArrivesAsItsNameSays) {
+TEST_P(OtherByteOrdersTest, EveryOrderOf32BitsArrivesAsItsNameSays) {
     std::vector<std::string> words{"write", "--verify"};
     std::vector<int> expected;
     for (std::size_t i = 0; i < kOrders32.size(); ++i) {
@@ -72,7 +74,7 @@ TEST_P(OtherSlavesTest, EveryOrderOf32BitsArrivesAsItsNameSays) {
 }
 
 /// The slaves tell about twenty registers: five numbers of 64 bits.
-TEST_P(OtherSlavesTest, EveryOrderOf64BitsArrivesAsItsNameSays) {
+TEST_P(OtherByteOrdersTest, EveryOrderOf64BitsArrivesAsItsNameSays) {
     for (const std::size_t from : {0U, 4U}) {
         std::vector<std::string> words{"write", "--verify"};
         std::vector<int> expected;
@@ -90,7 +92,7 @@ TEST_P(OtherSlavesTest, EveryOrderOf64BitsArrivesAsItsNameSays) {
     }
 }
 
-TEST_P(OtherSlavesTest, ArraysAndTextsKeepTheirOrder) {
+TEST_P(OtherByteOrdersTest, ArraysAndTextsKeepTheirOrder) {
     const auto result =
         mrtu({"write", "--verify", registerUri(100, "unsignedInt-2@ABCD=1,2"),
               registerUri(104, "string-4@AB=PUMP"), registerUri(106, "string-4@BA=PUMP"),
@@ -112,7 +114,7 @@ std::vector<std::string> realsInTheUsualOrders() {
             registerUri(112, "double@GHEFCDAB=123456.75")};
 }
 
-TEST_P(OtherSlavesTest, LibmodbusTakesTheRealsForTheSame) {
+TEST_P(OtherByteOrdersTest, LibmodbusTakesTheRealsForTheSame) {
     const auto result = mrtu(realsInTheUsualOrders());
     EXPECT_EQ(0, result.exitCode) << result.output;
     const std::vector<int> found = slave_->end().registers;
@@ -124,7 +126,7 @@ TEST_P(OtherSlavesTest, LibmodbusTakesTheRealsForTheSame) {
     EXPECT_EQ(0x40FE240C00000000, MODBUS_GET_INT64_FROM_INT16(held.data(), 8));
 }
 
-TEST_P(OtherSlavesTest, PymodbusTakesTheRealsForTheSame) {
+TEST_P(OtherByteOrdersTest, PymodbusTakesTheRealsForTheSame) {
     const auto result = mrtu(realsInTheUsualOrders());
     EXPECT_EQ(0, result.exitCode) << result.output;
     std::vector<std::string> words{"/usr/bin/python3", PEERS_DIRECTORY "/pymodbus_reals.py"};
