@@ -42,6 +42,13 @@ bool Plugin::isLoaded(const std::filesystem::path& file) {
     return handle != nullptr;
 }
 
+std::string command(IProtocol& protocol, const char* line) {
+    char answer[512] = {};
+    auto* const console = static_cast<IProtocol2*>(protocol.ConvertTo("IProtocol2"));
+    EXPECT_EQ(1, console->DoCommand(line, answer, sizeof answer - 1)) << line;
+    return answer;
+}
+
 PluginCopy::PluginCopy() {
     std::string folder = std::filesystem::temp_directory_path() / "mrtu-abi-XXXXXX";
     if (mkdtemp(folder.data()) == nullptr) throw std::runtime_error("no folder " + folder);

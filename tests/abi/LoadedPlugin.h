@@ -33,6 +33,9 @@ class Plugin {
     void* handle_;
 };
 
+/// What the console of the protocol answers to the command; it must accept it.
+std::string command(IProtocol& protocol, const char* line);
+
 /// The plug-in and its engine, copied into a folder of their own that goes with this object.
 class PluginCopy {
   public:

@@ -9,6 +9,7 @@
 
 namespace {
 
+using abi_test::command;
 using testing_support::FakeHost;
 
 struct Copy {
@@ -26,13 +27,6 @@ class SideBySideTest : public ::testing::Test {
     Copy first;
     Copy second;
 };
-
-std::string command(IProtocol& protocol, const char* line) {
-    char answer[512] = {};
-    auto* const console = static_cast<IProtocol2*>(protocol.ConvertTo("IProtocol2"));
-    EXPECT_EQ(1, console->DoCommand(line, answer, sizeof answer - 1)) << line;
-    return answer;
-}
 
 TEST_F(SideBySideTest, EachHasItsOwnObjects) {
     EXPECT_NE(first.plugin.symbol("GetInterfaceFactory"),
@@ -89,29 +83,6 @@ TEST_F(SideBySideTest, OverridesAndLocksGoToTheOwnHost) {
     second.plugin.protocols().DeleteProtocol(two);
     first.plugin.module().Close();
     second.plugin.module().Close();
-}
-
-TEST(SideBySideOrderTest, TheSecondGoesOnWhenTheFirstIsUnloaded) {
-    FakeHost host;
-    const abi_test::PluginCopy secondFiles;
-    {
-        const abi_test::PluginCopy firstFiles;
-        auto first = std::make_unique<abi_test::Plugin>(firstFiles.file());
-        FakeHost firstHost;
-        const abi_test::Plugin second(secondFiles.file());
-        ASSERT_EQ(1, first->module().Init(&firstHost));
-        ASSERT_EQ(1, second.module().Init(&host));
-        IProtocol* const protocol = second.protocols().CreateProtocol("MRTU");
-        first->module().Close();
-        first.reset();
-        EXPECT_EQ("id 5 set to 9\n", command(*protocol, "setid 5 9"));
-        EXPECT_EQ("text:9", host.stored.describe("MRTU", "tempNode5"));
-        EXPECT_EQ(9, host.held());
-        second.protocols().DeleteProtocol(protocol);
-        second.module().Close();
-        EXPECT_EQ(0, host.held());
-    }
-    EXPECT_FALSE(abi_test::Plugin::isLoaded(secondFiles.file()));
 }
 
 }  // namespace

@@ -9,7 +9,9 @@
 namespace shortage {
 namespace {
 
-TEST_F(ShortageTest, OfTags) {
+using ShortageTagsTest = ShortageTest;
+
+TEST_F(ShortageTagsTest, OfTags) {
     std::vector<Operation> operations;
     std::vector<std::string> texts = uris();
     for (const char* refused :
@@ -45,7 +47,7 @@ int convert(World& w, bool toDevice) {
     return w.target->ConvertVariable(value(), w.out(), toDevice) ? 1 : 0;
 }
 
-TEST_F(ShortageTest, OfConversions) {
+TEST_F(ShortageTagsTest, OfConversions) {
     std::vector<Operation> operations;
     for (const std::string& uri : uris()) {
         operations.push_back(onTag(
@@ -57,7 +59,7 @@ TEST_F(ShortageTest, OfConversions) {
     EXPECT_LT(0, expectHarmless(operations));
 }
 
-TEST_F(ShortageTest, OfReads) {
+TEST_F(ShortageTagsTest, OfReads) {
     for (const auto call : std::initializer_list<int (*)(World&)>{
              [](World& w) { return w.protocol->Read(w.target, w.out()); },
              [](World& w) {
@@ -83,7 +85,7 @@ TEST_F(ShortageTest, OfReads) {
         EXPECT_LT(0, expectHarmless(onEveryTag("read", call)));
 }
 
-TEST_F(ShortageTest, OfWrites) {
+TEST_F(ShortageTagsTest, OfWrites) {
     for (const auto call : std::initializer_list<int (*)(World&)>{
              [](World& w) { return w.protocol->Write(w.target, value()); },
              [](World& w) { return w.protocol->WriteBlock(w.target, value(), 401); },
@@ -96,7 +98,7 @@ TEST_F(ShortageTest, OfWrites) {
         EXPECT_LT(0, expectHarmless(onEveryTag("write", call)));
 }
 
-TEST_F(ShortageTest, OfDatagrams) {
+TEST_F(ShortageTagsTest, OfDatagrams) {
     const std::string uri = "1?HREG?400010?unsignedShort";
     EXPECT_LT(0, expectHarmless({
                      onTag("ReadDatagram", uri,

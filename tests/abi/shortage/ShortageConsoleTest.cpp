@@ -12,7 +12,9 @@ Operation console(const std::string& line) {
             Refused::answer};
 }
 
-TEST_F(ShortageTest, OfTheConsole) {
+using ShortageConsoleTest = ShortageTest;
+
+TEST_F(ShortageConsoleTest, OfTheConsole) {
     std::vector<Operation> operations;
     for (const char* line : {"help",
                              "info",

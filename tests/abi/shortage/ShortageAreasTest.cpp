@@ -14,7 +14,9 @@ void renameAndStart(World& world) {
     world.protocol->Start();
 }
 
-TEST_F(ShortageTest, OfTheDriversAreasWithALongIdent) {
+using ShortageAreasTest = ShortageTest;
+
+TEST_F(ShortageAreasTest, OfTheDriversAreasWithALongIdent) {
     std::vector<Operation> operations;
     for (const char* uri : {"1?NO?0?unsignedByte", "1?NP_Mode?0?boolean", "2?NP_Mode?0?boolean"}) {
         const auto prepare = [uri](World& w) {
@@ -35,7 +37,7 @@ TEST_F(ShortageTest, OfTheDriversAreasWithALongIdent) {
     EXPECT_LT(0, expectHarmless(operations));
 }
 
-TEST_F(ShortageTest, OfStagedSettings) {
+TEST_F(ShortageAreasTest, OfStagedSettings) {
     const auto stage = [](World& w) {
         for (const char* uri : {"1?SP_Baud?0?unsignedInt", "1?SP_Par?0?unsignedByte",
                                 "1?SP_Stop?0?unsignedByte", "1?SP_Mode?0?unsignedByte"}) {

@@ -9,7 +9,9 @@
 namespace shortage {
 namespace {
 
-TEST_F(ShortageTest, OfTheModule) {
+using ShortageLifeTest = ShortageTest;
+
+TEST_F(ShortageLifeTest, OfTheModule) {
     const auto initWithout = [](const char* service) {
         return Operation{std::string("Init without ") + service, Stage::loaded,
                          [](World& w) { return w.module.Init(&w.host); }, Refused::null,
@@ -33,7 +35,7 @@ TEST_F(ShortageTest, OfTheModule) {
     });
 }
 
-TEST_F(ShortageTest, OfTheFactory) {
+TEST_F(ShortageLifeTest, OfTheFactory) {
     EXPECT_LT(0, expectHarmless({
                      {"CreateProtocol", Stage::initialised,
                       [](World& w) {
@@ -52,7 +54,7 @@ TEST_F(ShortageTest, OfTheFactory) {
                  }));
 }
 
-TEST_F(ShortageTest, OfTheConfiguration) {
+TEST_F(ShortageLifeTest, OfTheConfiguration) {
     const auto config = [](Stage stage, const char* text) {
         return atStage(stage, std::string("Config ") + text,
                        [text](World& w) { return w.protocol->Config(text); });
@@ -88,7 +90,7 @@ void storeOverrides(World& world) {
     world.host.storage.writeInt("MRTU", "stop", 2);
 }
 
-TEST_F(ShortageTest, OfStartAndStop) {
+TEST_F(ShortageLifeTest, OfStartAndStop) {
     const auto start = [](World& w) { return w.protocol->Start(); };
     EXPECT_LT(
         0, expectHarmless({
@@ -104,7 +106,7 @@ TEST_F(ShortageTest, OfStartAndStop) {
            }));
 }
 
-TEST_F(ShortageTest, OfQueries) {
+TEST_F(ShortageLifeTest, OfQueries) {
     const std::string uri = "1?HREG?400010?unsignedShort";
     expectHarmless({
         onTag("GetInfo", uri, [](World& w) { return w.protocol->GetInfo(w.text(), 400); }),

@@ -22,7 +22,7 @@ std::string refusalOf(const std::string& uri) {
     return text;
 }
 
-TEST(BoundsTest, ATagThatCannotBeReadTakesNoMemory) {
+TEST(ShortageBoundsTest, ATagThatCannotBeReadTakesNoMemory) {
     const char* const kExceeds = "Tag exceeds the memory area";
     for (const char* uri :
          {"1?HREG?400001?string-1000000000", "1?HREG?400001?binary-2147483647",
@@ -33,7 +33,7 @@ TEST(BoundsTest, ATagThatCannotBeReadTakesNoMemory) {
     EXPECT_EQ("Tag length is not positive", refusalOf("1?HREG?400001?string--7"));
 }
 
-TEST(BoundsTest, ABitFarFromTheImagesStartIsConvertedWithoutMemory) {
+TEST(ShortageBoundsTest, ABitFarFromTheImagesStartIsConvertedWithoutMemory) {
     World world(plugin(), Stage::started);
     makeTarget(world, "1?HREG?400001.60000?boolean");
     forgetLargest();
@@ -41,7 +41,7 @@ TEST(BoundsTest, ABitFarFromTheImagesStartIsConvertedWithoutMemory) {
     EXPECT_EQ(0U, largestRequest());
 }
 
-TEST(BoundsTest, ANegativeBitIsNotConverted) {
+TEST(ShortageBoundsTest, ANegativeBitIsNotConverted) {
     for (const char* uri : {"1?HREG?400001.-13?boolean", "1?HREG?400001.-2147483648?boolean",
                             "1?HREG?400001.-1?boolean-3"}) {
         World world(plugin(), Stage::started);
@@ -54,7 +54,7 @@ TEST(BoundsTest, ANegativeBitIsNotConverted) {
     }
 }
 
-TEST(ModuleTest, WithoutAFactoryInitFailsWithAText) {
+TEST(ShortageBoundsTest, ModuleWithoutAFactoryInitFailsWithAText) {
     World world(plugin(), Stage::loaded);
     EXPECT_EQ(0, world.module.Init(nullptr));
     EXPECT_STREQ("Interface factory not given", world.module.GetLastError());
