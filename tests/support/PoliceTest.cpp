@@ -9,12 +9,9 @@ namespace {
 
 using testing_support::FakeHost;
 using testing_support::FakeMultiTask;
-using testing_support::hex;
-using testing_support::RecordingSerialFactory;
-using testing_support::ScriptedPort;
 using testing_support::toHex;
 
-TEST(FakeMultiTaskTest, SleepMovesTheClock) {
+TEST(PoliceTest, MultiTaskSleepMovesTheClock) {
     FakeMultiTask tasks;
     tasks.sleep(250);
     tasks.advance(50);
@@ -23,7 +20,7 @@ TEST(FakeMultiTaskTest, SleepMovesTheClock) {
     EXPECT_FALSE(tasks.sleeps()[0].lockHeld);
 }
 
-TEST(FakeMultiTaskTest, LocksAreWatched) {
+TEST(PoliceTest, MultiTaskLocksAreWatched) {
     FakeMultiTask tasks;
     ILock* lock = tasks.createLock(0);
     EXPECT_NONFATAL_FAILURE(lock->unlock(), "does not hold it");
@@ -36,7 +33,7 @@ TEST(FakeMultiTaskTest, LocksAreWatched) {
     EXPECT_NONFATAL_FAILURE(tasks.deleteLock(lock), "does not exist");
 }
 
-TEST(FakeMultiTaskTest, ForgottenLockIsNoticed) {
+TEST(PoliceTest, MultiTaskForgottenLockIsNoticed) {
     EXPECT_NONFATAL_FAILURE(
         {
             FakeMultiTask tasks;
@@ -45,89 +42,7 @@ TEST(FakeMultiTaskTest, ForgottenLockIsNoticed) {
         "never deleted");
 }
 
-class ScriptedPortTest : public ::testing::Test {
-  protected:
-    ScriptedPortTest() { lock->lock(); }
-    ~ScriptedPortTest() override {
-        lock->unlock();
-        tasks.deleteLock(lock);
-    }
-
-    FakeMultiTask tasks;
-    ILock* lock = tasks.createLock(0);
-    ScriptedPort port{tasks};
-    unsigned char byte = 0;
-};
-
-TEST_F(ScriptedPortTest, AnswersFromItsList) {
-    port.reply(hex("01 02 03"));
-    port.silence();
-    const unsigned char request[] = {0x11};
-    unsigned char rest[8] = {};
-    int received = -1;
-    EXPECT_NE(0, port.send(request, 1));
-    EXPECT_NE(0, port.receiveByte(&byte, 100, 0));
-    EXPECT_EQ(0x01, byte);
-    EXPECT_NE(0, port.receiveFrame(rest, 8, 100, 5, &received, 0));
-    EXPECT_EQ(2, received);
-    EXPECT_EQ(0, tasks.nowMs());
-    EXPECT_NE(0, port.send(request, 1));
-    EXPECT_EQ(0, port.receiveByte(&byte, 100, 0));
-    EXPECT_EQ(100, tasks.nowMs());
-    EXPECT_EQ(0U, port.scriptLeft());
-}
-
-TEST_F(ScriptedPortTest, RequestWithoutAnEntryIsNoticed) {
-    const unsigned char request[] = {0x11};
-    EXPECT_NONFATAL_FAILURE(port.send(request, 1), "no reply is scripted for the request 11");
-}
-
-TEST_F(ScriptedPortTest, EmptyRequestIsNoticed) {
-    EXPECT_NONFATAL_FAILURE(port.send(&byte, 0), "send() of 0 bytes");
-}
-
-TEST_F(ScriptedPortTest, MissingLockIsNoticed) {
-    lock->unlock();
-    EXPECT_NONFATAL_FAILURE(port.receiveByte(&byte, 0, 0), "without the transaction lock");
-    lock->lock();
-}
-
-TEST_F(ScriptedPortTest, UseAfterReleaseIsNoticed) {
-    port.markReleased();
-    EXPECT_NONFATAL_FAILURE(port.receiveByte(&byte, 0, 0), "of a released port");
-    EXPECT_NONFATAL_FAILURE(port.configure(1, 2, 3, 4, 5), "of a released port");
-}
-
-TEST_F(ScriptedPortTest, LeftOverEntriesAreNoticed) {
-    EXPECT_NONFATAL_FAILURE(
-        {
-            ScriptedPort forgotten(tasks);
-            forgotten.silence();
-        },
-        "were not asked for");
-}
-
-TEST_F(ScriptedPortTest, FactoryNoticesForeignAndDoubleReleases) {
-    RecordingSerialFactory factory;
-    factory.offer("com1", port);
-    EXPECT_NONFATAL_FAILURE(factory.releasePort(&port), "not open");
-    EXPECT_EQ(nullptr, factory.openPort("com2"));
-    EXPECT_EQ(&port, factory.openPort("com1"));
-    factory.releasePort(&port);
-    EXPECT_NONFATAL_FAILURE(factory.releasePort(&port), "not open");
-}
-
-TEST_F(ScriptedPortTest, FactoryNoticesAPortLeftOpen) {
-    EXPECT_NONFATAL_FAILURE(
-        {
-            RecordingSerialFactory factory;
-            factory.offer("com1", port);
-            factory.openPort("com1");
-        },
-        "never released");
-}
-
-TEST(FakeHostTest, ReleasesAreWatched) {
+TEST(PoliceTest, HostReleasesAreWatched) {
     FakeHost host;
     IInterface* tasks = host.CreateInterface("IMultiTask2");
     EXPECT_EQ(1, host.held());
@@ -139,7 +54,7 @@ TEST(FakeHostTest, ReleasesAreWatched) {
     EXPECT_EQ(2, host.released("IMultiTask2"));
 }
 
-TEST(FakeStorageTest, KeepsValuesByTypeAndRefusesWhenTold) {
+TEST(PoliceTest, StorageKeepsValuesByTypeAndRefusesWhenTold) {
     FakeHost host;
     auto* storage = static_cast<IPermanentStorage2*>(
         host.CreateInterface("IPermanentStorage")->ConvertTo("IPermanentStorage2"));
@@ -162,7 +77,7 @@ TEST(FakeStorageTest, KeepsValuesByTypeAndRefusesWhenTold) {
     EXPECT_EQ(nullptr, host.plainStorage.ConvertTo("IPermanentStorage2"));
 }
 
-TEST(RepliesTest, ChecksAgreeWithPublishedFrames) {
+TEST(PoliceTest, RepliesChecksAgreeWithPublishedFrames) {
     EXPECT_EQ("01 03 00 00 00 0A C5 CD",
               toHex(testing_support::rtuFrame(testing_support::request(1, 3, 0, 10))));
     EXPECT_EQ("37 4B", toHex(testing_support::crcOf(testing_support::characters("123456789"))));
