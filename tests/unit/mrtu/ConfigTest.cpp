@@ -1,8 +1,6 @@
 // From the configuration to the settings of the line.
 #include "tests/unit/mrtu/DriverTest.h"
 
-#include "mrtu/LineSettings.h"
-
 namespace {
 
 using driver_test::configText;
@@ -141,24 +139,6 @@ TEST_F(ConfigTest, EverythingStaysAsItWasWhenTheTextIsRefused) {
     refusal("CfgVer=1 timeout=5 defNodeId=1 uart=com7 baudrate=300 parity=none");
     EXPECT_EQ(77, driver->getParamManager()->getNodeParams(1)->timeout);
     EXPECT_EQ(before, report());
-}
-
-TEST(SerialSettingsTest, InterCharacterGap) {
-    const std::pair<int, int> gaps[] = {
-        {150, 800},  {300, 400},      {600, 200},           {1200, 100}, {2400, 50},  {4800, 25},
-        {9600, 13},  {19200, 7},      {38400, 4},           {57600, 3},  {115200, 2}, {119999, 2},
-        {120000, 1}, {120001, 1},     {500000, 1},          {1, 120000}, {0, 1},      {-1, 1},
-        {-9600, 1},  {2147483647, 1}, {-2147483647 - 1, 1},
-    };
-    for (const auto& [baud, gap] : gaps)
-        EXPECT_EQ(gap, _MRTU::interCharacterGap(baud)) << baud;
-}
-
-TEST(SerialSettingsTest, ListedBaudRates) {
-    for (const int baud : {150, 300, 600, 1200, 2400, 4800, 9600, 19200, 38400, 57600, 115200})
-        EXPECT_TRUE(_MRTU::isListedBaudRate(baud)) << baud;
-    for (const int baud : {0, 1, 110, 149, 14400, 28800, 115201, 230400, -9600})
-        EXPECT_FALSE(_MRTU::isListedBaudRate(baud)) << baud;
 }
 
 }  // namespace

@@ -15,7 +15,7 @@ using testing_support::AllocationCounter;
 using testing_support::FixedReplyPort;
 using testing_support::operator+;
 
-class AllocationTest : public ::testing::Test {
+class DriverAllocationTest : public ::testing::Test {
   protected:
     void start(const std::string& items) {
         host.serialFactory.offer("com1", port);
@@ -54,32 +54,32 @@ class AllocationTest : public ::testing::Test {
     Bytes data = Bytes(512, 0);
 };
 
-TEST_F(AllocationTest, TheCounterCounts) {
+TEST_F(DriverAllocationTest, TheCounterCounts) {
     const AllocationCounter counter;
     const std::string text(100, 'x');
     EXPECT_EQ(1U, counter.allocations());
     EXPECT_EQ(100U, text.size());
 }
 
-TEST_F(AllocationTest, ReadOfAFullBlock) {
+TEST_F(DriverAllocationTest, ReadOfAFullBlock) {
     start("");
     port.setReply(rtuFrame(hex("01 03 FA") + Bytes(250, 1)));
     EXPECT_EQ(0U, costOfRead(tag("1?HREG?400001?short"), 125));
 }
 
-TEST_F(AllocationTest, ReadOfAFullBlockInAscii) {
+TEST_F(DriverAllocationTest, ReadOfAFullBlockInAscii) {
     start("txMode=ASCII");
     port.setReply(asciiFrame(hex("01 03 FA") + Bytes(250, 1)));
     EXPECT_EQ(0U, costOfRead(tag("1?HREG?400001?short"), 125));
 }
 
-TEST_F(AllocationTest, ReadOfCoils) {
+TEST_F(DriverAllocationTest, ReadOfCoils) {
     start("");
     port.setReply(rtuFrame(hex("01 01 FA") + Bytes(250, 1)));
     EXPECT_EQ(0U, costOfRead(tag("1?OUTP?4?boolean"), 2000));
 }
 
-TEST_F(AllocationTest, ReadOfAnOverriddenNode) {
+TEST_F(DriverAllocationTest, ReadOfAnOverriddenNode) {
     start("");
     char answer[64];
     driver.DoCommand("setid 1 9", answer, sizeof answer);
@@ -87,25 +87,25 @@ TEST_F(AllocationTest, ReadOfAnOverriddenNode) {
     EXPECT_EQ(0U, costOfRead(tag("1?HREG?400001?short"), 1));
 }
 
-TEST_F(AllocationTest, WriteOfRegisters) {
+TEST_F(DriverAllocationTest, WriteOfRegisters) {
     start("");
     port.setReply(rtuFrame(hex("01 10 00 00 00 7B")));
     EXPECT_EQ(0U, costOfWrite(tag("1?HREG?400001?short"), 123));
 }
 
-TEST_F(AllocationTest, WriteOfRegistersInAscii) {
+TEST_F(DriverAllocationTest, WriteOfRegistersInAscii) {
     start("txMode=ASCII");
     port.setReply(asciiFrame(hex("01 10 00 00 00 7B")));
     EXPECT_EQ(0U, costOfWrite(tag("1?HREG?400001?short"), 123));
 }
 
-TEST_F(AllocationTest, WriteOfCoils) {
+TEST_F(DriverAllocationTest, WriteOfCoils) {
     start("");
     port.setReply(rtuFrame(hex("01 0F 00 00 07 B0")));
     EXPECT_EQ(0U, costOfWrite(tag("1?OUTP?1?boolean"), 1968));
 }
 
-TEST_F(AllocationTest, WriteOfSingleItems) {
+TEST_F(DriverAllocationTest, WriteOfSingleItems) {
     start("presetFunction=06 forceFunction=05");
     port.setReply(rtuFrame(hex("01 06 00 00 00 00")));
     EXPECT_EQ(0U, costOfWrite(tag("1?HREG?400001?short"), 1));
@@ -113,7 +113,7 @@ TEST_F(AllocationTest, WriteOfSingleItems) {
     EXPECT_EQ(0U, costOfWrite(tag("1?OUTP?1?boolean"), 1));
 }
 
-TEST_F(AllocationTest, FirstRequestOfASecondTag) {
+TEST_F(DriverAllocationTest, FirstRequestOfASecondTag) {
     start("");
     port.setReply(rtuFrame(hex("01 03 02 12 34")));
     ASSERT_EQ(0U, costOfRead(tag("1?HREG?400001?short"), 1));
@@ -123,7 +123,7 @@ TEST_F(AllocationTest, FirstRequestOfASecondTag) {
     EXPECT_EQ(0U, counter.allocations() + counter.releases());
 }
 
-TEST_F(AllocationTest, FailedRequest) {
+TEST_F(DriverAllocationTest, FailedRequest) {
     start("repeat=0");
     port.setReply(rtuFrame(hex("01 83 02")));
     const Tag_MRTU* word = tag("1?HREG?400001?short");
@@ -135,7 +135,7 @@ TEST_F(AllocationTest, FailedRequest) {
 }
 
 /// The key of a node's Modicon mode is longer than what a string holds without the heap.
-TEST_F(AllocationTest, SecondRequestOfANodeWithALongNumber) {
+TEST_F(DriverAllocationTest, SecondRequestOfANodeWithALongNumber) {
     start("");
     port.setReply(rtuFrame(hex("01 03 02 12 34")));
     EXPECT_EQ(0U, costOfRead(tag("1000000001?HREG?400001?short"), 1)) << "low byte 1";

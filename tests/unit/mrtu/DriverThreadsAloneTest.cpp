@@ -14,7 +14,7 @@ using driver_test::rtuFrame;
 using testing_support::registersReply;
 using testing_support::rtuMessage;
 
-class ThreadsTest : public DriverTest {
+class DriverThreadsAloneTest : public DriverTest {
   protected:
     /// A slave whose register n holds n.
     static Bytes answer(const Bytes& frame) {
@@ -24,7 +24,7 @@ class ThreadsTest : public DriverTest {
     }
 };
 
-TEST_F(ThreadsTest, EveryThreadGetsItsOwnAnswer) {
+TEST_F(DriverThreadsAloneTest, EveryThreadGetsItsOwnAnswer) {
     start();
     port.answerWith(answer);
     const Tag_MRTU* word = tag("1?HREG?400001?short");
@@ -49,7 +49,7 @@ TEST_F(ThreadsTest, EveryThreadGetsItsOwnAnswer) {
 
 /// While one thread waits for its answer, another one's Stop() waits for the lock; the port goes
 /// only after the exchange.
-TEST_F(ThreadsTest, StopWaitsForTheRunningTransaction) {
+TEST_F(DriverThreadsAloneTest, StopWaitsForTheRunningTransaction) {
     start("repeat=0");
     port.answerWith(answer);
     const Tag_MRTU* word = tag("1?HREG?400001?short");
@@ -71,7 +71,7 @@ TEST_F(ThreadsTest, StopWaitsForTheRunningTransaction) {
 }
 
 /// A transaction that was waiting for the lock while Stop() held it finds no port any more.
-TEST_F(ThreadsTest, TransactionBehindAStopFindsTheLineClosed) {
+TEST_F(DriverThreadsAloneTest, TransactionBehindAStopFindsTheLineClosed) {
     start("repeat=0 delay=1");
     const Tag_MRTU* word = tag("1?HREG?400001?short");
     std::atomic<bool> go = false;
@@ -92,7 +92,7 @@ TEST_F(ThreadsTest, TransactionBehindAStopFindsTheLineClosed) {
 
 /// A thread passes the first look at the state, pauses, and takes the line only when the driver was
 /// stopped and is about to start again: the port is open by then, but nobody has set it up.
-TEST_F(ThreadsTest, TransactionThatWaitedThroughAStopKeepsOffAPortThatIsBeingStarted) {
+TEST_F(DriverThreadsAloneTest, TransactionThatWaitedThroughAStopKeepsOffAPortThatIsBeingStarted) {
     start("repeat=0 delay=1");
     port.answerWith(answer);
     const Tag_MRTU* word = tag("1?HREG?400001?short");
@@ -122,7 +122,7 @@ TEST_F(ThreadsTest, TransactionThatWaitedThroughAStopKeepsOffAPortThatIsBeingSta
     expectError(-3, "Protocol not started");
 }
 
-TEST_F(ThreadsTest, StopWaitsForThePortToBeSetUpBySpDone) {
+TEST_F(DriverThreadsAloneTest, StopWaitsForThePortToBeSetUpBySpDone) {
     start();
     const Tag_MRTU* apply = tag("1?SP_Done?0?boolean");
     std::latch stopping(1);
@@ -142,7 +142,7 @@ TEST_F(ThreadsTest, StopWaitsForThePortToBeSetUpBySpDone) {
 }
 
 /// Two threads start at once: the port is opened by one of them.
-TEST_F(ThreadsTest, TwoStartsOpenThePortOnce) {
+TEST_F(DriverThreadsAloneTest, TwoStartsOpenThePortOnce) {
     configure();
     std::latch bothThere(2);
     const auto startOnce = [&] {
@@ -158,7 +158,7 @@ TEST_F(ThreadsTest, TwoStartsOpenThePortOnce) {
 
 /// A write of one bit is a read and a write of its register; were they not one step, a thread would
 /// now and then put back the other one's old bit.
-TEST_F(ThreadsTest, TwoThreadsFlippingBitsOfOneRegisterLoseNoUpdate) {
+TEST_F(DriverThreadsAloneTest, TwoThreadsFlippingBitsOfOneRegisterLoseNoUpdate) {
     std::uint16_t holding = 0;  // Guarded by the line's lock, as on a real line.
     start();
     port.answerWith([&holding](const Bytes& frame) {

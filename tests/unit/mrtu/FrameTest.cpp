@@ -20,14 +20,14 @@ Bytes bytesOf(const _MRTU::Frame& frame) {
     return {frame.bytes.begin(), frame.bytes.begin() + frame.length};
 }
 
-TEST(ChecksumTest, CrcComesSwappedForComparisonWithTheFrame) {
+TEST(FrameTest, ChecksumCrcComesSwappedForComparisonWithTheFrame) {
     EXPECT_EQ(0xC5CD, crc(hex("01 03 00 00 00 0A")));
     EXPECT_EQ(0x374B, crc(characters("123456789"))) << "published check value 0x4B37";
     EXPECT_EQ(0xFFFF, crc({})) << "the start value";
     EXPECT_EQ(0xBF40, crc(hex("00"))) << "published value 0x40BF of one zero byte";
 }
 
-TEST(ChecksumTest, CrcAgreesWithAnotherWayOfComputingIt) {
+TEST(FrameTest, ChecksumCrcAgreesWithAnotherWayOfComputingIt) {
     Bytes data;
     for (int length = 0; length < 300; ++length) {
         const Bytes expected = testing_support::crcOf(data);
@@ -36,7 +36,7 @@ TEST(ChecksumTest, CrcAgreesWithAnotherWayOfComputingIt) {
     }
 }
 
-TEST(ChecksumTest, LrcMakesTheSumZero) {
+TEST(FrameTest, ChecksumLrcMakesTheSumZero) {
     EXPECT_EQ(0xF2, _MRTU::calcLrc(hex("01 03 00 00 00 0A")));
     EXPECT_EQ(0x00, _MRTU::calcLrc({}));
     EXPECT_EQ(0x00, _MRTU::calcLrc(hex("80 80")));
@@ -45,38 +45,38 @@ TEST(ChecksumTest, LrcMakesTheSumZero) {
     EXPECT_EQ(0x80, _MRTU::calcLrc(hex("80")));
 }
 
-TEST(RtuFrameTest, GoldenRequest) {
+TEST(FrameTest, RtuGoldenRequest) {
     const Bytes message = hex("01 03 00 00 00 0A");
     EXPECT_EQ("01 03 00 00 00 0A C5 CD", toHex(bytesOf(_MRTU::frameRtu(message))));
 }
 
-TEST(RtuFrameTest, GoldenRequestOfTheStandard) {
+TEST(FrameTest, RtuGoldenRequestOfTheStandard) {
     const Bytes message = hex("11 05 00 AC FF 00");
     EXPECT_EQ("11 05 00 AC FF 00 4E 8B", toHex(bytesOf(_MRTU::frameRtu(message))));
 }
 
-TEST(RtuFrameTest, LongestMessageFillsAFrame) {
+TEST(FrameTest, RtuLongestMessageFillsAFrame) {
     const Bytes message(_MRTU::kMaxMessage, 0x5A);
     const Bytes frame = bytesOf(_MRTU::frameRtu(message));
     EXPECT_EQ(256U, frame.size());
     EXPECT_EQ(toHex(testing_support::rtuFrame(message)), toHex(frame));
 }
 
-TEST(RtuFrameTest, FramesOfFiveBytesAndMoreAreGoodWithTheirCrc) {
+TEST(FrameTest, RtuFramesOfFiveBytesAndMoreAreGoodWithTheirCrc) {
     for (std::size_t length = 0; length <= 254; ++length) {
         const Bytes frame = testing_support::rtuFrame(Bytes(length, 0x11));
         EXPECT_EQ(frame.size() > 4, _MRTU::isGoodRtuFrame(frame)) << toHex(frame);
     }
 }
 
-TEST(RtuFrameTest, EveryTruncationOfAGoodFrameIsBad) {
+TEST(FrameTest, RtuEveryTruncationOfAGoodFrameIsBad) {
     const Bytes good = testing_support::rtuFrame(hex("01 03 04 12 34 56 78"));
     ASSERT_TRUE(_MRTU::isGoodRtuFrame(good));
     for (std::size_t length = 0; length < good.size(); ++length)
         EXPECT_FALSE(_MRTU::isGoodRtuFrame(testing_support::firstOf(good, length))) << length;
 }
 
-TEST(RtuFrameTest, EveryFlippedBitMakesAFrameBad) {
+TEST(FrameTest, RtuEveryFlippedBitMakesAFrameBad) {
     const Bytes good = testing_support::rtuFrame(hex("01 03 04 12 34 56 78"));
     for (std::size_t bit = 0; bit < good.size() * 8; ++bit) {
         Bytes bad = good;
@@ -85,11 +85,11 @@ TEST(RtuFrameTest, EveryFlippedBitMakesAFrameBad) {
     }
 }
 
-TEST(RtuFrameTest, SwappedCrcIsBad) {
+TEST(FrameTest, RtuSwappedCrcIsBad) {
     EXPECT_FALSE(_MRTU::isGoodRtuFrame(hex("01 03 00 00 00 0A CD C5")));
 }
 
-TEST(MessageTest, WordsGoHighByteFirst) {
+TEST(FrameTest, MessageWordsGoHighByteFirst) {
     _MRTU::Message message;
     message.put(0x11);
     message.putWord(0x1234);
@@ -98,7 +98,7 @@ TEST(MessageTest, WordsGoHighByteFirst) {
     EXPECT_EQ(0x12, message[1]);
 }
 
-TEST(MessageTest, TellsWhatStillFits) {
+TEST(FrameTest, MessageTellsWhatStillFits) {
     _MRTU::Message message;
     EXPECT_TRUE(message.fits(254));
     EXPECT_FALSE(message.fits(255));

@@ -134,7 +134,7 @@ TEST_F(MemoryMapTest, InputRegistersExistInModelTwoAndLongOnesNotInModelOne) {
     EXPECT_EQ("1", map().getModel("unknown")->getName());
 }
 
-TEST(AddressTableTest, FiveRows) {
+TEST_F(MemoryMapTest, AddressTableHasFiveRows) {
     struct Copy {
         const char* name;
         int shortMin, shortMax, longMin, longMax;
@@ -147,11 +147,11 @@ TEST(AddressTableTest, FiveRows) {
     ASSERT_EQ(std::size(copies), _MRTU::table.size());
     for (std::size_t i = 0; i < std::size(copies); ++i) {
         const _MRTU::AddressRange& row = _MRTU::table[i];
-        EXPECT_EQ(copies[i].name, row.name);
-        EXPECT_EQ(copies[i].shortMin, row.shortMin) << row.name;
-        EXPECT_EQ(copies[i].shortMax, row.shortMax) << row.name;
-        EXPECT_EQ(copies[i].longMin, row.longMin) << row.name;
-        EXPECT_EQ(copies[i].longMax, row.longMax) << row.name;
+        EXPECT_EQ(row.name, copies[i].name);
+        EXPECT_EQ(row.shortMin, copies[i].shortMin) << row.name;
+        EXPECT_EQ(row.shortMax, copies[i].shortMax) << row.name;
+        EXPECT_EQ(row.longMin, copies[i].longMin) << row.name;
+        EXPECT_EQ(row.longMax, copies[i].longMax) << row.name;
         EXPECT_EQ(&row, _MRTU::addressRange(copies[i].name));
     }
     EXPECT_EQ(nullptr, _MRTU::addressRange("NO"));

@@ -63,83 +63,83 @@ const char* const kOffsetText = "Incorrect offset in response";
 const char* const kCountText = "Incorrect count in response";
 const char* const kAcknowledgeText = "Incorrect writing data acknowledge";
 
-TEST(ArrivalCheckTest, NothingReceivedIsNoResponse) {
+TEST(ReplyTest, NothingReceivedIsNoResponse) {
     expectFault(-4, "No response", checkRead(_MRTU::Reply(), 2));
 }
 
-TEST(ArrivalCheckTest, LessThanFiveBytesAreTooShort) {
+TEST(ReplyTest, LessThanFiveBytesAreTooShort) {
     for (int received = 1; received < 5; ++received)
         expectFault(-6, "The received message too short", checkRead(refused("", received), 2));
 }
 
-TEST(ArrivalCheckTest, FiveBytesAreLookedAtForTheirCheckSum) {
+TEST(ReplyTest, FiveBytesAreLookedAtForTheirCheckSum) {
     expectFault(-6, "Incorrect response checksum", checkRead(refused("01 83 02", 5), 2));
 }
 
-TEST(ArrivalCheckTest, RightCheckSumAfterAllLetsTheFramePass) {
+TEST(ReplyTest, RightCheckSumAfterAllLetsTheFramePass) {
     _MRTU::Reply frame = refused("01 03 02 12 34", 7);
     const Bytes crc = testing_support::crcOf(hex("01 03 02 12 34"));
     std::copy(crc.begin(), crc.end(), frame.bytes.begin() + 5);
     EXPECT_FALSE(checkRead(frame, 2));
 }
 
-TEST(ArrivalCheckTest, OnlyTheLastAttemptDecidesWhatIsMissing) {
+TEST(ReplyTest, OnlyTheLastAttemptDecidesWhatIsMissing) {
     // A whole frame lies in the buffer from an earlier attempt.
     expectFault(-4, "No response", checkRead(refused("01 03 02 12 34", 0), 2));
     expectFault(-6, "The received message too short", checkRead(refused("01 03 02 12 34", 4), 2));
 }
 
-TEST(ArrivalCheckTest, TooShortIsReportedBeforeCheckSum) {
+TEST(ReplyTest, TooShortIsReportedBeforeCheckSum) {
     expectFault(-6, "The received message too short", checkRead(refused("01 83", 4), 2));
 }
 
-TEST(ArrivalCheckTest, CheckSumIsReportedBeforeNode) {
+TEST(ReplyTest, CheckSumIsReportedBeforeNode) {
     expectFault(-6, "Incorrect response checksum", checkRead(refused("02 03 02 12 34", 7), 2));
 }
 
-TEST(CommonCheckTest, RightNodeAndFunctionPass) {
+TEST(ReplyTest, RightNodeAndFunctionPass) {
     EXPECT_FALSE(checkRead(reply("01 03 02 00 00"), 2));
 }
 
-TEST(CommonCheckTest, NodeMustMatch) {
+TEST(ReplyTest, NodeMustMatch) {
     expectFault(-6, kNodeText, checkRead(reply("02 03 02 00 00"), 2));
 }
 
-TEST(CommonCheckTest, ExceptionIsReportedWithItsText) {
+TEST(ReplyTest, ExceptionIsReportedWithItsText) {
     expectFault(-6, "Exception: Illegal data address", checkRead(reply("01 83 02"), 2));
     expectFault(-6, "Unknown exception", checkRead(reply("01 83 07"), 2));
 }
 
-TEST(CommonCheckTest, FunctionMustMatch) {
+TEST(ReplyTest, FunctionMustMatch) {
     expectFault(-6, kOperationText, checkRead(reply("01 04 02 00 00"), 2));
 }
 
-TEST(CommonCheckTest, ExceptionOfAnotherFunctionIsAWrongOperation) {
+TEST(ReplyTest, ExceptionOfAnotherFunctionIsAWrongOperation) {
     expectFault(-6, kOperationText, checkRead(reply("01 84 02"), 2));
 }
 
-TEST(CommonCheckTest, NodeIsReportedBeforeException) {
+TEST(ReplyTest, NodeIsReportedBeforeException) {
     expectFault(-6, kNodeText, checkRead(reply("02 83 02"), 2));
 }
 
-TEST(CommonCheckTest, NodeIsReportedBeforeFunction) {
+TEST(ReplyTest, NodeIsReportedBeforeFunction) {
     expectFault(-6, kNodeText, checkRead(reply("02 04 02"), 2));
 }
 
-TEST(CommonCheckTest, ExceptionIsReportedBeforeDataLength) {
+TEST(ReplyTest, ExceptionIsReportedBeforeDataLength) {
     expectFault(-6, "Exception: Illegal function", checkRead(reply("01 83 01"), 2));
 }
 
-TEST(CommonCheckTest, FunctionIsReportedBeforeDataLength) {
+TEST(ReplyTest, FunctionIsReportedBeforeDataLength) {
     expectFault(-6, kOperationText, checkRead(reply("01 04 03 12"), 2));
 }
 
-TEST(CommonCheckTest, FunctionIsReportedBeforeOffset) {
+TEST(ReplyTest, FunctionIsReportedBeforeOffset) {
     expectFault(-6, kOperationText,
                 checkWrite(message("01 06 00 10 12 34"), reply("01 05 00 11 12 34")));
 }
 
-TEST(ReadCheckTest, LengthAndByteCountMustMatch) {
+TEST(ReplyTest, LengthAndByteCountMustMatch) {
     EXPECT_FALSE(checkRead(reply("01 03 02 12 34"), 2));
     EXPECT_FALSE(checkRead(reply("01 03 02 12 34", 1), 2));
     expectFault(-6, kLengthText, checkRead(reply("01 03 02 12 34 56"), 2));
@@ -148,18 +148,18 @@ TEST(ReadCheckTest, LengthAndByteCountMustMatch) {
     expectFault(-6, kLengthText, checkRead(reply("01 03 00"), 2));
 }
 
-TEST(ReadCheckTest, CheckOfTheOtherModeMakesTheLengthWrong) {
+TEST(ReplyTest, CheckOfTheOtherModeMakesTheLengthWrong) {
     _MRTU::Reply frame = reply("01 03 02 12 34", 2);
     frame.checkLength = 1;
     expectFault(-6, kLengthText, checkRead(frame, 2));
 }
 
-TEST(ReadCheckTest, NoDataAtAllIsALengthToo) {
+TEST(ReplyTest, NoDataAtAllIsALengthToo) {
     EXPECT_FALSE(checkRead(reply("01 03 00"), 0));
     expectFault(-6, kLengthText, checkRead(reply("01 03 01"), 0));
 }
 
-TEST(ReadCheckTest, ProductAboveTwoHundredFiftyFiveNeverMatches) {
+TEST(ReplyTest, ProductAboveTwoHundredFiftyFiveNeverMatches) {
     _MRTU::Reply frame = reply("01 03 00");
     for (const int dataLength : {256, 512, 1024}) {
         frame.length = dataLength + 3 + 2;
@@ -167,7 +167,7 @@ TEST(ReadCheckTest, ProductAboveTwoHundredFiftyFiveNeverMatches) {
     }
 }
 
-TEST(WriteCheckTest, MatchingAcknowledgementsPass) {
+TEST(ReplyTest, MatchingAcknowledgementsPass) {
     EXPECT_FALSE(checkWrite(message("01 06 00 10 12 34"), reply("01 06 00 10 12 34")));
     EXPECT_FALSE(checkWrite(message("01 05 00 10 FF 00"), reply("01 05 00 10 FF 00")));
     EXPECT_FALSE(
@@ -175,7 +175,7 @@ TEST(WriteCheckTest, MatchingAcknowledgementsPass) {
     EXPECT_FALSE(checkWrite(message("01 0F 00 10 00 03 01 05"), reply("01 0F 00 10 00 03")));
 }
 
-TEST(WriteCheckTest, OffsetMustMatchInBothBytes) {
+TEST(ReplyTest, OffsetMustMatchInBothBytes) {
     for (const char* function : {"05", "06", "0F", "10"}) {
         const std::string head = std::string("01 ") + function;
         const auto request = message(head + " 12 34 FF 00");
@@ -184,7 +184,7 @@ TEST(WriteCheckTest, OffsetMustMatchInBothBytes) {
     }
 }
 
-TEST(WriteCheckTest, SingleWritesEchoTheirValue) {
+TEST(ReplyTest, SingleWritesEchoTheirValue) {
     for (const char* function : {"05", "06"}) {
         const std::string head = std::string("01 ") + function + " 00 10 ";
         const auto request = message(head + "FF 00");
@@ -193,7 +193,7 @@ TEST(WriteCheckTest, SingleWritesEchoTheirValue) {
     }
 }
 
-TEST(WriteCheckTest, BlockWritesTellTheirCount) {
+TEST(ReplyTest, BlockWritesTellTheirCount) {
     for (const char* function : {"0F", "10"}) {
         const std::string head = std::string("01 ") + function + " 00 10 ";
         const auto request = message(head + "01 02 04");
@@ -202,22 +202,22 @@ TEST(WriteCheckTest, BlockWritesTellTheirCount) {
     }
 }
 
-TEST(WriteCheckTest, OffsetIsReportedBeforeAcknowledge) {
+TEST(ReplyTest, OffsetIsReportedBeforeAcknowledge) {
     expectFault(-6, kOffsetText,
                 checkWrite(message("01 06 00 10 12 34"), reply("01 06 00 11 12 35")));
 }
 
-TEST(WriteCheckTest, OffsetIsReportedBeforeCount) {
+TEST(ReplyTest, OffsetIsReportedBeforeCount) {
     expectFault(-6, kOffsetText,
                 checkWrite(message("01 10 00 10 00 01 02 00 00"), reply("01 10 00 11 00 02")));
 }
 
-TEST(WriteCheckTest, OnlyTwoEchoedBytesAreCompared) {
+TEST(ReplyTest, OnlyTwoEchoedBytesAreCompared) {
     EXPECT_FALSE(checkWrite(message("01 06 00 10 11 22 33 44"), reply("01 06 00 10 11 22")));
     EXPECT_FALSE(checkWrite(message("01 06 00 10 11 22 33 44"), reply("01 06 00 10 11 22 00 00")));
 }
 
-TEST(FaultTextTest, CodesAndTexts) {
+TEST(ReplyTest, FaultsHaveCodesAndTexts) {
     expectFault(-1, "Can't open serial port", _MRTU::kCannotOpen);
     expectFault(-3, "Protocol not started", _MRTU::kNotStarted);
     expectFault(-4, "No response", _MRTU::kNoResponse);
@@ -228,7 +228,7 @@ TEST(FaultTextTest, CodesAndTexts) {
     EXPECT_EQ(0, _MRTU::kNoFault.code);
 }
 
-TEST(ExceptionTextTest, EveryCode) {
+TEST(ReplyTest, EveryExceptionCodeHasItsText) {
     const std::map<int, std::string> texts = {
         {1, "Exception: Illegal function"},
         {2, "Exception: Illegal data address"},
