@@ -25,15 +25,15 @@ class ChannelTest : public ::testing::Test {
 TEST_F(ChannelTest, RefusedConfigurationCarriesCodeAndText) {
     const auto done = channel_.configure("bad");
     ASSERT_FALSE(done);
-    EXPECT_EQ(done.error().code, -1);
-    EXPECT_EQ(done.error().text, "bad configuration");
+    EXPECT_EQ(-1, done.error().code);
+    EXPECT_EQ("bad configuration", done.error().text);
     EXPECT_TRUE(channel_.configure("good"));
 }
 
 TEST_F(ChannelTest, RefusedTagCarriesCodeAndText) {
     const auto tag = channel_.createTag("bad");
     ASSERT_FALSE(tag);
-    EXPECT_EQ(tag.error().text, "bad tag");
+    EXPECT_EQ("bad tag", tag.error().text);
 }
 
 TEST_F(ChannelTest, ReadBeforeStartFails) {
@@ -41,7 +41,7 @@ TEST_F(ChannelTest, ReadBeforeStartFails) {
     ASSERT_TRUE(tag);
     const auto value = channel_.read(*tag.value());
     ASSERT_FALSE(value);
-    EXPECT_EQ(value.error().code, -3);
+    EXPECT_EQ(-3, value.error().code);
     channel_.freeTag(tag.value());
 }
 
@@ -64,23 +64,23 @@ TEST_F(ChannelTest, ValueOfWrongSizeNeverReachesTheDriver) {
     const std::uint8_t tooLong[] = {9, 9, 9};
     const auto done = channel_.write(*tag.value(), tooLong);
     ASSERT_FALSE(done);
-    EXPECT_EQ(done.error().code, -1);
-    EXPECT_EQ(done.error().text, "the value has 3 bytes, the tag takes 2");
+    EXPECT_EQ(-1, done.error().code);
+    EXPECT_EQ("the value has 3 bytes, the tag takes 2", done.error().text);
     EXPECT_THAT(channel_.read(*tag.value()).value(), ElementsAre(0, 0));
     channel_.freeTag(tag.value());
 }
 
 TEST_F(ChannelTest, AnswerThatFillsTheBufferNeedsNoTerminator) {
-    EXPECT_EQ(channel_.command("count", 4), "0123");
-    EXPECT_EQ(channel_.command("count", 64), "0123456789");
+    EXPECT_EQ("0123", channel_.command("count", 4));
+    EXPECT_EQ("0123456789", channel_.command("count", 64));
 }
 
 TEST_F(ChannelTest, UnknownCommandHasNoAnswer) {
-    EXPECT_EQ(channel_.command("what"), std::nullopt);
+    EXPECT_EQ(std::nullopt, channel_.command("what"));
 }
 
 TEST_F(ChannelTest, DriverOfEarlierGenerationReportsNoParameters) {
-    EXPECT_EQ(channel_.communicationParameters(), std::nullopt);
+    EXPECT_EQ(std::nullopt, channel_.communicationParameters());
 }
 
 TEST_F(ChannelTest, StopEndsReading) {
@@ -96,7 +96,7 @@ TEST_F(ChannelTest, StopEndsReading) {
 
 TEST_F(ChannelTest, IdentReachesTheDriver) {
     channel_.setIdent("line 1");
-    EXPECT_STREQ(channel_.protocol().GetIdent(), "line 1");
+    EXPECT_STREQ("line 1", channel_.protocol().GetIdent());
 }
 
 }  // namespace

@@ -17,20 +17,20 @@ TEST(HostServices, ServesTheRequiredFourByExactName) {
         IInterface* service = host.services.CreateInterface(name);
         ASSERT_NE(service, nullptr) << name;
         EXPECT_NE(service->ConvertTo(name), nullptr) << name;
-        EXPECT_EQ(service->ConvertTo("IElse"), nullptr) << name;
-        EXPECT_EQ(host.services.outstanding(name), 1) << name;
+        EXPECT_EQ(nullptr, service->ConvertTo("IElse")) << name;
+        EXPECT_EQ(1, host.services.outstanding(name)) << name;
     }
-    EXPECT_EQ(host.services.outstanding(), 4);
+    EXPECT_EQ(4, host.services.outstanding());
 }
 
 TEST(HostServices, OthersAreNull) {
     FakeHost host;
     for (const char* name : {"IDiag", "IDriverInterface", "ISmux", "IFastTimer", "imultitask2",
                              "IMultiTask2 ", "", "IPermanentStorage"}) {
-        EXPECT_EQ(host.services.CreateInterface(name), nullptr) << name;
+        EXPECT_EQ(nullptr, host.services.CreateInterface(name)) << name;
     }
-    EXPECT_EQ(host.services.CreateInterface(nullptr), nullptr);
-    EXPECT_EQ(host.services.outstanding(), 0);
+    EXPECT_EQ(nullptr, host.services.CreateInterface(nullptr));
+    EXPECT_EQ(0, host.services.outstanding());
 }
 
 TEST(HostServices, ServesStorageWhenThereIsOne) {
@@ -40,18 +40,18 @@ TEST(HostServices, ServesStorageWhenThereIsOne) {
     HostServices services(multiTask, serial, &storage);
     IInterface* held = services.CreateInterface("IPermanentStorage");
     ASSERT_NE(held, nullptr);
-    EXPECT_EQ(held->ConvertTo("IPermanentStorage2"), static_cast<IPermanentStorage2*>(&storage));
+    EXPECT_EQ(static_cast<IPermanentStorage2*>(&storage), held->ConvertTo("IPermanentStorage2"));
 }
 
 TEST(HostServices, CountsWhatIsHeld) {
     FakeHost host;
     IInterface* first = host.services.CreateInterface("IMultiTask2");
     IInterface* second = host.services.CreateInterface("IMultiTask2");
-    EXPECT_EQ(host.services.outstanding(), 2);
+    EXPECT_EQ(2, host.services.outstanding());
     host.services.ReleaseInterface(first);
     host.services.ReleaseInterface(second);
-    EXPECT_EQ(host.services.outstanding(), 0);
-    EXPECT_EQ(host.services.strayReleases(), 0);
+    EXPECT_EQ(0, host.services.outstanding());
+    EXPECT_EQ(0, host.services.strayReleases());
 }
 
 TEST(HostServices, NoticesReleasesOfWhatIsNotHeld) {
@@ -60,8 +60,8 @@ TEST(HostServices, NoticesReleasesOfWhatIsNotHeld) {
     host.services.ReleaseInterface(&foreign);
     host.services.ReleaseInterface(&host.multiTask);
     host.services.ReleaseInterface(nullptr);
-    EXPECT_EQ(host.services.strayReleases(), 3);
-    EXPECT_EQ(host.services.outstanding(), 0);
+    EXPECT_EQ(3, host.services.strayReleases());
+    EXPECT_EQ(0, host.services.outstanding());
 }
 
 TEST(HostServices, CountsFromSeveralThreads) {
@@ -74,8 +74,8 @@ TEST(HostServices, CountsFromSeveralThreads) {
     std::thread other(takeAndGiveBack);
     takeAndGiveBack();
     other.join();
-    EXPECT_EQ(host.services.outstanding(), 0);
-    EXPECT_EQ(host.services.strayReleases(), 0);
+    EXPECT_EQ(0, host.services.outstanding());
+    EXPECT_EQ(0, host.services.strayReleases());
 }
 
 }  // namespace

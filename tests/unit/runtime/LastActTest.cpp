@@ -24,14 +24,14 @@ int undoneNow() {
 TEST(LastAct, RunsWhileItIsAnnounced) {
     const int one = 1;
     const int ten = 10;
-    EXPECT_EQ(undoneNow(), 0);
+    EXPECT_EQ(0, undoneNow());
     const LastAct first(undo, &one);
     {
         const LastAct second(undo, &ten);
-        EXPECT_EQ(undoneNow(), 11);
-        EXPECT_EQ(undoneNow(), 11);
+        EXPECT_EQ(11, undoneNow());
+        EXPECT_EQ(11, undoneNow());
     }
-    EXPECT_EQ(undoneNow(), 1);
+    EXPECT_EQ(1, undoneNow());
 }
 
 TEST(LastAct, MoreThanThereIsRoomForAreNotNoted) {
@@ -39,11 +39,11 @@ TEST(LastAct, MoreThanThereIsRoomForAreNotNoted) {
     std::vector<std::unique_ptr<LastAct>> acts;
     for (int count = 0; count < runtime::kLastActs + 3; ++count)
         acts.push_back(std::make_unique<LastAct>(undo, &one));
-    EXPECT_EQ(undoneNow(), runtime::kLastActs);
+    EXPECT_EQ(runtime::kLastActs, undoneNow());
     acts.clear();
-    EXPECT_EQ(undoneNow(), 0);
+    EXPECT_EQ(0, undoneNow());
     const LastAct again(undo, &one);
-    EXPECT_EQ(undoneNow(), 1);
+    EXPECT_EQ(1, undoneNow());
 }
 
 }  // namespace

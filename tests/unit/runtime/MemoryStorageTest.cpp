@@ -21,15 +21,15 @@ TEST(MemoryStorage, RefusedWriteChangesNothingAndSaysWhy) {
     storage.writeInt("line1", "baud", 300);
     storage.removeKey("line1", "baud");
     EXPECT_TRUE(storage.failed());
-    EXPECT_EQ(storage.lastError(), "no space left");
-    EXPECT_EQ(storage.readInt("line1", "baud"), 9600);
-    EXPECT_EQ(storage.writes(), 1);
+    EXPECT_EQ("no space left", storage.lastError());
+    EXPECT_EQ(9600, storage.readInt("line1", "baud"));
+    EXPECT_EQ(1, storage.writes());
 
     storage.refuseWrites("");
     storage.clearFailure();
     storage.writeInt("line1", "baud", 300);
     EXPECT_FALSE(storage.failed());
-    EXPECT_EQ(storage.readInt("line1", "baud"), 300);
+    EXPECT_EQ(300, storage.readInt("line1", "baud"));
 }
 
 TEST(MemoryStorage, RefusedReadFindsNothingAndSaysWhy) {
@@ -37,11 +37,11 @@ TEST(MemoryStorage, RefusedReadFindsNothingAndSaysWhy) {
     storage.writeString("line1", "tempNode1", "7");
     storage.refuseReads("disk gone");
     char untouched[] = "before";
-    EXPECT_STREQ(storage.readString("line1", "tempNode1"), "");
-    EXPECT_EQ(storage.keyCount("line1"), 0);
-    EXPECT_EQ(storage.readStringInto("line1", "tempNode1", untouched, sizeof untouched), 0);
-    EXPECT_STREQ(untouched, "before");
-    EXPECT_EQ(storage.lastError(), "disk gone");
+    EXPECT_STREQ("", storage.readString("line1", "tempNode1"));
+    EXPECT_EQ(0, storage.keyCount("line1"));
+    EXPECT_EQ(0, storage.readStringInto("line1", "tempNode1", untouched, sizeof untouched));
+    EXPECT_STREQ("before", untouched);
+    EXPECT_EQ("disk gone", storage.lastError());
 }
 
 }  // namespace

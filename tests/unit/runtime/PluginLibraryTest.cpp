@@ -50,7 +50,7 @@ TEST_P(Refusal, NamesItsReasonAndReleasesTheLibrary) {
     const std::string path = fakePlugin(GetParam().file);
     const auto error = refusalOf(path, GetParam().protocol);
     ASSERT_TRUE(error.has_value());
-    EXPECT_EQ(error->fault, GetParam().fault);
+    EXPECT_EQ(GetParam().fault, error->fault);
     EXPECT_THAT(error->text, StartsWith(path + ": "));
     EXPECT_THAT(error->text, HasSubstr(GetParam().text));
     EXPECT_FALSE(isLoaded(path));
@@ -83,20 +83,20 @@ TEST(PluginLibrary, TextFileIsNotALibrary) {
     const auto library = PluginLibrary::load(path);
     std::remove(path.c_str());
     ASSERT_FALSE(library);
-    EXPECT_EQ(library.error().fault, PluginFault::NotALibrary);
+    EXPECT_EQ(PluginFault::NotALibrary, library.error().fault);
     EXPECT_THAT(library.error().text, StartsWith(path + ": not a loadable library: "));
 }
 
 TEST(PluginLibrary, DirectoryIsNotALibrary) {
     const auto library = PluginLibrary::load(FAKE_PLUGINS);
     ASSERT_FALSE(library);
-    EXPECT_EQ(library.error().fault, PluginFault::NotALibrary);
+    EXPECT_EQ(PluginFault::NotALibrary, library.error().fault);
 }
 
 TEST(PluginLibrary, BareNameIsNotSearchedInTheSystem) {
     const auto library = PluginLibrary::load("libc.so.6");
     ASSERT_FALSE(library);
-    EXPECT_EQ(library.error().fault, PluginFault::NoSuchFile);
+    EXPECT_EQ(PluginFault::NoSuchFile, library.error().fault);
 }
 
 TEST(PluginLibrary, StaysLoadedUntilTheLastUserIsGone) {
@@ -113,12 +113,12 @@ TEST(PluginLibrary, StaysLoadedUntilTheLastUserIsGone) {
         protocol = std::move(made).value();
     }
     EXPECT_TRUE(isLoaded(path));
-    EXPECT_EQ(host.services.outstanding(), 1);
-    EXPECT_STREQ((*protocol)->GetName(), "FAKE");
+    EXPECT_EQ(1, host.services.outstanding());
+    EXPECT_STREQ("FAKE", (*protocol)->GetName());
     protocol.reset();
     EXPECT_FALSE(isLoaded(path));
-    EXPECT_EQ(host.services.outstanding(), 0);
-    EXPECT_EQ(host.services.strayReleases(), 0);
+    EXPECT_EQ(0, host.services.outstanding());
+    EXPECT_EQ(0, host.services.strayReleases());
 }
 
 TEST(Module, FailedInitIsNotClosed) {
@@ -127,7 +127,7 @@ TEST(Module, FailedInitIsNotClosed) {
     const auto library = PluginLibrary::load(fakePlugin("init_fails_plugin.so"));
     ASSERT_TRUE(library);
     EXPECT_FALSE(Module::bind(library.value(), host.services));
-    EXPECT_EQ(host.services.strayReleases(), 0);
+    EXPECT_EQ(0, host.services.strayReleases());
 }
 
 TEST(Module, TellsWhichGenerationsAProtocolObjectHas) {
@@ -138,8 +138,8 @@ TEST(Module, TellsWhichGenerationsAProtocolObjectHas) {
     ASSERT_TRUE(module);
     const auto made = module.value().createProtocol("FAKE");
     ASSERT_TRUE(made);
-    EXPECT_EQ(made.value().as<IProtocol2>("IProtocol2"), made.value().get());
-    EXPECT_EQ(made.value().as<IProtocol7>("IProtocol7"), nullptr);
+    EXPECT_EQ(made.value().get(), made.value().as<IProtocol2>("IProtocol2"));
+    EXPECT_EQ(nullptr, made.value().as<IProtocol7>("IProtocol7"));
 }
 
 }  // namespace

@@ -30,7 +30,7 @@ TEST(PosixMultiTask, LockLetsOneThreadInAtATime) {
         threads.emplace_back(count);
     for (std::thread& thread : threads)
         thread.join();
-    EXPECT_EQ(counter, 40'000);
+    EXPECT_EQ(40'000, counter);
     tasks.deleteLock(lock);
 }
 
@@ -39,17 +39,17 @@ TEST(PosixMultiTask, CountsItsLocks) {
     ILock* first = tasks.createLock(0);
     ILock* second = tasks.createLock(0);
     EXPECT_NE(first, second);
-    EXPECT_EQ(tasks.locks(), 2);
+    EXPECT_EQ(2, tasks.locks());
     tasks.deleteLock(first);
     tasks.deleteLock(second);
     tasks.deleteLock(nullptr);
-    EXPECT_EQ(tasks.locks(), 0);
+    EXPECT_EQ(0, tasks.locks());
 }
 
 TEST(PosixMultiTask, AnswersToItsNameOnly) {
     PosixMultiTask tasks;
-    EXPECT_EQ(tasks.ConvertTo("IMultiTask2"), static_cast<IMultiTask2*>(&tasks));
-    EXPECT_EQ(tasks.ConvertTo("IMultiTask"), nullptr);
+    EXPECT_EQ(static_cast<IMultiTask2*>(&tasks), tasks.ConvertTo("IMultiTask2"));
+    EXPECT_EQ(nullptr, tasks.ConvertTo("IMultiTask"));
 }
 
 std::atomic<int> signalsSeen{0};
@@ -58,7 +58,7 @@ TEST(PosixMultiTask, SignalsDoNotCutASleepShort) {
     struct sigaction action {};
     action.sa_handler = [](int) { ++signalsSeen; };
     struct sigaction before {};
-    ASSERT_EQ(::sigaction(SIGUSR1, &action, &before), 0);
+    ASSERT_EQ(0, ::sigaction(SIGUSR1, &action, &before));
 
     using Clock = std::chrono::steady_clock;
     constexpr std::chrono::milliseconds kSleep{50};

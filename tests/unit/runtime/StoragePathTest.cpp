@@ -7,27 +7,27 @@ namespace {
 using namespace runtime;
 
 TEST(StoragePath, StateHomeComesFirst) {
-    EXPECT_EQ(storagePathFrom("/var/state", "/home/op"), "/var/state/mrtu/overrides.db");
+    EXPECT_EQ("/var/state/mrtu/overrides.db", storagePathFrom("/var/state", "/home/op"));
 }
 
 TEST(StoragePath, HomeIsTheFallback) {
     constexpr const char* kExpected = "/home/op/.local/state/mrtu/overrides.db";
     for (const char* state : {static_cast<const char*>(nullptr), "", "relative/state"}) {
-        EXPECT_EQ(storagePathFrom(state, "/home/op"), kExpected)
+        EXPECT_EQ(kExpected, storagePathFrom(state, "/home/op"))
             << (state != nullptr ? state : "unset");
     }
 }
 
 TEST(StoragePath, WithoutEitherThereIsNone) {
-    EXPECT_EQ(storagePathFrom(nullptr, nullptr), "");
-    EXPECT_EQ(storagePathFrom("", "home"), "");
+    EXPECT_EQ("", storagePathFrom(nullptr, nullptr));
+    EXPECT_EQ("", storagePathFrom("", "home"));
 }
 
 TEST(StoragePath, DirectoryOfAFile) {
-    EXPECT_EQ(directoryOf("overrides.db"), ".");
-    EXPECT_EQ(directoryOf("/overrides.db"), "/");
-    EXPECT_EQ(directoryOf("a/b.db"), "a");
-    EXPECT_EQ(directoryOf("/a/b/c.db"), "/a/b");
+    EXPECT_EQ(".", directoryOf("overrides.db"));
+    EXPECT_EQ("/", directoryOf("/overrides.db"));
+    EXPECT_EQ("a", directoryOf("a/b.db"));
+    EXPECT_EQ("/a/b", directoryOf("/a/b/c.db"));
 }
 
 }  // namespace

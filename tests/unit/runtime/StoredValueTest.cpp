@@ -34,27 +34,27 @@ TEST(StoredValue, TextReadsAsNumberTheWayStrtolDoes) {
         {"08", 0, false},
     };
     for (const TextRow& row : kRows) {
-        EXPECT_EQ(storedInt(std::string(row.text)), row.number) << '"' << row.text << '"';
-        EXPECT_EQ(storedBool(std::string(row.text)), row.flag) << '"' << row.text << '"';
-        EXPECT_EQ(storedText(std::string(row.text)), row.text);
+        EXPECT_EQ(row.number, storedInt(std::string(row.text))) << '"' << row.text << '"';
+        EXPECT_EQ(row.flag, storedBool(std::string(row.text))) << '"' << row.text << '"';
+        EXPECT_EQ(row.text, storedText(std::string(row.text)));
     }
 }
 
 TEST(StoredValue, NumbersAndBooleansReadAsEachOther) {
-    EXPECT_EQ(storedText(-42), "-42");
-    EXPECT_EQ(storedText(INT_MIN), "-2147483648");
-    EXPECT_EQ(storedText(true), "1");
-    EXPECT_EQ(storedText(false), "0");
-    EXPECT_EQ(storedInt(true), 1);
-    EXPECT_EQ(storedInt(false), 0);
+    EXPECT_EQ("-42", storedText(-42));
+    EXPECT_EQ("-2147483648", storedText(INT_MIN));
+    EXPECT_EQ("1", storedText(true));
+    EXPECT_EQ("0", storedText(false));
+    EXPECT_EQ(1, storedInt(true));
+    EXPECT_EQ(0, storedInt(false));
     EXPECT_TRUE(storedBool(-1));
     EXPECT_FALSE(storedBool(0));
 }
 
 TEST(StoredValue, TypesHaveNames) {
-    EXPECT_STREQ(storedTypeName(std::string("x")), "text");
-    EXPECT_STREQ(storedTypeName(true), "bool");
-    EXPECT_STREQ(storedTypeName(1), "int");
+    EXPECT_STREQ("text", storedTypeName(std::string("x")));
+    EXPECT_STREQ("bool", storedTypeName(true));
+    EXPECT_STREQ("int", storedTypeName(1));
 }
 
 }  // namespace

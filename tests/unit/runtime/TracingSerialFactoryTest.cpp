@@ -48,7 +48,7 @@ class ScriptedFactory final : public ISerialFactory {
         return &port;
     }
     void releasePort(ISerialPort* released) override {
-        EXPECT_EQ(released, &port);
+        EXPECT_EQ(&port, released);
         --open;
     }
     void* ConvertTo(const char*) override { return nullptr; }
@@ -96,11 +96,11 @@ struct TracingTest : ::testing::Test {
 
 TEST_F(TracingTest, FirstByteAndRestAreOneFrame) {
     transact({1, 3, 0}, {1, 3, 2, 0xAB});
-    ASSERT_EQ(seen.size(), 2u);
-    EXPECT_EQ(seen[0].direction, TraceDirection::Sent);
-    EXPECT_EQ(seen[0].port, "com1");
+    ASSERT_EQ(2u, seen.size());
+    EXPECT_EQ(TraceDirection::Sent, seen[0].direction);
+    EXPECT_EQ("com1", seen[0].port);
     EXPECT_THAT(seen[0].bytes, ElementsAre(1, 3, 0));
-    EXPECT_EQ(seen[1].direction, TraceDirection::Received);
+    EXPECT_EQ(TraceDirection::Received, seen[1].direction);
     EXPECT_THAT(seen[1].bytes, ElementsAre(1, 3, 2, 0xAB));
     EXPECT_TRUE(seen[1].complete);
 }
@@ -108,30 +108,30 @@ TEST_F(TracingTest, FirstByteAndRestAreOneFrame) {
 TEST_F(TracingTest, LateBytesAreShownBeforeTheNextRequest) {
     answer({9, 9});
     transact({1}, {2, 3});
-    ASSERT_EQ(seen.size(), 3u);
-    EXPECT_EQ(seen[0].direction, TraceDirection::Received);
+    ASSERT_EQ(3u, seen.size());
+    EXPECT_EQ(TraceDirection::Received, seen[0].direction);
     EXPECT_THAT(seen[0].bytes, ElementsAre(9, 9));
-    EXPECT_EQ(seen[1].direction, TraceDirection::Sent);
+    EXPECT_EQ(TraceDirection::Sent, seen[1].direction);
     EXPECT_THAT(seen[2].bytes, ElementsAre(2, 3));
 }
 
 TEST_F(TracingTest, ReplyOfOneByteIsAFrame) {
     transact({1}, {7});
-    ASSERT_EQ(seen.size(), 2u);
+    ASSERT_EQ(2u, seen.size());
     EXPECT_THAT(seen[1].bytes, ElementsAre(7));
     EXPECT_TRUE(seen[1].complete);
 }
 
 TEST_F(TracingTest, NoReplyShowsTheRequestOnly) {
     transact({1, 2}, {});
-    ASSERT_EQ(seen.size(), 1u);
-    EXPECT_EQ(tracing.counts().framesReceived, 0u);
+    ASSERT_EQ(1u, seen.size());
+    EXPECT_EQ(0u, tracing.counts().framesReceived);
 }
 
 TEST_F(TracingTest, FailedSendIsMarked) {
     inner.port.alive = false;
     transact({1, 2}, {});
-    ASSERT_EQ(seen.size(), 1u);
+    ASSERT_EQ(1u, seen.size());
     EXPECT_FALSE(seen[0].complete);
 }
 
@@ -141,35 +141,35 @@ TEST_F(TracingTest, UnfinishedBytesAreShownAtTheRelease) {
     ASSERT_NE(port->receiveByte(&byte, 0, 0), 0);
     EXPECT_TRUE(seen.empty());
     tracing.releasePort(port);
-    ASSERT_EQ(seen.size(), 1u);
+    ASSERT_EQ(1u, seen.size());
     EXPECT_THAT(seen[0].bytes, ElementsAre(5));
-    EXPECT_EQ(inner.open, 0);
+    EXPECT_EQ(0, inner.open);
 }
 
 TEST_F(TracingTest, CountsFramesAndBytes) {
     transact({1, 2, 3}, {4, 5});
     transact({1, 2, 3}, {4, 5, 6, 7});
     const TraceCounts counts = tracing.counts();
-    EXPECT_EQ(counts.framesSent, 2u);
-    EXPECT_EQ(counts.framesReceived, 2u);
-    EXPECT_EQ(counts.bytesSent, 6u);
-    EXPECT_EQ(counts.bytesReceived, 6u);
+    EXPECT_EQ(2u, counts.framesSent);
+    EXPECT_EQ(2u, counts.framesReceived);
+    EXPECT_EQ(6u, counts.bytesSent);
+    EXPECT_EQ(6u, counts.bytesReceived);
 }
 
 TEST_F(TracingTest, EverythingElseGoesThrough) {
-    EXPECT_EQ(port->configure(9600, 0, 8, 1, 0), 1);
+    EXPECT_EQ(1, port->configure(9600, 0, 8, 1, 0));
     port->purge();
-    EXPECT_EQ(inner.port.configured, 1);
-    EXPECT_EQ(inner.port.purged, 1);
-    EXPECT_EQ(tracing.openPort("com2"), nullptr);
-    EXPECT_EQ(tracing.ConvertTo("ISerialFactory"), static_cast<ISerialFactory*>(&tracing));
-    EXPECT_EQ(tracing.ConvertTo("IOther"), nullptr);
+    EXPECT_EQ(1, inner.port.configured);
+    EXPECT_EQ(1, inner.port.purged);
+    EXPECT_EQ(nullptr, tracing.openPort("com2"));
+    EXPECT_EQ(static_cast<ISerialFactory*>(&tracing), tracing.ConvertTo("ISerialFactory"));
+    EXPECT_EQ(nullptr, tracing.ConvertTo("IOther"));
 }
 
 TEST_F(TracingTest, ForeignPortIsNotReleased) {
     tracing.releasePort(nullptr);
     tracing.releasePort(&inner.port);
-    EXPECT_EQ(inner.open, 1);
+    EXPECT_EQ(1, inner.open);
 }
 
 TEST(TracingSerialFactory, ReleasesWhatIsStillOpen) {
@@ -178,7 +178,7 @@ TEST(TracingSerialFactory, ReleasesWhatIsStillOpen) {
         TracingSerialFactory tracing(inner, {});
         ASSERT_NE(tracing.openPort("com1"), nullptr);
     }
-    EXPECT_EQ(inner.open, 0);
+    EXPECT_EQ(0, inner.open);
 }
 
 }  // namespace
