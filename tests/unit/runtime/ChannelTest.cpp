@@ -2,7 +2,7 @@
 
 #include <gmock/gmock.h>
 
-#include "tests/unit/runtime/FakeHost.h"
+#include "tests/unit/runtime/FakePluginHost.h"
 
 namespace {
 

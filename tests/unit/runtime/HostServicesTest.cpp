@@ -5,13 +5,13 @@
 #include <thread>
 
 #include "runtime/MemoryStorage.h"
-#include "tests/unit/runtime/FakeHost.h"
+#include "tests/unit/runtime/FakePluginHost.h"
 
 namespace {
 
 using namespace runtime;
 
-TEST(HostServices, ServesTheRequiredFourByExactName) {
+TEST(HostServicesTest, ServesTheRequiredFourByExactName) {
     FakeHost host;
     for (const char* name : {"IMultiTask2", "ISerialFactory", "ISocketFactory", "ICDSBuffer"}) {
         IInterface* service = host.services.CreateInterface(name);
@@ -23,7 +23,7 @@ TEST(HostServices, ServesTheRequiredFourByExactName) {
     EXPECT_EQ(4, host.services.outstanding());
 }
 
-TEST(HostServices, OthersAreNull) {
+TEST(HostServicesTest, OthersAreNull) {
     FakeHost host;
     for (const char* name : {"IDiag", "IDriverInterface", "ISmux", "IFastTimer", "imultitask2",
                              "IMultiTask2 ", "", "IPermanentStorage"}) {
@@ -33,7 +33,7 @@ TEST(HostServices, OthersAreNull) {
     EXPECT_EQ(0, host.services.outstanding());
 }
 
-TEST(HostServices, ServesStorageWhenThereIsOne) {
+TEST(HostServicesTest, ServesStorageWhenThereIsOne) {
     PosixMultiTask multiTask;
     PosixSerialFactory serial;
     MemoryStorage storage;
@@ -43,7 +43,7 @@ TEST(HostServices, ServesStorageWhenThereIsOne) {
     EXPECT_EQ(static_cast<IPermanentStorage2*>(&storage), held->ConvertTo("IPermanentStorage2"));
 }
 
-TEST(HostServices, CountsWhatIsHeld) {
+TEST(HostServicesTest, CountsWhatIsHeld) {
     FakeHost host;
     IInterface* first = host.services.CreateInterface("IMultiTask2");
     IInterface* second = host.services.CreateInterface("IMultiTask2");
@@ -54,7 +54,7 @@ TEST(HostServices, CountsWhatIsHeld) {
     EXPECT_EQ(0, host.services.strayReleases());
 }
 
-TEST(HostServices, NoticesReleasesOfWhatIsNotHeld) {
+TEST(HostServicesTest, NoticesReleasesOfWhatIsNotHeld) {
     FakeHost host;
     MemoryStorage foreign;
     host.services.ReleaseInterface(&foreign);
@@ -64,7 +64,7 @@ TEST(HostServices, NoticesReleasesOfWhatIsNotHeld) {
     EXPECT_EQ(0, host.services.outstanding());
 }
 
-TEST(HostServices, CountsFromSeveralThreads) {
+TEST(HostServicesTest, CountsFromSeveralThreads) {
     FakeHost host;
     const auto takeAndGiveBack = [&host] {
         for (int round = 0; round < 1000; ++round) {

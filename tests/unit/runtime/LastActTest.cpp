@@ -21,7 +21,7 @@ int undoneNow() {
     return g_undone;
 }
 
-TEST(LastAct, RunsWhileItIsAnnounced) {
+TEST(LastActTest, RunsWhileItIsAnnounced) {
     const int one = 1;
     const int ten = 10;
     EXPECT_EQ(0, undoneNow());
@@ -34,7 +34,7 @@ TEST(LastAct, RunsWhileItIsAnnounced) {
     EXPECT_EQ(1, undoneNow());
 }
 
-TEST(LastAct, MoreThanThereIsRoomForAreNotNoted) {
+TEST(LastActTest, MoreThanThereIsRoomForAreNotNoted) {
     const int one = 1;
     std::vector<std::unique_ptr<LastAct>> acts;
     for (int count = 0; count < runtime::kLastActs + 3; ++count)

@@ -14,7 +14,7 @@ struct MemoryMaker {
 
 INSTANTIATE_TYPED_TEST_SUITE_P(InMemory, StorageContract, MemoryMaker);
 
-TEST(MemoryStorage, RefusedWriteChangesNothingAndSaysWhy) {
+TEST(MemoryStorageTest, RefusedWriteChangesNothingAndSaysWhy) {
     MemoryStorage storage;
     storage.writeInt("line1", "baud", 9600);
     storage.refuseWrites("no space left");
@@ -32,7 +32,7 @@ TEST(MemoryStorage, RefusedWriteChangesNothingAndSaysWhy) {
     EXPECT_EQ(300, storage.readInt("line1", "baud"));
 }
 
-TEST(MemoryStorage, RefusedReadFindsNothingAndSaysWhy) {
+TEST(MemoryStorageTest, RefusedReadFindsNothingAndSaysWhy) {
     MemoryStorage storage;
     storage.writeString("line1", "tempNode1", "7");
     storage.refuseReads("disk gone");

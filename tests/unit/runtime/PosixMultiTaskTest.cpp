@@ -13,7 +13,7 @@ namespace {
 
 using runtime::PosixMultiTask;
 
-TEST(PosixMultiTask, LockLetsOneThreadInAtATime) {
+TEST(PosixMultiTaskTest, LockLetsOneThreadInAtATime) {
     PosixMultiTask tasks;
     ILock* lock = tasks.createLock(0);
     int counter = 0;
@@ -34,7 +34,7 @@ TEST(PosixMultiTask, LockLetsOneThreadInAtATime) {
     tasks.deleteLock(lock);
 }
 
-TEST(PosixMultiTask, CountsItsLocks) {
+TEST(PosixMultiTaskTest, CountsItsLocks) {
     PosixMultiTask tasks;
     ILock* first = tasks.createLock(0);
     ILock* second = tasks.createLock(0);
@@ -46,7 +46,7 @@ TEST(PosixMultiTask, CountsItsLocks) {
     EXPECT_EQ(0, tasks.locks());
 }
 
-TEST(PosixMultiTask, AnswersToItsNameOnly) {
+TEST(PosixMultiTaskTest, AnswersToItsNameOnly) {
     PosixMultiTask tasks;
     EXPECT_EQ(static_cast<IMultiTask2*>(&tasks), tasks.ConvertTo("IMultiTask2"));
     EXPECT_EQ(nullptr, tasks.ConvertTo("IMultiTask"));
@@ -54,7 +54,7 @@ TEST(PosixMultiTask, AnswersToItsNameOnly) {
 
 std::atomic<int> signalsSeen{0};
 
-TEST(PosixMultiTask, SignalsDoNotCutASleepShort) {
+TEST(PosixMultiTaskTest, SignalsDoNotCutASleepShort) {
     struct sigaction action {};
     action.sa_handler = [](int) { ++signalsSeen; };
     struct sigaction before {};
@@ -81,7 +81,7 @@ TEST(PosixMultiTask, SignalsDoNotCutASleepShort) {
     EXPECT_GT(signalsSeen, 0);
 }
 
-TEST(PosixMultiTask, NothingToSleepReturns) {
+TEST(PosixMultiTaskTest, NothingToSleepReturns) {
     PosixMultiTask tasks;
     tasks.sleep(0);
     tasks.sleep(-1'000'000'000);

@@ -27,7 +27,7 @@ struct SpeedRow {
     speed_t code;
 };
 
-TEST(SerialSettings, ListedRatesHaveTheirCodes) {
+TEST(SerialSettingsTest, ListedRatesHaveTheirCodes) {
     constexpr SpeedRow kRows[] = {
         {150, B150},     {300, B300},     {600, B600},       {1200, B1200},
         {2400, B2400},   {4800, B4800},   {9600, B9600},     {19200, B19200},
@@ -42,7 +42,7 @@ TEST(SerialSettings, ListedRatesHaveTheirCodes) {
     }
 }
 
-TEST(SerialSettings, UnlistedRatesAreRefused) {
+TEST(SerialSettingsTest, UnlistedRatesAreRefused) {
     for (const int baud : {0, -9600, 1, 110, 149, 9601, 14400, 230400}) {
         EXPECT_EQ(std::nullopt, speedOf(baud)) << baud;
         EXPECT_EQ("baud rate " + std::to_string(baud) + " is not supported",
@@ -50,7 +50,7 @@ TEST(SerialSettings, UnlistedRatesAreRefused) {
     }
 }
 
-TEST(SerialSettings, FaultsNameTheirValue) {
+TEST(SerialSettingsTest, FaultsNameTheirValue) {
     EXPECT_EQ("", settingsFault({9600, 0, 8, 1, 0}));
     EXPECT_EQ("parity code -1 is not supported", settingsFault({9600, -1, 8, 1, 0}));
     EXPECT_EQ("parity code 5 is not supported", settingsFault({9600, 5, 8, 1, 0}));
@@ -62,7 +62,7 @@ TEST(SerialSettings, FaultsNameTheirValue) {
     EXPECT_EQ("mode code 4 is not supported", settingsFault({9600, 0, 8, 1, 4}));
 }
 
-TEST(SerialSettings, ParityCodesHaveTheirFlags) {
+TEST(SerialSettingsTest, ParityCodesHaveTheirFlags) {
     constexpr tcflag_t kFlags[] = {0, PARENB, PARENB | PARODD, PARENB | PARODD | CMSPAR,
                                    PARENB | CMSPAR};
     for (int code = 0; code < 5; ++code) {
@@ -72,20 +72,20 @@ TEST(SerialSettings, ParityCodesHaveTheirFlags) {
     }
 }
 
-TEST(SerialSettings, EarlierParityDoesNotShineThrough) {
+TEST(SerialSettingsTest, EarlierParityDoesNotShineThrough) {
     const termios odd = rawTermios(cooked(), {9600, 3, 7, 2, 0});
     const termios none = rawTermios(odd, {9600, 0, 8, 1, 0});
     EXPECT_EQ(0u, none.c_cflag & (kParityFlags | CSTOPB));
     EXPECT_EQ(static_cast<tcflag_t>(CS8), none.c_cflag & static_cast<tcflag_t>(CSIZE));
 }
 
-TEST(SerialSettings, DataAndStopBits) {
+TEST(SerialSettingsTest, DataAndStopBits) {
     const termios raw = rawTermios(cooked(), {9600, 1, 7, 2, 0});
     EXPECT_EQ(static_cast<tcflag_t>(CS7), raw.c_cflag & static_cast<tcflag_t>(CSIZE));
     EXPECT_NE(raw.c_cflag & CSTOPB, 0u);
 }
 
-TEST(SerialSettings, NothingTouchesTheBytesOnTheirWay) {
+TEST(SerialSettingsTest, NothingTouchesTheBytesOnTheirWay) {
     const termios raw = rawTermios(cooked(), {9600, 0, 8, 1, 0});
     EXPECT_EQ(0u, raw.c_lflag);
     EXPECT_EQ(0u, raw.c_oflag);
@@ -97,14 +97,14 @@ TEST(SerialSettings, NothingTouchesTheBytesOnTheirWay) {
     EXPECT_EQ(0, raw.c_cc[VTIME]);
 }
 
-TEST(SerialSettings, CharacterBitsCountEverythingOnTheWire) {
+TEST(SerialSettingsTest, CharacterBitsCountEverythingOnTheWire) {
     EXPECT_EQ(10, characterBits({9600, 0, 8, 1, 0}));
     EXPECT_EQ(11, characterBits({9600, 1, 8, 1, 0}));
     EXPECT_EQ(11, characterBits({9600, 4, 7, 2, 0}));
     EXPECT_EQ(12, characterBits({9600, 2, 8, 2, 0}));
 }
 
-TEST(SerialSettings, DriverThatIgnoresAFieldIsFoundOut) {
+TEST(SerialSettingsTest, DriverThatIgnoresAFieldIsFoundOut) {
     const termios asked = rawTermios(cooked(), {9600, 3, 7, 2, 0});
     EXPECT_EQ("", differenceIn(asked, asked, false));
 
@@ -131,7 +131,7 @@ TEST(SerialSettings, DriverThatIgnoresAFieldIsFoundOut) {
     EXPECT_EQ("raw transfer was not accepted", differenceIn(asked, taken, true));
 }
 
-TEST(SerialSettings, DirectionControlFollowsTheMode) {
+TEST(SerialSettingsTest, DirectionControlFollowsTheMode) {
     serial_rs485 found;
     std::memset(&found, 0, sizeof found);
     found.flags = SER_RS485_RTS_AFTER_SEND;

@@ -6,11 +6,11 @@ namespace {
 
 using namespace runtime;
 
-TEST(StoragePath, StateHomeComesFirst) {
+TEST(StoragePathTest, StateHomeComesFirst) {
     EXPECT_EQ("/var/state/mrtu/overrides.db", storagePathFrom("/var/state", "/home/op"));
 }
 
-TEST(StoragePath, HomeIsTheFallback) {
+TEST(StoragePathTest, HomeIsTheFallback) {
     constexpr const char* kExpected = "/home/op/.local/state/mrtu/overrides.db";
     for (const char* state : {static_cast<const char*>(nullptr), "", "relative/state"}) {
         EXPECT_EQ(kExpected, storagePathFrom(state, "/home/op"))
@@ -18,12 +18,12 @@ TEST(StoragePath, HomeIsTheFallback) {
     }
 }
 
-TEST(StoragePath, WithoutEitherThereIsNone) {
+TEST(StoragePathTest, WithoutEitherThereIsNone) {
     EXPECT_EQ("", storagePathFrom(nullptr, nullptr));
     EXPECT_EQ("", storagePathFrom("", "home"));
 }
 
-TEST(StoragePath, DirectoryOfAFile) {
+TEST(StoragePathTest, DirectoryOfAFile) {
     EXPECT_EQ(".", directoryOf("overrides.db"));
     EXPECT_EQ("/", directoryOf("/overrides.db"));
     EXPECT_EQ("a", directoryOf("a/b.db"));

@@ -14,7 +14,7 @@ struct TextRow {
     bool flag;
 };
 
-TEST(StoredValue, TextReadsAsNumberTheWayStrtolDoes) {
+TEST(StoredValueTest, TextReadsAsNumberTheWayStrtolDoes) {
     constexpr TextRow kRows[] = {
         {"12", 12, true},
         {"-7", -7, true},
@@ -40,7 +40,7 @@ TEST(StoredValue, TextReadsAsNumberTheWayStrtolDoes) {
     }
 }
 
-TEST(StoredValue, NumbersAndBooleansReadAsEachOther) {
+TEST(StoredValueTest, NumbersAndBooleansReadAsEachOther) {
     EXPECT_EQ("-42", storedText(-42));
     EXPECT_EQ("-2147483648", storedText(INT_MIN));
     EXPECT_EQ("1", storedText(true));
@@ -51,7 +51,7 @@ TEST(StoredValue, NumbersAndBooleansReadAsEachOther) {
     EXPECT_FALSE(storedBool(0));
 }
 
-TEST(StoredValue, TypesHaveNames) {
+TEST(StoredValueTest, TypesHaveNames) {
     EXPECT_STREQ("text", storedTypeName(std::string("x")));
     EXPECT_STREQ("bool", storedTypeName(true));
     EXPECT_STREQ("int", storedTypeName(1));

@@ -63,7 +63,7 @@ struct Seen {
     bool complete;
 };
 
-struct TracingTest : ::testing::Test {
+struct TracingSerialFactoryTest : ::testing::Test {
     void SetUp() override {
         port = tracing.openPort("com1");
         ASSERT_NE(port, nullptr);
@@ -94,7 +94,7 @@ struct TracingTest : ::testing::Test {
     ISerialPort* port = nullptr;
 };
 
-TEST_F(TracingTest, FirstByteAndRestAreOneFrame) {
+TEST_F(TracingSerialFactoryTest, FirstByteAndRestAreOneFrame) {
     transact({1, 3, 0}, {1, 3, 2, 0xAB});
     ASSERT_EQ(2u, seen.size());
     EXPECT_EQ(TraceDirection::Sent, seen[0].direction);
@@ -105,7 +105,7 @@ TEST_F(TracingTest, FirstByteAndRestAreOneFrame) {
     EXPECT_TRUE(seen[1].complete);
 }
 
-TEST_F(TracingTest, LateBytesAreShownBeforeTheNextRequest) {
+TEST_F(TracingSerialFactoryTest, LateBytesAreShownBeforeTheNextRequest) {
     answer({9, 9});
     transact({1}, {2, 3});
     ASSERT_EQ(3u, seen.size());
@@ -115,27 +115,27 @@ TEST_F(TracingTest, LateBytesAreShownBeforeTheNextRequest) {
     EXPECT_THAT(seen[2].bytes, ElementsAre(2, 3));
 }
 
-TEST_F(TracingTest, ReplyOfOneByteIsAFrame) {
+TEST_F(TracingSerialFactoryTest, ReplyOfOneByteIsAFrame) {
     transact({1}, {7});
     ASSERT_EQ(2u, seen.size());
     EXPECT_THAT(seen[1].bytes, ElementsAre(7));
     EXPECT_TRUE(seen[1].complete);
 }
 
-TEST_F(TracingTest, NoReplyShowsTheRequestOnly) {
+TEST_F(TracingSerialFactoryTest, NoReplyShowsTheRequestOnly) {
     transact({1, 2}, {});
     ASSERT_EQ(1u, seen.size());
     EXPECT_EQ(0u, tracing.counts().framesReceived);
 }
 
-TEST_F(TracingTest, FailedSendIsMarked) {
+TEST_F(TracingSerialFactoryTest, FailedSendIsMarked) {
     inner.port.alive = false;
     transact({1, 2}, {});
     ASSERT_EQ(1u, seen.size());
     EXPECT_FALSE(seen[0].complete);
 }
 
-TEST_F(TracingTest, UnfinishedBytesAreShownAtTheRelease) {
+TEST_F(TracingSerialFactoryTest, UnfinishedBytesAreShownAtTheRelease) {
     answer({5});
     unsigned char byte = 0;
     ASSERT_NE(port->receiveByte(&byte, 0, 0), 0);
@@ -146,7 +146,7 @@ TEST_F(TracingTest, UnfinishedBytesAreShownAtTheRelease) {
     EXPECT_EQ(0, inner.open);
 }
 
-TEST_F(TracingTest, CountsFramesAndBytes) {
+TEST_F(TracingSerialFactoryTest, CountsFramesAndBytes) {
     transact({1, 2, 3}, {4, 5});
     transact({1, 2, 3}, {4, 5, 6, 7});
     const TraceCounts counts = tracing.counts();
@@ -156,7 +156,7 @@ TEST_F(TracingTest, CountsFramesAndBytes) {
     EXPECT_EQ(6u, counts.bytesReceived);
 }
 
-TEST_F(TracingTest, EverythingElseGoesThrough) {
+TEST_F(TracingSerialFactoryTest, EverythingElseGoesThrough) {
     EXPECT_EQ(1, port->configure(9600, 0, 8, 1, 0));
     port->purge();
     EXPECT_EQ(1, inner.port.configured);
@@ -166,19 +166,19 @@ TEST_F(TracingTest, EverythingElseGoesThrough) {
     EXPECT_EQ(nullptr, tracing.ConvertTo("IOther"));
 }
 
-TEST_F(TracingTest, ForeignPortIsNotReleased) {
+TEST_F(TracingSerialFactoryTest, ForeignPortIsNotReleased) {
     tracing.releasePort(nullptr);
     tracing.releasePort(&inner.port);
     EXPECT_EQ(1, inner.open);
 }
 
-TEST(TracingSerialFactory, ReleasesWhatIsStillOpen) {
-    ScriptedFactory inner;
+TEST_F(TracingSerialFactoryTest, ReleasesWhatIsStillOpen) {
+    ScriptedFactory factory;
     {
-        TracingSerialFactory tracing(inner, {});
-        ASSERT_NE(tracing.openPort("com1"), nullptr);
+        TracingSerialFactory shortLived(factory, {});
+        ASSERT_NE(shortLived.openPort("com1"), nullptr);
     }
-    EXPECT_EQ(0, inner.open);
+    EXPECT_EQ(0, factory.open);
 }
 
 }  // namespace

@@ -4,7 +4,6 @@
 
 #include <array>
 #include <limits>
-#include <numeric>
 
 #include "tests/unit/runtime/FakeLine.h"
 
@@ -16,7 +15,7 @@ using ::testing::ElementsAre;
 
 constexpr Milliseconds kForEver{std::numeric_limits<int>::max()};
 
-struct FrameTest : ::testing::Test {
+struct LineReceptionTest : ::testing::Test {
     FrameEnd receive(std::size_t most, Milliseconds timeout, Milliseconds gap) {
         return receiveRest(line, std::span(buffer).first(most), timeout, gap);
     }
@@ -28,7 +27,7 @@ struct FrameTest : ::testing::Test {
     std::array<std::uint8_t, 512> buffer{};
 };
 
-TEST_F(FrameTest, SilenceEndsTheFrame) {
+TEST_F(LineReceptionTest, SilenceEndsTheFrame) {
     line.arrive(1, {1});
     line.arrive(5, {2, 3});
     line.arrive(20, {4});
@@ -38,21 +37,21 @@ TEST_F(FrameTest, SilenceEndsTheFrame) {
     EXPECT_EQ(5 + 13, line.elapsedMs());
 }
 
-TEST_F(FrameTest, PauseJustShortOfTheGapIsBridged) {
+TEST_F(LineReceptionTest, PauseJustShortOfTheGapIsBridged) {
     line.arrive(0, {1});
     line.arrive(12, {2});
     line.arrive(24, {3});
     EXPECT_THAT(received(receive(512, 1000ms, 13ms)), ElementsAre(1, 2, 3));
 }
 
-TEST_F(FrameTest, SilenceFromTheStartEndsAnEmptyFrame) {
+TEST_F(LineReceptionTest, SilenceFromTheStartEndsAnEmptyFrame) {
     const FrameEnd end = receive(512, 1000ms, 13ms);
     EXPECT_EQ(Transfer::Complete, end.how);
     EXPECT_EQ(0u, end.count);
     EXPECT_EQ(13, line.elapsedMs());
 }
 
-TEST_F(FrameTest, MaximumEndsTheFrameAtOnce) {
+TEST_F(LineReceptionTest, MaximumEndsTheFrameAtOnce) {
     line.arrive(2, {1, 2, 3, 4, 5});
     const FrameEnd end = receive(4, kForEver, kForEver);
     EXPECT_EQ(Transfer::Complete, end.how);
@@ -60,20 +59,20 @@ TEST_F(FrameTest, MaximumEndsTheFrameAtOnce) {
     EXPECT_EQ(2, line.elapsedMs());
 }
 
-TEST_F(FrameTest, BytesBeyondTheMaximumStayForTheNextRead) {
+TEST_F(LineReceptionTest, BytesBeyondTheMaximumStayForTheNextRead) {
     line.arrive(0, {1, 2, 3});
     EXPECT_THAT(received(receive(2, 1000ms, 10ms)), ElementsAre(1, 2));
     EXPECT_THAT(received(receive(2, 1000ms, 10ms)), ElementsAre(3));
 }
 
-TEST_F(FrameTest, NoRoomReadsNothingAndDoesNotWait) {
+TEST_F(LineReceptionTest, NoRoomReadsNothingAndDoesNotWait) {
     line.arrive(0, {1});
     const FrameEnd end = receive(0, kForEver, kForEver);
     EXPECT_EQ(0u, end.count);
     EXPECT_EQ(0, line.waits());
 }
 
-TEST_F(FrameTest, DeadlineEndsTheFrameBeforeTheGap) {
+TEST_F(LineReceptionTest, DeadlineEndsTheFrameBeforeTheGap) {
     line.arrive(10, {1});
     const FrameEnd end = receive(512, 50ms, 800ms);
     EXPECT_EQ(Transfer::TimedOut, end.how);
@@ -81,7 +80,7 @@ TEST_F(FrameTest, DeadlineEndsTheFrameBeforeTheGap) {
     EXPECT_EQ(50, line.elapsedMs());
 }
 
-TEST_F(FrameTest, DripsForEverAreBoundedByTheOneDeadline) {
+TEST_F(LineReceptionTest, DripsForEverAreBoundedByTheOneDeadline) {
     line.drip(7);
     const FrameEnd end = receive(512, 100ms, 13ms);
     EXPECT_EQ(Transfer::TimedOut, end.how);
@@ -89,7 +88,7 @@ TEST_F(FrameTest, DripsForEverAreBoundedByTheOneDeadline) {
     EXPECT_EQ(100, line.elapsedMs());
 }
 
-TEST_F(FrameTest, DeadlineHoldsAlsoWhenEveryReadIsSlow) {
+TEST_F(LineReceptionTest, DeadlineHoldsAlsoWhenEveryReadIsSlow) {
     line.drip(1);
     line.readSlowly(30);
     const FrameEnd end = receive(512, 100ms, 1000ms);
@@ -98,27 +97,27 @@ TEST_F(FrameTest, DeadlineHoldsAlsoWhenEveryReadIsSlow) {
     EXPECT_LE(line.elapsedMs(), 100 + 30);
 }
 
-TEST_F(FrameTest, WaitingBytesAreTakenBeforeSilenceIsJudged) {
+TEST_F(LineReceptionTest, WaitingBytesAreTakenBeforeSilenceIsJudged) {
     // The process slept through the whole frame; the bytes lie in the kernel.
     line.arrive(0, {1, 2, 3});
     line.sleepUntil(line.now() + 500ms);
     EXPECT_THAT(received(receive(512, 1000ms, 2ms)), ElementsAre(1, 2, 3));
 }
 
-TEST_F(FrameTest, TimeoutOfZeroTakesWhatIsThere) {
+TEST_F(LineReceptionTest, TimeoutOfZeroTakesWhatIsThere) {
     line.arrive(0, {1, 2});
     line.arrive(1, {3});
     EXPECT_THAT(received(receive(512, 0ms, 13ms)), ElementsAre(1, 2));
     EXPECT_EQ(0, line.elapsedMs());
 }
 
-TEST_F(FrameTest, NegativeTimesCountAsZero) {
+TEST_F(LineReceptionTest, NegativeTimesCountAsZero) {
     line.arrive(0, {1, 2});
     EXPECT_THAT(received(receive(512, -5ms, -5ms)), ElementsAre(1, 2));
     EXPECT_EQ(0, line.elapsedMs());
 }
 
-TEST_F(FrameTest, VanishedLineFailsAtOnceAndKeepsWhatCame) {
+TEST_F(LineReceptionTest, VanishedLineFailsAtOnceAndKeepsWhatCame) {
     line.arrive(3, {1, 2});
     line.vanish(6);
     const FrameEnd end = receive(512, kForEver, kForEver);
@@ -127,21 +126,20 @@ TEST_F(FrameTest, VanishedLineFailsAtOnceAndKeepsWhatCame) {
     EXPECT_EQ(6, line.elapsedMs());
 }
 
-TEST_F(FrameTest, LineThatWasGoneBeforeCostsOneQuestion) {
+TEST_F(LineReceptionTest, LineThatWasGoneBeforeCostsOneQuestion) {
     line.vanish(0);
     EXPECT_EQ(Transfer::Gone, receive(512, kForEver, kForEver).how);
     EXPECT_EQ(1, line.waits());
 }
 
-TEST_F(FrameTest, EndFoundByTheReadItselfIsGone) {
+TEST_F(LineReceptionTest, EndFoundByTheReadItselfIsGone) {
     line.arrive(4, {1});
     line.readSlowly(2);
     line.vanish(5);
     EXPECT_EQ(Transfer::Gone, receive(512, kForEver, kForEver).how);
 }
 
-TEST(FirstByte, ArrivesInTime) {
-    FakeLine line;
+TEST_F(LineReceptionTest, FirstByteArrivesInTime) {
     line.arrive(40, {0xAB, 0xCD});
     std::uint8_t byte = 0;
     EXPECT_EQ(Transfer::Complete, receiveOne(line, byte, 2000ms));
@@ -151,8 +149,7 @@ TEST(FirstByte, ArrivesInTime) {
     EXPECT_EQ(0xCD, byte);
 }
 
-TEST(FirstByte, TimeoutLeavesTheByteUntouched) {
-    FakeLine line;
+TEST_F(LineReceptionTest, TimeoutLeavesTheFirstByteUntouched) {
     line.arrive(41, {0xAB});
     std::uint8_t byte = 0x11;
     EXPECT_EQ(Transfer::TimedOut, receiveOne(line, byte, 40ms));
@@ -160,81 +157,19 @@ TEST(FirstByte, TimeoutLeavesTheByteUntouched) {
     EXPECT_EQ(40, line.elapsedMs());
 }
 
-TEST(FirstByte, TimeoutOfZeroOnlyLooks) {
-    FakeLine line;
+TEST_F(LineReceptionTest, TimeoutOfZeroOnlyLooksForTheFirstByte) {
     std::uint8_t byte = 0;
     EXPECT_EQ(Transfer::TimedOut, receiveOne(line, byte, 0ms));
     EXPECT_EQ(Transfer::TimedOut, receiveOne(line, byte, -3ms));
     EXPECT_EQ(0, line.elapsedMs());
 }
 
-TEST(FirstByte, VanishedLineFailsAtOnce) {
-    FakeLine line;
+TEST_F(LineReceptionTest, VanishedLineFailsTheFirstByteAtOnce) {
     line.vanish(10);
     std::uint8_t byte = 0x11;
     EXPECT_EQ(Transfer::Gone, receiveOne(line, byte, kForEver));
     EXPECT_EQ(0x11, byte);
     EXPECT_EQ(10, line.elapsedMs());
-}
-
-struct SendTest : ::testing::Test {
-    SendTest() { std::iota(data.begin(), data.end(), std::uint8_t{0}); }
-    Transfer send() { return sendAll(line, data, sendingTime(data.size(), 1ms), 1ms); }
-
-    FakeLine line;
-    std::vector<std::uint8_t> data = std::vector<std::uint8_t>(100);
-};
-
-TEST_F(SendTest, SendsTheWholeBuffer) {
-    EXPECT_EQ(Transfer::Complete, send());
-    EXPECT_EQ(data, line.sent());
-    EXPECT_EQ(0, line.elapsedMs());
-}
-
-TEST_F(SendTest, ShortWritesAreContinued) {
-    line.takeSlowly(7, 3);
-    EXPECT_EQ(Transfer::Complete, send());
-    EXPECT_EQ(data, line.sent());
-    EXPECT_FALSE(line.outputDiscarded());
-}
-
-TEST_F(SendTest, ReturnsWhenTheLastByteIsOnTheWire) {
-    line.transmitSlowly(2);
-    EXPECT_EQ(Transfer::Complete, send());
-    EXPECT_EQ(200, line.elapsedMs());
-}
-
-TEST_F(SendTest, DeadlineIsTheCharactersTimeAndAMargin) {
-    line.jam();
-    EXPECT_EQ(Transfer::TimedOut, send());
-    EXPECT_EQ(100 + 1000, line.elapsedMs());
-    EXPECT_TRUE(line.outputDiscarded());
-}
-
-TEST_F(SendTest, QueueThatDoesNotDrainInTimeFailsAndIsThrownAway) {
-    line.transmitSlowly(50);
-    EXPECT_EQ(Transfer::TimedOut, send());
-    EXPECT_EQ(100 + 1000, line.elapsedMs());
-    EXPECT_TRUE(line.outputDiscarded());
-}
-
-TEST_F(SendTest, VanishedLineFailsAtOnce) {
-    line.takeSlowly(10, 20);
-    line.vanish(30);
-    EXPECT_EQ(Transfer::Gone, send());
-    EXPECT_EQ(30, line.elapsedMs());
-}
-
-TEST_F(SendTest, NothingToSendIsDone) {
-    data.clear();
-    line.jam();
-    EXPECT_EQ(Transfer::Complete, send());
-}
-
-TEST(SendingTime, FollowsFromRateAndFormat) {
-    EXPECT_EQ(1041666ns, characterTime(9600, 10));
-    EXPECT_EQ(80ms, characterTime(150, 12));
-    EXPECT_EQ(256 * 66666666ns + 1s, sendingTime(256, characterTime(150, 10)));
 }
 
 }  // namespace

@@ -1,0 +1,73 @@
+#include <gtest/gtest.h>
+
+#include <numeric>
+
+#include "runtime/LineTransfer.h"
+#include "tests/unit/runtime/FakeLine.h"
+
+namespace {
+
+using namespace runtime;
+using namespace std::chrono_literals;
+
+struct LineSendingTest : ::testing::Test {
+    LineSendingTest() { std::iota(data.begin(), data.end(), std::uint8_t{0}); }
+    Transfer send() { return sendAll(line, data, sendingTime(data.size(), 1ms), 1ms); }
+
+    FakeLine line;
+    std::vector<std::uint8_t> data = std::vector<std::uint8_t>(100);
+};
+
+TEST_F(LineSendingTest, SendsTheWholeBuffer) {
+    EXPECT_EQ(Transfer::Complete, send());
+    EXPECT_EQ(data, line.sent());
+    EXPECT_EQ(0, line.elapsedMs());
+}
+
+TEST_F(LineSendingTest, ShortWritesAreContinued) {
+    line.takeSlowly(7, 3);
+    EXPECT_EQ(Transfer::Complete, send());
+    EXPECT_EQ(data, line.sent());
+    EXPECT_FALSE(line.outputDiscarded());
+}
+
+TEST_F(LineSendingTest, ReturnsWhenTheLastByteIsOnTheWire) {
+    line.transmitSlowly(2);
+    EXPECT_EQ(Transfer::Complete, send());
+    EXPECT_EQ(200, line.elapsedMs());
+}
+
+TEST_F(LineSendingTest, DeadlineIsTheCharactersTimeAndAMargin) {
+    line.jam();
+    EXPECT_EQ(Transfer::TimedOut, send());
+    EXPECT_EQ(100 + 1000, line.elapsedMs());
+    EXPECT_TRUE(line.outputDiscarded());
+}
+
+TEST_F(LineSendingTest, QueueThatDoesNotDrainInTimeFailsAndIsThrownAway) {
+    line.transmitSlowly(50);
+    EXPECT_EQ(Transfer::TimedOut, send());
+    EXPECT_EQ(100 + 1000, line.elapsedMs());
+    EXPECT_TRUE(line.outputDiscarded());
+}
+
+TEST_F(LineSendingTest, VanishedLineFailsAtOnce) {
+    line.takeSlowly(10, 20);
+    line.vanish(30);
+    EXPECT_EQ(Transfer::Gone, send());
+    EXPECT_EQ(30, line.elapsedMs());
+}
+
+TEST_F(LineSendingTest, NothingToSendIsDone) {
+    data.clear();
+    line.jam();
+    EXPECT_EQ(Transfer::Complete, send());
+}
+
+TEST_F(LineSendingTest, TimeFollowsFromRateAndFormat) {
+    EXPECT_EQ(1041666ns, characterTime(9600, 10));
+    EXPECT_EQ(80ms, characterTime(150, 12));
+    EXPECT_EQ(256 * 66666666ns + 1s, sendingTime(256, characterTime(150, 10)));
+}
+
+}  // namespace
