@@ -32,12 +32,12 @@ TEST_P(ExceptionTest, IsAnsweredWithItsCode) {
             .coils = 100, .discreteInputs = 100, .holdingRegisters = 100, .inputRegisters = 100}}});
     const Bytes expected{1, static_cast<std::uint8_t>(GetParam().request[1] | 0x80U),
                          GetParam().code};
-    EXPECT_EQ(slave.answer(GetParam().request), expected);
+    EXPECT_EQ(expected, slave.answer(GetParam().request));
     for (std::uint32_t i = 0; i < 100; ++i) {
         const auto address = static_cast<std::uint16_t>(i);
-        EXPECT_EQ(slave.get(1, Area::coil, i), initialValue(Area::coil, 1, address));
-        EXPECT_EQ(slave.get(1, Area::holdingRegister, i),
-                  initialValue(Area::holdingRegister, 1, address));
+        EXPECT_EQ(initialValue(Area::coil, 1, address), slave.get(1, Area::coil, i));
+        EXPECT_EQ(initialValue(Area::holdingRegister, 1, address),
+                  slave.get(1, Area::holdingRegister, i));
     }
 }
 

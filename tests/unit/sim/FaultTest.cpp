@@ -16,52 +16,52 @@ Bytes sentWith(const Fault& fault) {
 
 TEST(TransmitTest, WithoutFaultTheFrameGoesOutInOne) {
     const Transmission sent = transmit(Mode::rtu, kReply, Fault{});
-    EXPECT_EQ(sent.bytes, kFrame);
-    EXPECT_EQ(sent.delayMs, 0U);
-    EXPECT_EQ(sent.dripBytes, 0U);
+    EXPECT_EQ(kFrame, sent.bytes);
+    EXPECT_EQ(0U, sent.delayMs);
+    EXPECT_EQ(0U, sent.dripBytes);
     EXPECT_FALSE(sent.hangUp);
 }
 
 TEST(TransmitTest, WrongCheckSpoilsTheCheckOnly) {
-    EXPECT_EQ(sentWith({.wrongCheck = true}), (Bytes{0x02, 0x07, 0xBE, 0xED}));
+    EXPECT_EQ((Bytes{0x02, 0x07, 0xBE, 0xED}), sentWith({.wrongCheck = true}));
     const Bytes ascii = transmit(Mode::ascii, kReply, {.wrongCheck = true}).bytes;
-    EXPECT_EQ(std::string(ascii.begin(), ascii.end()), ":020708\r\n");
+    EXPECT_EQ(":020708\r\n", std::string(ascii.begin(), ascii.end()));
 }
 
 TEST(TransmitTest, WrongNodeHasARightCheck) {
-    EXPECT_EQ(sentWith({.wrongNode = true}), (Bytes{0x03, 0x07, 0x40, 0x82}));
+    EXPECT_EQ((Bytes{0x03, 0x07, 0x40, 0x82}), sentWith({.wrongNode = true}));
     const Bytes ascii = transmit(Mode::ascii, kReply, {.wrongNode = true}).bytes;
-    EXPECT_EQ(std::string(ascii.begin(), ascii.end()), ":0307F6\r\n");
+    EXPECT_EQ(":0307F6\r\n", std::string(ascii.begin(), ascii.end()));
 }
 
 TEST(TransmitTest, KeepCutsTheEnd) {
-    EXPECT_EQ(sentWith({.keep = 0}), Bytes{});
-    EXPECT_EQ(sentWith({.keep = 3}), (Bytes{0x02, 0x07, 0x41}));
-    EXPECT_EQ(sentWith({.keep = 99}), kFrame);
+    EXPECT_EQ(Bytes{}, sentWith({.keep = 0}));
+    EXPECT_EQ((Bytes{0x02, 0x07, 0x41}), sentWith({.keep = 3}));
+    EXPECT_EQ(kFrame, sentWith({.keep = 99}));
 }
 
 TEST(TransmitTest, NoiseComesBeforeAndDoesNotCountForKeep) {
-    EXPECT_EQ(sentWith({.keep = 2, .noise = {0x00, 0xFF}}), (Bytes{0x00, 0xFF, 0x02, 0x07}));
+    EXPECT_EQ((Bytes{0x00, 0xFF, 0x02, 0x07}), sentWith({.keep = 2, .noise = {0x00, 0xFF}}));
 }
 
 TEST(TransmitTest, ReplacementIsSentAsItIs) {
-    EXPECT_EQ(sentWith({.wrongCheck = true, .replacement = Bytes{1, 2, 3}}), (Bytes{1, 2, 3}));
+    EXPECT_EQ((Bytes{1, 2, 3}), sentWith({.wrongCheck = true, .replacement = Bytes{1, 2, 3}}));
 }
 
 TEST(TransmitTest, TimesArePassedOn) {
     const Transmission sent =
         transmit(Mode::rtu, kReply, {.delayMs = 200, .dripBytes = 2, .dripGapMs = 50});
-    EXPECT_EQ(sent.bytes, kFrame);
-    EXPECT_EQ(sent.delayMs, 200U);
-    EXPECT_EQ(sent.dripBytes, 2U);
-    EXPECT_EQ(sent.dripGapMs, 50U);
+    EXPECT_EQ(kFrame, sent.bytes);
+    EXPECT_EQ(200U, sent.delayMs);
+    EXPECT_EQ(2U, sent.dripBytes);
+    EXPECT_EQ(50U, sent.dripGapMs);
 }
 
 TEST(TransmitTest, HangUpSendsWhatIsKeptOrNothing) {
     const Transmission silent = transmit(Mode::rtu, kReply, {.hangUp = true});
     EXPECT_TRUE(silent.hangUp);
     EXPECT_TRUE(silent.bytes.empty());
-    EXPECT_EQ(sentWith({.keep = 1, .hangUp = true}), Bytes{0x02});
+    EXPECT_EQ(Bytes{0x02}, sentWith({.keep = 1, .hangUp = true}));
 }
 
 TEST(FaultQueueTest, FaultsComeDueInOrderAndCountDown) {

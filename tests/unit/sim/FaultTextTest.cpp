@@ -28,8 +28,8 @@ TEST(ParseFaultTest, ReadsEveryPart) {
         std::string error;
         const auto fault = parseFault(each.text, error);
         ASSERT_TRUE(fault) << each.text << ": " << error;
-        EXPECT_EQ(*fault, each.fault) << each.text;
-        EXPECT_EQ(error, "") << each.text;
+        EXPECT_EQ(each.fault, *fault) << each.text;
+        EXPECT_EQ("", error) << each.text;
     }
 }
 
@@ -57,9 +57,10 @@ TEST(ParseFaultTest, RefusesWithThePartInTheMessage) {
          }) {
         std::string error;
         EXPECT_FALSE(parseFault(text, error)) << text;
-        EXPECT_EQ(error, std::string("not a fault: \"") + part +
-                             "\"; the faults are silent, node, check, hangup, exception=, keep=, "
-                             "send=, noise=, delay=, drip=, times=, for=")
+        EXPECT_EQ(std::string("not a fault: \"") + part +
+                      "\"; the faults are silent, node, check, hangup, exception=, keep=, "
+                      "send=, noise=, delay=, drip=, times=, for=",
+                  error)
             << text;
     }
 }

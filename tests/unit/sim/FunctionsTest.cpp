@@ -25,7 +25,7 @@ class FunctionsTest : public testing::Test {
     void expectReply(const Bytes& request, const Bytes& reply) {
         const auto answer = slave.answer(request);
         ASSERT_TRUE(answer);
-        EXPECT_EQ(*answer, reply);
+        EXPECT_EQ(reply, *answer);
     }
 
     std::uint32_t word(std::uint32_t address) const {
@@ -63,20 +63,20 @@ TEST_F(FunctionsTest, WriteSingleCoil173OnAndOff) {
     setBits(Area::coil, 171, {0, 0, 0});
     const Bytes on{0x11, 0x05, 0x00, 0xAC, 0xFF, 0x00};
     expectReply(on, on);
-    EXPECT_EQ(slave.get(kNode, Area::coil, 171), 0U);
-    EXPECT_EQ(slave.get(kNode, Area::coil, 172), 1U);
-    EXPECT_EQ(slave.get(kNode, Area::coil, 173), 0U);
+    EXPECT_EQ(0U, slave.get(kNode, Area::coil, 171));
+    EXPECT_EQ(1U, slave.get(kNode, Area::coil, 172));
+    EXPECT_EQ(0U, slave.get(kNode, Area::coil, 173));
     const Bytes off{0x11, 0x05, 0x00, 0xAC, 0x00, 0x00};
     expectReply(off, off);
-    EXPECT_EQ(slave.get(kNode, Area::coil, 172), 0U);
+    EXPECT_EQ(0U, slave.get(kNode, Area::coil, 172));
 }
 
 TEST_F(FunctionsTest, WriteSingleRegister2) {
     const Bytes request{0x11, 0x06, 0x00, 0x01, 0x00, 0x03};
     expectReply(request, request);
-    EXPECT_EQ(word(0), 17000U);
-    EXPECT_EQ(word(1), 3U);
-    EXPECT_EQ(word(2), 17002U);
+    EXPECT_EQ(17000U, word(0));
+    EXPECT_EQ(3U, word(1));
+    EXPECT_EQ(17002U, word(2));
 }
 
 TEST_F(FunctionsTest, WriteMultipleCoils20To29) {
@@ -85,29 +85,29 @@ TEST_F(FunctionsTest, WriteMultipleCoils20To29) {
                 {0x11, 0x0F, 0x00, 0x13, 0x00, 0x0A});
     const Bytes expected{1, 1, 0, 1, 1, 0, 0, 1, 1, 1, 0, 1};  // Coil 18, ten coils, coil 29.
     for (std::uint32_t i = 0; i < expected.size(); ++i) {
-        EXPECT_EQ(slave.get(kNode, Area::coil, 18 + i), expected[i]) << "coil " << 18 + i;
+        EXPECT_EQ(expected[i], slave.get(kNode, Area::coil, 18 + i)) << "coil " << 18 + i;
     }
 }
 
 TEST_F(FunctionsTest, WriteMultipleRegisters2And3) {
     expectReply({0x11, 0x10, 0x00, 0x01, 0x00, 0x02, 0x04, 0x00, 0x0A, 0x01, 0x02},
                 {0x11, 0x10, 0x00, 0x01, 0x00, 0x02});
-    EXPECT_EQ(word(0), 17000U);
-    EXPECT_EQ(word(1), 0x000AU);
-    EXPECT_EQ(word(2), 0x0102U);
-    EXPECT_EQ(word(3), 17003U);
+    EXPECT_EQ(17000U, word(0));
+    EXPECT_EQ(0x000AU, word(1));
+    EXPECT_EQ(0x0102U, word(2));
+    EXPECT_EQ(17003U, word(3));
 }
 
 TEST_F(FunctionsTest, LargestReads) {
     const auto bits = slave.answer(Bytes{0x11, 0x01, 0x00, 0x00, 0x07, 0xD0});
     ASSERT_TRUE(bits);
-    EXPECT_EQ(bits->size(), 3U + 250U);
-    EXPECT_EQ((*bits)[2], 250);
+    EXPECT_EQ(3U + 250U, bits->size());
+    EXPECT_EQ(250, (*bits)[2]);
     const auto words = slave.answer(Bytes{0x11, 0x03, 0x00, 0x00, 0x00, 0x7D});
     ASSERT_TRUE(words);
-    EXPECT_EQ(words->size(), 3U + 250U);
-    EXPECT_EQ((*words)[2], 250);
-    EXPECT_EQ((*words)[251] << 8 | (*words)[252], 17124);
+    EXPECT_EQ(3U + 250U, words->size());
+    EXPECT_EQ(250, (*words)[2]);
+    EXPECT_EQ(17124, (*words)[251] << 8 | (*words)[252]);
 }
 
 TEST_F(FunctionsTest, LargestWrites) {
@@ -115,15 +115,15 @@ TEST_F(FunctionsTest, LargestWrites) {
     coils.resize(7 + 246, 0xFF);
     expectReply(coils, {0x11, 0x0F, 0x00, 0x00, 0x07, 0xB0});
     for (std::uint32_t i = 0; i < 1968; ++i)
-        EXPECT_EQ(slave.get(kNode, Area::coil, i), 1U) << i;
+        EXPECT_EQ(1U, slave.get(kNode, Area::coil, i)) << i;
 
     Bytes words{0x11, 0x10, 0x00, 0x00, 0x00, 0x7B, 246};
     words.resize(7 + 246);
     std::iota(words.begin() + 7, words.end(), std::uint8_t{1});
     expectReply(words, {0x11, 0x10, 0x00, 0x00, 0x00, 0x7B});
-    EXPECT_EQ(word(0), 0x0102U);
-    EXPECT_EQ(word(122), 0xF5F6U);
-    EXPECT_EQ(word(123), 17123U);
+    EXPECT_EQ(0x0102U, word(0));
+    EXPECT_EQ(0xF5F6U, word(122));
+    EXPECT_EQ(17123U, word(123));
 }
 
 }  // namespace

@@ -7,22 +7,21 @@ namespace {
 
 TEST(DescribeTest, RtuShowsBytesInHexadecimal) {
     EXPECT_EQ(
-        describe({.kind = LineEvent::Kind::request, .raw = {0x02, 0x07, 0x41, 0xFE}}, Mode::rtu),
-        "request 02 07 41 FE");
+        "request 02 07 41 FE",
+        describe({.kind = LineEvent::Kind::request, .raw = {0x02, 0x07, 0x41, 0xFE}}, Mode::rtu));
 }
 
 TEST(DescribeTest, AsciiShowsCharactersWithoutTheLineEnd) {
-    EXPECT_EQ(
-        describe({.kind = LineEvent::Kind::reply, .raw = {':', '0', '2', 0x1B, 0x80, '\r', '\n'}},
-                 Mode::ascii),
-        "reply :02..");
+    EXPECT_EQ("reply :02..", describe({.kind = LineEvent::Kind::reply,
+                                       .raw = {':', '0', '2', 0x1B, 0x80, '\r', '\n'}},
+                                      Mode::ascii));
 }
 
 TEST(DescribeTest, EveryKindHasItsName) {
-    EXPECT_EQ(describe({.kind = LineEvent::Kind::hangUp, .raw = {}}, Mode::rtu), "hang-up");
-    EXPECT_STREQ(nameOf(LineEvent::Kind::request), "request");
-    EXPECT_STREQ(nameOf(LineEvent::Kind::damaged), "damaged");
-    EXPECT_STREQ(nameOf(LineEvent::Kind::reply), "reply");
+    EXPECT_EQ("hang-up", describe({.kind = LineEvent::Kind::hangUp, .raw = {}}, Mode::rtu));
+    EXPECT_STREQ("request", nameOf(LineEvent::Kind::request));
+    EXPECT_STREQ("damaged", nameOf(LineEvent::Kind::damaged));
+    EXPECT_STREQ("reply", nameOf(LineEvent::Kind::reply));
 }
 
 }  // namespace

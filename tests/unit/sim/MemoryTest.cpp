@@ -29,7 +29,7 @@ TEST(MemoryTest, ContentsFollowTheFormula) {
              ContentsCase{Area::longRegister, 1, 5, 100503015},
              ContentsCase{Area::longRegister, 247, 65535, 1189666533},
          }) {
-        EXPECT_EQ(initialValue(each.area, each.node, each.address), each.value)
+        EXPECT_EQ(each.value, initialValue(each.area, each.node, each.address))
             << "area " << static_cast<int>(each.area) << " node " << int{each.node} << " address "
             << each.address;
     }
@@ -52,7 +52,7 @@ TEST(MemoryTest, LongRegistersCountFromTheirBase) {
     EXPECT_FALSE(memory.has(Area::longRegister, 4999, 1));
     EXPECT_TRUE(memory.has(Area::longRegister, 5000, 10));
     EXPECT_FALSE(memory.has(Area::longRegister, 5000, 11));
-    EXPECT_EQ(memory.get(Area::longRegister, 5000), 600018000U);
+    EXPECT_EQ(600018000U, memory.get(Area::longRegister, 5000));
 }
 
 TEST(MemoryTest, KeepsOnlyTheBitsOfTheArea) {
@@ -60,9 +60,9 @@ TEST(MemoryTest, KeepsOnlyTheBitsOfTheArea) {
     memory.set(Area::coil, 0, 0xFFFFFFFF);
     memory.set(Area::holdingRegister, 0, 0x12345678);
     memory.set(Area::longRegister, 5000, 0x12345678);
-    EXPECT_EQ(memory.get(Area::coil, 0), 1U);
-    EXPECT_EQ(memory.get(Area::holdingRegister, 0), 0x5678U);
-    EXPECT_EQ(memory.get(Area::longRegister, 5000), 0x12345678U);
+    EXPECT_EQ(1U, memory.get(Area::coil, 0));
+    EXPECT_EQ(0x5678U, memory.get(Area::holdingRegister, 0));
+    EXPECT_EQ(0x12345678U, memory.get(Area::longRegister, 5000));
 }
 
 TEST(MemoryTest, RefusesWhatNoAddressReaches) {

@@ -55,9 +55,9 @@ TEST_F(PtyLineTest, EveryByteValuePassesUnchangedBothWays) {
     TestMaster master(line.path());
     ASSERT_TRUE(master.isOpen());
     line.write(allBytes());
-    EXPECT_EQ(master.receive(256), allBytes());
+    EXPECT_EQ(allBytes(), master.receive(256));
     master.send(allBytes());
-    EXPECT_EQ(readFrom(line, 256), allBytes());
+    EXPECT_EQ(allBytes(), readFrom(line, 256));
 }
 
 TEST_F(PtyLineTest, ReadWithoutBytesReturnsAtOnce) {
@@ -72,7 +72,7 @@ TEST_F(PtyLineTest, MastersComeAndGo) {
         TestMaster master(line.path());
         ASSERT_TRUE(master.isOpen());
         master.send(Bytes{round});
-        EXPECT_EQ(readFrom(line, 1), Bytes{round});
+        EXPECT_EQ(Bytes{round}, readFrom(line, 1));
     }
     EXPECT_TRUE(line.read().empty());
     EXPECT_GE(line.descriptor(), 0);
@@ -93,14 +93,14 @@ TEST_F(PtyLineTest, HangUpIsSeenByTheMasterAndTheDeviceVanishes) {
     line.hangUp();
     EXPECT_TRUE(master.seesHangUp());
     EXPECT_FALSE(fs::exists(device));
-    EXPECT_EQ(line.descriptor(), -1);
+    EXPECT_EQ(-1, line.descriptor());
 }
 
 TEST_F(PtyLineTest, LinkLeadsToTheDeviceAndGoesWithTheLine) {
     {
         const PtyLine line(linkPath());
-        EXPECT_EQ(line.path(), linkPath());
-        EXPECT_EQ(fs::read_symlink(linkPath()), line.device());
+        EXPECT_EQ(linkPath(), line.path());
+        EXPECT_EQ(line.device(), fs::read_symlink(linkPath()));
         EXPECT_TRUE(TestMaster(linkPath()).isOpen());
     }
     EXPECT_FALSE(fs::is_symlink(linkPath()));
@@ -110,14 +110,14 @@ TEST_F(PtyLineTest, LinkLeadsToTheDeviceAndGoesWithTheLine) {
 TEST_F(PtyLineTest, ALinkThatItDidNotMakeIsRefusedAndKept) {
     fs::create_symlink("/nowhere", linkPath());
     EXPECT_THROW(PtyLine{linkPath()}, std::system_error);
-    EXPECT_EQ(fs::read_symlink(linkPath()), "/nowhere");
+    EXPECT_EQ("/nowhere", fs::read_symlink(linkPath()));
 }
 
 TEST_F(PtyLineTest, AFileInPlaceOfTheLinkIsRefusedAndKept) {
     std::ofstream(linkPath()) << "precious";
     EXPECT_THROW(PtyLine{linkPath()}, std::system_error);
     EXPECT_TRUE(fs::is_regular_file(linkPath()));
-    EXPECT_EQ(fs::file_size(linkPath()), 8U);
+    EXPECT_EQ(8U, fs::file_size(linkPath()));
 }
 
 TEST_F(PtyLineTest, ALinkThatAnotherLineHasTakenIsLeftToIt) {
@@ -125,7 +125,7 @@ TEST_F(PtyLineTest, ALinkThatAnotherLineHasTakenIsLeftToIt) {
     fs::remove(linkPath());
     const PtyLine second(linkPath());
     first.hangUp();
-    EXPECT_EQ(fs::read_symlink(linkPath()), second.device());
+    EXPECT_EQ(second.device(), fs::read_symlink(linkPath()));
 }
 
 }  // namespace

@@ -27,7 +27,7 @@ class SimulatorFaultTest : public testing::Test {
     /// The next request is answered as if nothing had happened.
     void expectRecovery(TestMaster& master) {
         master.send(kRead0);
-        EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply);
+        EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
     }
 
     Simulator simulator{{.nodes = {{.address = 1}, {.address = 2}}}};
@@ -55,7 +55,7 @@ TEST_F(SimulatorFaultTest, SpoiltRepliesAndTheRecoveryAfterwards) {
          }) {
         simulator.faults().add(each.fault);
         master.send(kRead0);
-        EXPECT_EQ(master.receive(each.received.size()), each.received) << each.what;
+        EXPECT_EQ(each.received, master.receive(each.received.size())) << each.what;
         expectRecovery(master);
     }
 }
@@ -68,8 +68,8 @@ TEST_F(SimulatorFaultTest, SilentForTheNextRequests) {
     master.send(kWrite0);
     ASSERT_TRUE(simulator.waitForEvents(2, 10s));
     expectRecovery(master);
-    EXPECT_EQ(register0(), 1000U) << "a silent node does not execute";
-    EXPECT_EQ(simulator.log().size(), 4U);
+    EXPECT_EQ(1000U, register0()) << "a silent node does not execute";
+    EXPECT_EQ(4U, simulator.log().size());
 }
 
 TEST_F(SimulatorFaultTest, ALostReplyIsExecuted) {
@@ -77,8 +77,8 @@ TEST_F(SimulatorFaultTest, ALostReplyIsExecuted) {
     TestMaster master(simulator.path());
     master.send(kWrite0);
     master.send(kWrite0);
-    EXPECT_EQ(master.receive(kWrite0.size()), kWrite0);
-    EXPECT_EQ(register0(), 0x1234U);
+    EXPECT_EQ(kWrite0, master.receive(kWrite0.size()));
+    EXPECT_EQ(0x1234U, register0());
 }
 
 TEST_F(SimulatorFaultTest, ADemandedExceptionIsNotExecuted) {
@@ -86,10 +86,10 @@ TEST_F(SimulatorFaultTest, ADemandedExceptionIsNotExecuted) {
     TestMaster master(simulator.path());
     master.send(kWrite0);
     const Bytes reply = master.receive(5);
-    ASSERT_EQ(reply.size(), 5U);
-    EXPECT_EQ(reply[1], 0x86);
-    EXPECT_EQ(reply[2], 6);
-    EXPECT_EQ(register0(), 1000U);
+    ASSERT_EQ(5U, reply.size());
+    EXPECT_EQ(0x86, reply[1]);
+    EXPECT_EQ(6, reply[2]);
+    EXPECT_EQ(1000U, register0());
 }
 
 TEST_F(SimulatorFaultTest, AFaultWaitsForItsNode) {
@@ -98,7 +98,7 @@ TEST_F(SimulatorFaultTest, AFaultWaitsForItsNode) {
     expectRecovery(master);
     EXPECT_FALSE(simulator.faults().empty());
     master.send(Bytes{0x02, 0x03, 0x00, 0x00, 0x00, 0x01, 0x84, 0x39});
-    EXPECT_EQ(master.receive(5)[1], 0x83);
+    EXPECT_EQ(0x83, master.receive(5)[1]);
 }
 
 TEST_F(SimulatorFaultTest, BroadcastsAndForeignNodesUseNoFaultUp) {
@@ -108,7 +108,7 @@ TEST_F(SimulatorFaultTest, BroadcastsAndForeignNodesUseNoFaultUp) {
     ASSERT_TRUE(simulator.waitForEvents(1, 10s));
     EXPECT_FALSE(simulator.faults().empty());
     master.send(kRead0);
-    EXPECT_EQ(master.receive(5), (Bytes{0x01, 0x83, 0x04, 0x40, 0xF3}));
+    EXPECT_EQ((Bytes{0x01, 0x83, 0x04, 0x40, 0xF3}), master.receive(5));
 }
 
 TEST_F(SimulatorFaultTest, DelayHoldsTheReplyBackAtLeastThatLong) {
@@ -116,7 +116,7 @@ TEST_F(SimulatorFaultTest, DelayHoldsTheReplyBackAtLeastThatLong) {
     TestMaster master(simulator.path());
     const auto sent = Clock::now();
     master.send(kRead0);
-    EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply);
+    EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
     EXPECT_GE(Clock::now() - sent, 60ms);
 }
 
@@ -125,7 +125,7 @@ TEST_F(SimulatorFaultTest, DripSendsEveryByteWithItsGaps) {
     TestMaster master(simulator.path());
     const auto sent = Clock::now();
     master.send(kRead0);
-    EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply);
+    EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
     EXPECT_GE(Clock::now() - sent, 40ms) << "three pieces, two gaps";
 }
 
@@ -136,14 +136,14 @@ TEST_F(SimulatorFaultTest, StopDoesNotWaitForADelay) {
     ASSERT_TRUE(simulator.waitForEvents(1, 10s));
     simulator.stop();
     EXPECT_TRUE(master.seesHangUp());
-    EXPECT_EQ(simulator.log().size(), 1U);
+    EXPECT_EQ(1U, simulator.log().size());
 }
 
 TEST_F(SimulatorFaultTest, StopDoesNotWaitForADrip) {
     simulator.faults().add({.dripBytes = 1, .dripGapMs = 3600000});
     TestMaster master(simulator.path());
     master.send(kRead0);
-    EXPECT_EQ(master.receive(1), Bytes{0x01});
+    EXPECT_EQ(Bytes{0x01}, master.receive(1));
     simulator.stop();
     EXPECT_TRUE(master.seesHangUp());
 }
@@ -154,8 +154,8 @@ TEST_F(SimulatorFaultTest, HangUpEndsTheLineUntilTheNextStart) {
     master.send(kRead0);
     EXPECT_TRUE(master.seesHangUp());
     EXPECT_FALSE(std::filesystem::exists(simulator.device()));
-    EXPECT_EQ(simulator.wait(), Simulator::End::hungUp);
-    EXPECT_EQ(simulator.log().back().kind, Kind::hangUp);
+    EXPECT_EQ(Simulator::End::hungUp, simulator.wait());
+    EXPECT_EQ(Kind::hangUp, simulator.log().back().kind);
     simulator.start();
     TestMaster again(simulator.path());
     expectRecovery(again);
@@ -165,7 +165,7 @@ TEST_F(SimulatorFaultTest, AHangUpMayCutAReply) {
     simulator.faults().add({.keep = 2, .dripBytes = 2, .dripGapMs = 1000, .hangUp = true});
     TestMaster master(simulator.path());
     master.send(kRead0);
-    EXPECT_EQ(master.receive(2), (Bytes{0x01, 0x03}));
+    EXPECT_EQ((Bytes{0x01, 0x03}), master.receive(2));
     EXPECT_TRUE(master.seesHangUp());
 }
 
@@ -174,7 +174,7 @@ TEST_F(SimulatorFaultTest, ASilentHangUpDoesNotExecute) {
     TestMaster master(simulator.path());
     master.send(kWrite0);
     EXPECT_TRUE(master.seesHangUp());
-    EXPECT_EQ(register0(), 1000U);
+    EXPECT_EQ(1000U, register0());
 }
 
 TEST_F(SimulatorFaultTest, StartAfterAHangUpNeedsNoWait) {

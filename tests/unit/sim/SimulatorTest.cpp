@@ -37,7 +37,7 @@ TEST(SimulatorTest, AnswersRtu) {
     TestMaster master(simulator.path());
     ASSERT_TRUE(master.isOpen());
     master.send(kRead0);
-    EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply);
+    EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
 }
 
 TEST(SimulatorTest, AnswersAscii) {
@@ -45,7 +45,7 @@ TEST(SimulatorTest, AnswersAscii) {
     simulator.start();
     TestMaster master(simulator.path());
     master.send(":010300000001FB\r\n");
-    EXPECT_EQ(master.receiveText(15), ":01030203E80F\r\n");
+    EXPECT_EQ(":01030203E80F\r\n", master.receiveText(15));
 }
 
 TEST(SimulatorTest, AnnouncedLengthNeedsNoSilence) {
@@ -54,7 +54,7 @@ TEST(SimulatorTest, AnnouncedLengthNeedsNoSilence) {
     simulator.start();
     TestMaster master(simulator.path());
     master.send(kRead0);
-    EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply);
+    EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
 }
 
 TEST(SimulatorTest, UnknownFunctionIsRefusedAfterTheSilence) {
@@ -62,7 +62,7 @@ TEST(SimulatorTest, UnknownFunctionIsRefusedAfterTheSilence) {
     simulator.start();
     TestMaster master(simulator.path());
     master.send(Bytes{0x01, 0x07, 0x41, 0xE2});
-    EXPECT_EQ(master.receive(5), (Bytes{0x01, 0x87, 0x01, 0x82, 0x30}));
+    EXPECT_EQ((Bytes{0x01, 0x87, 0x01, 0x82, 0x30}), master.receive(5));
 }
 
 TEST(SimulatorTest, DamagedRequestStaysUnanswered) {
@@ -72,12 +72,12 @@ TEST(SimulatorTest, DamagedRequestStaysUnanswered) {
     master.send(kRead0Damaged);
     ASSERT_TRUE(simulator.waitForEvents(1, 10s));
     master.send(kRead0);
-    EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply);
+    EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
     const auto events = simulator.log();
-    EXPECT_EQ(kindsOf(events), (std::vector{Kind::damaged, Kind::request, Kind::reply}));
-    EXPECT_EQ(events[0].raw, kRead0Damaged);
-    EXPECT_EQ(events[1].raw, kRead0);
-    EXPECT_EQ(events[2].raw, kRead0Reply);
+    EXPECT_EQ((std::vector{Kind::damaged, Kind::request, Kind::reply}), kindsOf(events));
+    EXPECT_EQ(kRead0Damaged, events[0].raw);
+    EXPECT_EQ(kRead0, events[1].raw);
+    EXPECT_EQ(kRead0Reply, events[2].raw);
 }
 
 TEST(SimulatorTest, BroadcastIsExecutedAndStaysUnanswered) {
@@ -86,8 +86,8 @@ TEST(SimulatorTest, BroadcastIsExecutedAndStaysUnanswered) {
     TestMaster master(simulator.path());
     master.send(Bytes{0x00, 0x06, 0x00, 0x07, 0x00, 0x2A, 0xB8, 0x05});
     master.send(Bytes{0x01, 0x03, 0x00, 0x07, 0x00, 0x01, 0x35, 0xCB});
-    EXPECT_EQ(master.receive(7), (Bytes{0x01, 0x03, 0x02, 0x00, 0x2A, 0x39, 0x9B}));
-    EXPECT_EQ(simulator.slave().get(2, Area::holdingRegister, 7), 42U);
+    EXPECT_EQ((Bytes{0x01, 0x03, 0x02, 0x00, 0x2A, 0x39, 0x9B}), master.receive(7));
+    EXPECT_EQ(42U, simulator.slave().get(2, Area::holdingRegister, 7));
 }
 
 TEST(SimulatorTest, SeveralNodesShareTheLineAndOthersStayQuiet) {
@@ -96,7 +96,7 @@ TEST(SimulatorTest, SeveralNodesShareTheLineAndOthersStayQuiet) {
     TestMaster master(simulator.path());
     master.send(kRead0);
     master.send(kReadNode2);
-    EXPECT_EQ(master.receive(kReadNode2Reply.size()), kReadNode2Reply);
+    EXPECT_EQ(kReadNode2Reply, master.receive(kReadNode2Reply.size()));
 }
 
 TEST(SimulatorTest, LongRegisterIsWrittenAtOnce) {
@@ -105,8 +105,8 @@ TEST(SimulatorTest, LongRegisterIsWrittenAtOnce) {
     TestMaster master(simulator.path());
     const Bytes request{0x01, 0x06, 0x13, 0x88, 0xDE, 0xAD, 0xBE, 0xEF, 0x9E, 0x9E};
     master.send(request);
-    EXPECT_EQ(master.receive(request.size()), request);
-    EXPECT_EQ(simulator.slave().get(1, Area::longRegister, 5000), 0xDEADBEEFU);
+    EXPECT_EQ(request, master.receive(request.size()));
+    EXPECT_EQ(0xDEADBEEFU, simulator.slave().get(1, Area::longRegister, 5000));
 }
 
 TEST(SimulatorTest, MastersComeAndGo) {
@@ -115,7 +115,7 @@ TEST(SimulatorTest, MastersComeAndGo) {
     for (int round = 0; round < 5; ++round) {
         TestMaster master(simulator.path());
         master.send(kRead0);
-        EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply) << "round " << round;
+        EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size())) << "round " << round;
     }
 }
 
@@ -125,7 +125,7 @@ TEST(SimulatorTest, MemoryMayChangeWhileServing) {
     simulator.slave().set(1, Area::holdingRegister, 0, 1005);
     TestMaster master(simulator.path());
     master.send(kRead0);
-    EXPECT_EQ(master.receive(7), (Bytes{0x01, 0x03, 0x02, 0x03, 0xED, 0x78, 0xF9}));
+    EXPECT_EQ((Bytes{0x01, 0x03, 0x02, 0x03, 0xED, 0x78, 0xF9}), master.receive(7));
 }
 
 TEST(SimulatorTest, TraceSeesTheEventsOfTheLog) {
@@ -135,10 +135,11 @@ TEST(SimulatorTest, TraceSeesTheEventsOfTheLog) {
     simulator.start();
     TestMaster master(simulator.path());
     master.send(kRead0);
-    EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply);
+    EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
     simulator.stop();
-    EXPECT_EQ(lines, (std::vector<std::string>{"request 01 03 00 00 00 01 84 0A",
-                                               "reply 01 03 02 03 E8 B8 FA"}));
+    EXPECT_EQ(
+        (std::vector<std::string>{"request 01 03 00 00 00 01 84 0A", "reply 01 03 02 03 E8 B8 FA"}),
+        lines);
 }
 
 TEST(SimulatorTest, LogKeepsTheLatestEvents) {
@@ -149,7 +150,7 @@ TEST(SimulatorTest, LogKeepsTheLatestEvents) {
         master.send(kRead0);
         master.receive(kRead0Reply.size());
     }
-    EXPECT_EQ(kindsOf(simulator.log()), (std::vector{Kind::reply, Kind::request, Kind::reply}));
+    EXPECT_EQ((std::vector{Kind::reply, Kind::request, Kind::reply}), kindsOf(simulator.log()));
     simulator.clearLog();
     EXPECT_TRUE(simulator.log().empty());
     EXPECT_FALSE(simulator.waitForEvents(1, 0ms));
@@ -166,16 +167,16 @@ TEST(SimulatorTest, StopTakesThePortAwayAndStartBringsItBackWithItsMemory) {
     simulator.start();
     TestMaster after(simulator.path());
     after.send(kRead0);
-    EXPECT_EQ(after.receive(7), (Bytes{0x01, 0x03, 0x02, 0x03, 0xED, 0x78, 0xF9}));
+    EXPECT_EQ((Bytes{0x01, 0x03, 0x02, 0x03, 0xED, 0x78, 0xF9}), after.receive(7));
 }
 
 TEST(SimulatorTest, StartWhileServingKeepsTheLine) {
     Simulator simulator({});
-    EXPECT_EQ(simulator.path(), "");
+    EXPECT_EQ("", simulator.path());
     simulator.start();
     const std::string path = simulator.path();
     simulator.start();
-    EXPECT_EQ(simulator.path(), path);
+    EXPECT_EQ(path, simulator.path());
 }
 
 TEST(SimulatorTest, WaitReturnsWhenTheStopIsRequested) {
@@ -185,7 +186,7 @@ TEST(SimulatorTest, WaitReturnsWhenTheStopIsRequested) {
     TestMaster master(simulator.path());
     auto end = std::async(std::launch::async, [&] { return simulator.wait(); });
     simulator.requestStop();
-    EXPECT_EQ(end.get(), Simulator::End::stopped);
+    EXPECT_EQ(Simulator::End::stopped, end.get());
     EXPECT_TRUE(master.seesHangUp());
     EXPECT_FALSE(std::filesystem::exists(simulator.device()));
 }
@@ -194,11 +195,11 @@ TEST(SimulatorTest, AStopRequestedBeforeTheStartIsNotLost) {
     Simulator simulator({});
     simulator.requestStop();
     simulator.start();
-    EXPECT_EQ(simulator.wait(), Simulator::End::stopped);
+    EXPECT_EQ(Simulator::End::stopped, simulator.wait());
     simulator.start();
     TestMaster master(simulator.path());
     master.send(kRead0);
-    EXPECT_EQ(master.receive(kRead0Reply.size()), kRead0Reply);
+    EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
 }
 
 TEST(SimulatorTest, LinkStaysTheSameOverStarts) {
@@ -209,8 +210,8 @@ TEST(SimulatorTest, LinkStaysTheSameOverStarts) {
         Simulator simulator({.link = link});
         for (int round = 0; round < 2; ++round) {
             simulator.start();
-            EXPECT_EQ(simulator.path(), link);
-            EXPECT_EQ(std::filesystem::read_symlink(link), simulator.device());
+            EXPECT_EQ(link, simulator.path());
+            EXPECT_EQ(simulator.device(), std::filesystem::read_symlink(link));
             simulator.stop();
         }
     }

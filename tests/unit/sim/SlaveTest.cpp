@@ -11,9 +11,9 @@ namespace {
 TEST(SlaveTest, EachNodeHasItsOwnMemory) {
     Slave slave({{.address = 1}, {.address = 2}});
     ASSERT_TRUE(slave.answer(Bytes{1, 6, 0, 7, 0x12, 0x34}));
-    EXPECT_EQ(slave.get(1, Area::holdingRegister, 7), 0x1234U);
-    EXPECT_EQ(slave.get(2, Area::holdingRegister, 7), 2007U);
-    EXPECT_EQ(slave.answer(Bytes{2, 3, 0, 7, 0, 1}), (Bytes{2, 3, 2, 0x07, 0xD7}));
+    EXPECT_EQ(0x1234U, slave.get(1, Area::holdingRegister, 7));
+    EXPECT_EQ(2007U, slave.get(2, Area::holdingRegister, 7));
+    EXPECT_EQ((Bytes{2, 3, 2, 0x07, 0xD7}), slave.answer(Bytes{2, 3, 0, 7, 0, 1}));
 }
 
 TEST(SlaveTest, OtherNodesStayUnanswered) {
@@ -32,11 +32,11 @@ TEST(SlaveTest, BroadcastWritesReachEveryNodeAndStayUnanswered) {
     EXPECT_FALSE(slave.answer(Bytes{0, 15, 0, 8, 0, 2, 1, 3}));
     EXPECT_FALSE(slave.answer(Bytes{0, 16, 0, 2, 0, 1, 2, 0, 8}));
     for (const std::uint8_t node : {std::uint8_t{1}, std::uint8_t{2}}) {
-        EXPECT_EQ(slave.get(node, Area::coil, 0), 1U) << int{node};
-        EXPECT_EQ(slave.get(node, Area::holdingRegister, 1), 9U) << int{node};
-        EXPECT_EQ(slave.get(node, Area::coil, 8), 1U) << int{node};
-        EXPECT_EQ(slave.get(node, Area::coil, 9), 1U) << int{node};
-        EXPECT_EQ(slave.get(node, Area::holdingRegister, 2), 8U) << int{node};
+        EXPECT_EQ(1U, slave.get(node, Area::coil, 0)) << int{node};
+        EXPECT_EQ(9U, slave.get(node, Area::holdingRegister, 1)) << int{node};
+        EXPECT_EQ(1U, slave.get(node, Area::coil, 8)) << int{node};
+        EXPECT_EQ(1U, slave.get(node, Area::coil, 9)) << int{node};
+        EXPECT_EQ(8U, slave.get(node, Area::holdingRegister, 2)) << int{node};
     }
 }
 
@@ -49,19 +49,19 @@ TEST(SlaveTest, BroadcastReadsAndUnknownFunctionsStayUnanswered) {
 TEST(SlaveTest, BroadcastSkipsTheNodeThatLacksTheAddress) {
     Slave slave({{.address = 1, .sizes = {.holdingRegisters = 1}}, {.address = 2}});
     EXPECT_FALSE(slave.answer(Bytes{0, 6, 0, 5, 0, 9}));
-    EXPECT_EQ(slave.get(1, Area::holdingRegister, 0), 1000U);
-    EXPECT_EQ(slave.get(2, Area::holdingRegister, 5), 9U);
+    EXPECT_EQ(1000U, slave.get(1, Area::holdingRegister, 0));
+    EXPECT_EQ(9U, slave.get(2, Area::holdingRegister, 5));
 }
 
 TEST(SlaveTest, RequestLengthIsKnownFromTheHeader) {
     const Slave slave({NodeOptions{.address = 1}});
     for (std::uint8_t function = 1; function <= 6; ++function) {
-        EXPECT_EQ(slave.requestLength(Bytes{1, function, 0, 0}), 8U) << int{function};
-        EXPECT_EQ(slave.requestLength(Bytes{9, function, 0, 0}), 8U) << int{function};
+        EXPECT_EQ(8U, slave.requestLength(Bytes{1, function, 0, 0})) << int{function};
+        EXPECT_EQ(8U, slave.requestLength(Bytes{9, function, 0, 0})) << int{function};
         EXPECT_FALSE(slave.requestLength(Bytes{1})) << int{function};
     }
     for (std::uint8_t function = 15; function <= 16; ++function) {
-        EXPECT_EQ(slave.requestLength(Bytes{1, function, 0, 0, 0, 1, 2}), 11U) << int{function};
+        EXPECT_EQ(11U, slave.requestLength(Bytes{1, function, 0, 0, 0, 1, 2})) << int{function};
         EXPECT_FALSE(slave.requestLength(Bytes{1, function, 0, 0, 0, 1})) << int{function};
     }
     EXPECT_FALSE(slave.requestLength(Bytes{1, 7, 0, 0, 0, 0, 0, 0}));
@@ -91,11 +91,11 @@ TEST(SlaveTest, ARequestIsOneStepForOtherThreads) {
     });
     for (int i = 0; i < 200; ++i) {
         const auto reply = slave.answer(Bytes{1, 3, 0, 0, 0, 2});
-        ASSERT_EQ(reply->size(), 7U);
-        EXPECT_EQ((*reply)[4], (*reply)[6]);
+        ASSERT_EQ(7U, reply->size());
+        EXPECT_EQ((*reply)[6], (*reply)[4]);
     }
     writer.join();
-    EXPECT_EQ(slave.get(1, Area::holdingRegister, 1), 199U);
+    EXPECT_EQ(199U, slave.get(1, Area::holdingRegister, 1));
 }
 
 }  // namespace

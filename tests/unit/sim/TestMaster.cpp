@@ -30,7 +30,7 @@ TestMaster::~TestMaster() {
 }
 
 void TestMaster::send(const std::vector<std::uint8_t>& bytes) {
-    EXPECT_EQ(::write(fd_, bytes.data(), bytes.size()), static_cast<ssize_t>(bytes.size()));
+    EXPECT_EQ(static_cast<ssize_t>(bytes.size()), ::write(fd_, bytes.data(), bytes.size()));
 }
 
 void TestMaster::send(const std::string& text) {
