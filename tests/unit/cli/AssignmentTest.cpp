@@ -8,9 +8,9 @@ namespace {
 
 TEST(Assignment, IsSplitAtTheFirstEqualsSign) {
     const auto split = cli::parseAssignment("1?HREG?400001?string-8=a=b");
-    EXPECT_EQ(split.uri, "1?HREG?400001?string-8");
-    EXPECT_EQ(split.value, "a=b");
-    EXPECT_EQ(cli::parseAssignment("u=").value, "");
+    EXPECT_EQ("1?HREG?400001?string-8", split.uri);
+    EXPECT_EQ("a=b", split.value);
+    EXPECT_EQ("", cli::parseAssignment("u=").value);
 }
 
 TEST(Assignment, NeedsUriAndEqualsSign) {
@@ -20,19 +20,19 @@ TEST(Assignment, NeedsUriAndEqualsSign) {
 }
 
 TEST(ExitCode, FollowsTheDriversErrorCode) {
-    EXPECT_EQ(cli::exitCodeOf(-4), cli::ExitCode::NoResponse);
-    EXPECT_EQ(cli::exitCodeOf(-6), cli::ExitCode::BadReply);
+    EXPECT_EQ(cli::ExitCode::NoResponse, cli::exitCodeOf(-4));
+    EXPECT_EQ(cli::ExitCode::BadReply, cli::exitCodeOf(-6));
     for (const int other : {-1, -3, -9, -10, 0, 1}) {
-        EXPECT_EQ(cli::exitCodeOf(other), cli::ExitCode::Other) << other;
+        EXPECT_EQ(cli::ExitCode::Other, cli::exitCodeOf(other)) << other;
     }
 }
 
 TEST(ExitCode, OfSeveralFailuresTheFirstCounts) {
     cli::FirstFailure first;
-    EXPECT_EQ(first.code(), cli::ExitCode::Done);
+    EXPECT_EQ(cli::ExitCode::Done, first.code());
     first.note(cli::ExitCode::NoResponse);
     first.note(cli::ExitCode::BadReply);
-    EXPECT_EQ(first.code(), cli::ExitCode::NoResponse);
+    EXPECT_EQ(cli::ExitCode::NoResponse, first.code());
 }
 
 }  // namespace

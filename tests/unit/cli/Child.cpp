@@ -174,8 +174,8 @@ RunningCommand::RunningCommand(const std::vector<std::string>& words, const RunO
     out_ = out.reading;
     err_ = err.reading;
     // Shorter than a pipe holds: no write blocks here.
-    EXPECT_EQ(write(in_, options.input.data(), options.input.size()),
-              static_cast<ssize_t>(options.input.size()));
+    EXPECT_EQ(static_cast<ssize_t>(options.input.size()),
+              write(in_, options.input.data(), options.input.size()));
 }
 
 RunningCommand::~RunningCommand() {
@@ -185,7 +185,7 @@ RunningCommand::~RunningCommand() {
 }
 
 void RunningCommand::send(int signal) const {
-    EXPECT_EQ(kill(pid_, signal), 0);
+    EXPECT_EQ(0, kill(pid_, signal));
 }
 
 Outcome RunningCommand::end() {
@@ -263,17 +263,17 @@ TerminalSession::~TerminalSession() {
 }
 
 void TerminalSession::send(int signal) const {
-    EXPECT_EQ(kill(pid_, signal), 0);
+    EXPECT_EQ(0, kill(pid_, signal));
 }
 
 termios TerminalSession::settings() const {
     termios now{};
-    EXPECT_EQ(tcgetattr(watch_, &now), 0);
+    EXPECT_EQ(0, tcgetattr(watch_, &now));
     return now;
 }
 
 void TerminalSession::type(const std::string& keys) {
-    EXPECT_EQ(write(terminal_, keys.data(), keys.size()), static_cast<ssize_t>(keys.size()));
+    EXPECT_EQ(static_cast<ssize_t>(keys.size()), write(terminal_, keys.data(), keys.size()));
 }
 
 bool TerminalSession::shows(const std::string& text) {

@@ -48,66 +48,67 @@ TEST(Console, OneCommandIsAnsweredAsTheDriverAnswers) {
         std::vector<std::string> words{"console", "--sim"};
         words.insert(words.end(), row.words.begin(), row.words.end());
         const Outcome outcome = mrtu(words);
-        EXPECT_EQ(outcome.out, row.answer);
-        EXPECT_EQ(outcome.err, "") << row.answer;
-        EXPECT_EQ(outcome.exitCode, row.exitCode) << row.answer;
+        EXPECT_EQ(row.answer, outcome.out);
+        EXPECT_EQ("", outcome.err) << row.answer;
+        EXPECT_EQ(row.exitCode, outcome.exitCode) << row.answer;
     }
 }
 
 TEST(Console, ASilentDeviceIsAFailure) {
     const Outcome outcome = mrtu({"console", "--sim", "--timeout", "50", "--set", "repeat=0",
                                   "read", "77?HREG?400001?short"});
-    EXPECT_EQ(outcome.out, "No response");
-    EXPECT_EQ(outcome.exitCode, 4);
+    EXPECT_EQ("No response", outcome.out);
+    EXPECT_EQ(4, outcome.exitCode);
 }
 
 TEST(Console, AWrongByteOrderIsAUsageError) {
     const Outcome outcome =
         mrtu({"console", "--sim"}, {.input = "read 1?HREG?400001?int@ABDC\ngetmaxtm\n"});
-    EXPECT_EQ(outcome.err, "mrtu: 'ABDC' is no byte order of int: ABCD, CDAB, DCBA, BADC\n");
-    EXPECT_EQ(outcome.out, "maxtm = 4000 ms\n");
-    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ("mrtu: 'ABDC' is no byte order of int: ABCD, CDAB, DCBA, BADC\n", outcome.err);
+    EXPECT_EQ("maxtm = 4000 ms\n", outcome.out);
+    EXPECT_EQ(2, outcome.exitCode);
 }
 
 TEST(Console, AnUnknownCommandIsAUsageError) {
     const Outcome outcome = mrtu({"console", "--sim", "HELP"});
-    EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.err, "mrtu: unknown command 'HELP'; did you mean 'help'?\n");
-    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ("", outcome.out);
+    EXPECT_EQ("mrtu: unknown command 'HELP'; did you mean 'help'?\n", outcome.err);
+    EXPECT_EQ(2, outcome.exitCode);
 }
 
 TEST(Console, WithoutALineTheDriverStaysStopped) {
-    EXPECT_EQ(mrtu({"console", "help"}).out, kHelp);
+    EXPECT_EQ(kHelp, mrtu({"console", "help"}).out);
     const Outcome outcome = mrtu({"console", "read", "1?HREG?400001?short"});
-    EXPECT_EQ(outcome.out, "Protocol not started");
-    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ("Protocol not started", outcome.out);
+    EXPECT_EQ(2, outcome.exitCode);
 }
 
 TEST(Console, PipedCommandsAreAnsweredLineByLine) {
     const Outcome outcome = mrtu({"console", "--sim"},
                                  {.input = "getmaxtm\n\nread x\r\nsetid 5 7\ngetid\nquit\nhelp\n"});
-    EXPECT_EQ(outcome.out,
-              "maxtm = 4000 ms\n"
-              "Tag URI error: x - there must be 4 tag specification fields\n"
-              "id 5 set to 7\n"
-              "id 5 -> 7\n");
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.exitCode, 2);  // of "read x"
+    EXPECT_EQ(
+        "maxtm = 4000 ms\n"
+        "Tag URI error: x - there must be 4 tag specification fields\n"
+        "id 5 set to 7\n"
+        "id 5 -> 7\n",
+        outcome.out);
+    EXPECT_EQ("", outcome.err);
+    EXPECT_EQ(2, outcome.exitCode);  // of "read x"
 }
 
 TEST(Console, AnUnknownPipedCommandDoesNotStopTheOthers) {
     const Outcome outcome = mrtu({"console", "--sim"}, {.input = "nonsense\ngetmaxtm"});
-    EXPECT_EQ(outcome.out, "maxtm = 4000 ms\n");
-    EXPECT_EQ(outcome.err, "mrtu: unknown command 'nonsense'\n");
-    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ("maxtm = 4000 ms\n", outcome.out);
+    EXPECT_EQ("mrtu: unknown command 'nonsense'\n", outcome.err);
+    EXPECT_EQ(2, outcome.exitCode);
 }
 
 TEST(Console, LongAnswersAreCutAtSixteenKibibytes) {
     const Outcome outcome = mrtu({"console", "--sim", "read", "1?HREG?400001?unsignedShort-5000"});
     // The driver leaves room for a line end and a zero behind the last whole byte.
-    EXPECT_EQ(outcome.out.size(), 16 * 1024 - 3U);
-    EXPECT_EQ(outcome.out.substr(0, 8), "e803e903");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(16 * 1024 - 3U, outcome.out.size());
+    EXPECT_EQ("e803e903", outcome.out.substr(0, 8));
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 TEST(Console, AtATerminalLinesAreRemembered) {
@@ -121,7 +122,7 @@ TEST(Console, AtATerminalLinesAreRemembered) {
     session.type("nonsense\r");
     ASSERT_TRUE(session.shows("unknown command 'nonsense'")) << session.screen();
     session.type("quit\r");
-    EXPECT_EQ(session.end(), 0) << session.screen();
+    EXPECT_EQ(0, session.end()) << session.screen();
 }
 
 }  // namespace

@@ -56,28 +56,28 @@ TEST(LineOptions, ShortFormsSetTheirItems) {
     const std::string text =
         configOf({"--baud", "9600", "--parity", "even", "--stopbits", "2", "--node", "5", "--model",
                   "2", "--timeout", "100", "--ascii", "--set", "repeat=0"});
-    EXPECT_EQ(cli::itemOf(text, "baudrate"), "9600");
-    EXPECT_EQ(cli::itemOf(text, "parity"), "even");
-    EXPECT_EQ(cli::itemOf(text, "stopbits"), "2");
-    EXPECT_EQ(cli::itemOf(text, "defNodeId"), "5");
-    EXPECT_EQ(cli::itemOf(text, "model"), "2");
-    EXPECT_EQ(cli::itemOf(text, "timeout"), "100");
-    EXPECT_EQ(cli::itemOf(text, "txMode"), "ASCII");
-    EXPECT_EQ(cli::itemOf(text, "repeat"), "0");
+    EXPECT_EQ("9600", cli::itemOf(text, "baudrate"));
+    EXPECT_EQ("even", cli::itemOf(text, "parity"));
+    EXPECT_EQ("2", cli::itemOf(text, "stopbits"));
+    EXPECT_EQ("5", cli::itemOf(text, "defNodeId"));
+    EXPECT_EQ("2", cli::itemOf(text, "model"));
+    EXPECT_EQ("100", cli::itemOf(text, "timeout"));
+    EXPECT_EQ("ASCII", cli::itemOf(text, "txMode"));
+    EXPECT_EQ("0", cli::itemOf(text, "repeat"));
 }
 
 TEST(LineOptions, OptionsWinOverTheFile) {
     const ConfigFile file("CfgVer=1\ntimeout=1\nbits=7\nuart=com3\n");
     const std::string text = configOf({"--config", file.path(), "--set", "timeout=2", "--ascii"});
-    EXPECT_EQ(cli::itemOf(text, "timeout"), "2");
-    EXPECT_EQ(cli::itemOf(text, "bits"), "7");
-    EXPECT_EQ(cli::itemOf(text, "uart"), "com3");
+    EXPECT_EQ("2", cli::itemOf(text, "timeout"));
+    EXPECT_EQ("7", cli::itemOf(text, "bits"));
+    EXPECT_EQ("com3", cli::itemOf(text, "uart"));
 }
 
 TEST(LineOptions, AsciiNeedsDataBitsAndGetsThem) {
     const ConfigFile file("CfgVer=1 uart=com1");
-    EXPECT_EQ(cli::itemOf(configOf({"--config", file.path(), "--ascii"}), "bits"), "8");
-    EXPECT_EQ(cli::itemOf(configOf({"--config", file.path()}), "bits"), std::nullopt);
+    EXPECT_EQ("8", cli::itemOf(configOf({"--config", file.path(), "--ascii"}), "bits"));
+    EXPECT_EQ(std::nullopt, cli::itemOf(configOf({"--config", file.path()}), "bits"));
 }
 
 TEST(LineOptions, AFileThatCannotBeTakenIsAUsageError) {
@@ -89,7 +89,7 @@ TEST(LineOptions, AFileThatCannotBeTakenIsAUsageError) {
             configOf({"--config", path});
             ADD_FAILURE() << path << " was taken";
         } catch (const cli::CommandError& error) {
-            EXPECT_EQ(error.code(), cli::ExitCode::Usage) << path;
+            EXPECT_EQ(cli::ExitCode::Usage, error.code()) << path;
             EXPECT_NE(std::string(error.what()).find(path), std::string::npos) << error.what();
         }
     }
@@ -99,19 +99,19 @@ TEST(LineOptions, APortTakesOneWordAndCanBeRepeated) {
     const cli::LineOptions options =
         parsed({"--port", "com1=/dev/a", "--port", "com2=/dev/b", "1?HREG?400001?int"});
     const auto ports = cli::portsOf(options, "CfgVer=1 uart=com1");
-    ASSERT_EQ(ports.size(), 2U);
-    EXPECT_EQ(ports[0].name, "com1");
-    EXPECT_EQ(ports[0].device, "/dev/a");
-    EXPECT_EQ(ports[1].name, "com2");
-    EXPECT_EQ(ports[1].device, "/dev/b");
+    ASSERT_EQ(2U, ports.size());
+    EXPECT_EQ("com1", ports[0].name);
+    EXPECT_EQ("/dev/a", ports[0].device);
+    EXPECT_EQ("com2", ports[1].name);
+    EXPECT_EQ("/dev/b", ports[1].device);
 }
 
 TEST(LineOptions, ADeviceAloneServesTheConfiguredPort) {
     const auto ports =
         cli::portsOf(parsed({"--port", "/dev/serial/by-id/com=1"}), "CfgVer=1 uart=com5");
-    ASSERT_EQ(ports.size(), 1U);
-    EXPECT_EQ(ports[0].name, "com5");
-    EXPECT_EQ(ports[0].device, "/dev/serial/by-id/com=1");
+    ASSERT_EQ(1U, ports.size());
+    EXPECT_EQ("com5", ports[0].name);
+    EXPECT_EQ("/dev/serial/by-id/com=1", ports[0].device);
 }
 
 TEST(LineOptions, APortWithoutDeviceIsRefused) {

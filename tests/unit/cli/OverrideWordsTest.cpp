@@ -27,19 +27,19 @@ std::string removalRefusal(const std::vector<std::string>& words) {
 TEST(OverrideWords, NodesModiconModeAndSettingsInOneGo) {
     const auto changes = cli::parseChanges({"node", "5=7", "6=off", "modicon", "5=on", "6=off",
                                             "baud=38400", "parity=Even", "stop=2", "mode=rs-485"});
-    ASSERT_EQ(changes.nodes.size(), 2U);
-    EXPECT_EQ(changes.nodes[0].node, 5);
-    EXPECT_EQ(changes.nodes[0].address, 7);
-    EXPECT_EQ(changes.nodes[1].address, 255);
-    ASSERT_EQ(changes.modicon.size(), 2U);
+    ASSERT_EQ(2U, changes.nodes.size());
+    EXPECT_EQ(5, changes.nodes[0].node);
+    EXPECT_EQ(7, changes.nodes[0].address);
+    EXPECT_EQ(255, changes.nodes[1].address);
+    ASSERT_EQ(2U, changes.modicon.size());
     EXPECT_TRUE(changes.modicon[0].on);
     EXPECT_FALSE(changes.modicon[1].on);
-    ASSERT_EQ(changes.serial.size(), 4U);
-    EXPECT_EQ(changes.serial[0].setting->area, "SP_Baud");
-    EXPECT_EQ(changes.serial[0].code, 38400U);
-    EXPECT_EQ(changes.serial[1].code, 1U);
-    EXPECT_EQ(changes.serial[2].code, 2U);
-    EXPECT_EQ(changes.serial[3].code, 1U);
+    ASSERT_EQ(4U, changes.serial.size());
+    EXPECT_EQ("SP_Baud", changes.serial[0].setting->area);
+    EXPECT_EQ(38400U, changes.serial[0].code);
+    EXPECT_EQ(1U, changes.serial[1].code);
+    EXPECT_EQ(2U, changes.serial[2].code);
+    EXPECT_EQ(1U, changes.serial[3].code);
 }
 
 TEST(OverrideWords, EveryWordHasItsCodeAndBack) {
@@ -56,19 +56,18 @@ TEST(OverrideWords, EveryWordHasItsCodeAndBack) {
                             {"mode=RS-232", 0},    {"mode=RS-485", 1},      {"mode=RS-422", 2}};
     for (const Row& row : rows) {
         const auto changes = cli::parseChanges({row.text});
-        ASSERT_EQ(changes.serial.size(), 1U) << row.text;
+        ASSERT_EQ(1U, changes.serial.size()) << row.text;
         const cli::SerialChange& change = changes.serial[0];
-        EXPECT_EQ(change.code, row.code) << row.text;
-        EXPECT_EQ(
-            std::string(change.setting->name) + "=" + cli::wordOf(*change.setting, change.code),
-            row.text);
+        EXPECT_EQ(row.code, change.code) << row.text;
+        EXPECT_EQ(row.text, std::string(change.setting->name) + "=" +
+                                cli::wordOf(*change.setting, change.code));
     }
 }
 
 TEST(OverrideWords, ACodeWithoutAWordIsShownAsItIs) {
-    EXPECT_EQ(cli::wordOf(cli::serialSettings()[3], 3), "3");
-    EXPECT_EQ(cli::addressWord(255), "off");
-    EXPECT_EQ(cli::addressWord(7), "7");
+    EXPECT_EQ("3", cli::wordOf(cli::serialSettings()[3], 3));
+    EXPECT_EQ("off", cli::addressWord(255));
+    EXPECT_EQ("7", cli::addressWord(7));
 }
 
 TEST(OverrideWords, WhatCannotBeSetIsNamed) {
@@ -98,16 +97,16 @@ TEST(OverrideWords, WhatCannotBeSetIsNamed) {
         {{"speed"}, "'speed': expected node, modicon or SETTING=VALUE"},
     };
     for (const Row& row : rows)
-        EXPECT_EQ(changeRefusal(row.words), row.complaint);
+        EXPECT_EQ(row.complaint, changeRefusal(row.words));
 }
 
 TEST(OverrideWords, RemovalsNameTheirThings) {
     const auto removals = cli::parseRemovals({"node", "5", "6", "baud", "modicon", "5", "mode"});
-    EXPECT_EQ(removals.nodes, (std::vector<int>{5, 6}));
-    EXPECT_EQ(removals.modicon, std::vector<int>{5});
-    ASSERT_EQ(removals.serial.size(), 2U);
-    EXPECT_EQ(removals.serial[0]->name, "baud");
-    EXPECT_EQ(removals.serial[1]->name, "mode");
+    EXPECT_EQ((std::vector<int>{5, 6}), removals.nodes);
+    EXPECT_EQ(std::vector<int>{5}, removals.modicon);
+    ASSERT_EQ(2U, removals.serial.size());
+    EXPECT_EQ("baud", removals.serial[0]->name);
+    EXPECT_EQ("mode", removals.serial[1]->name);
     EXPECT_FALSE(removals.all);
     EXPECT_TRUE(cli::parseRemovals({"all"}).all);
 }

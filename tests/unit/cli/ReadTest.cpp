@@ -43,16 +43,16 @@ constexpr const char* kEveryAreaText =
 
 TEST(Read, EveryAreaOfTheSimulatedLine) {
     const Outcome outcome = readWith({"--sim"}, kEveryArea);
-    EXPECT_EQ(outcome.out, kEveryAreaText);
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(kEveryAreaText, outcome.out);
+    EXPECT_EQ("", outcome.err);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 TEST(Read, TheSameInAsciiFrames) {
     const Outcome outcome = readWith({"--sim", "--ascii"}, kEveryArea);
-    EXPECT_EQ(outcome.out, kEveryAreaText);
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(kEveryAreaText, outcome.out);
+    EXPECT_EQ("", outcome.err);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 TEST(Read, TheSimulatorFollowsTheConfigurationFile) {
@@ -62,11 +62,12 @@ TEST(Read, TheSimulatorFollowsTheConfigurationFile) {
                         "parity=even bits=7 stopbits=1 mode=RS-485 Node30::model=3\n");
     const Outcome outcome = readWith({"--sim", "--config", file},
                                      {"20?HREG?400000?unsignedShort", "30?LONG?5001?unsignedInt"});
-    EXPECT_EQ(outcome.out,
-              "20?HREG?400000?unsignedShort = 20000\n"
-              "30?LONG?5001?unsignedInt = 3500205003\n");  // 100003 x 35001
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(
+        "20?HREG?400000?unsignedShort = 20000\n"
+        "30?LONG?5001?unsignedInt = 3500205003\n",
+        outcome.out);  // 100003 x 35001
+    EXPECT_EQ("", outcome.err);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 TEST(Read, ArraysLongerThanARequestComeWhole) {
@@ -74,14 +75,14 @@ TEST(Read, ArraysLongerThanARequestComeWhole) {
     std::string expected = "1?HREG?400001?unsignedShort-300 = 1000";
     for (int i = 1; i < 300; ++i)
         expected.append(",").append(std::to_string(1000 + i));
-    EXPECT_EQ(outcome.out, expected + "\n");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(expected + "\n", outcome.out);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 TEST(Read, FloatsAreShortAndExact) {
     // Registers 1009 and 1010 of node 1: 0x03F1 and 0x03F2, low word first.
     const Outcome outcome = readWith({"--sim"}, {"1?HREG?400010?float"});
-    EXPECT_EQ(outcome.out, "1?HREG?400010?float = 1.42243865e-36\n");
+    EXPECT_EQ("1?HREG?400010?float = 1.42243865e-36\n", outcome.out);
 }
 
 TEST(Read, AByteOrderCanBeNamed) {
@@ -91,27 +92,29 @@ TEST(Read, AByteOrderCanBeNamed) {
                              "1?HREG?400001?unsignedInt@DCBA", "1?HREG?400001?unsignedInt@BADC",
                              "1?HREG?400001?uint64@ABCDEFGH", "1?HREG?400001?string-4@AB",
                              "1?LONG?5000?unsignedInt@ABCD"});
-    EXPECT_EQ(outcome.out,
-              "1?HREG?400001?unsignedInt@ABCD = 65537001\n"
-              "1?HREG?400001?unsignedInt@CDAB = 65602536\n"
-              "1?HREG?400001?unsignedInt@DCBA = 3909347331\n"
-              "1?HREG?400001?unsignedInt@BADC = 3892570371\n"
-              "1?HREG?400001?uint64@ABCDEFGH = 281479276038587371\n"
-              "1?HREG?400001?string-4@AB = \"\\x03\\xe8\\x03\\xe9\"\n"
-              "1?LONG?5000?unsignedInt@ABCD = 600018000\n");
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(
+        "1?HREG?400001?unsignedInt@ABCD = 65537001\n"
+        "1?HREG?400001?unsignedInt@CDAB = 65602536\n"
+        "1?HREG?400001?unsignedInt@DCBA = 3909347331\n"
+        "1?HREG?400001?unsignedInt@BADC = 3892570371\n"
+        "1?HREG?400001?uint64@ABCDEFGH = 281479276038587371\n"
+        "1?HREG?400001?string-4@AB = \"\\x03\\xe8\\x03\\xe9\"\n"
+        "1?LONG?5000?unsignedInt@ABCD = 600018000\n",
+        outcome.out);
+    EXPECT_EQ("", outcome.err);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 TEST(Read, KeysThatTheDriverDoesNotKnowAreToldOnce) {
     const Outcome outcome = readWith({"--sim", "--set", "timout=5", "--set", "Node3::timout=5",
                                       "--set", "Node3::timeout=5", "--set", "wholly=1"},
                                      {"1?OUTP?3?boolean"});
-    EXPECT_EQ(outcome.err,
-              "mrtu: configuration: unknown key 'timout'; did you mean 'timeout'?\n"
-              "mrtu: configuration: unknown key 'wholly'; 'mrtu describe parameters' lists the "
-              "keys\n");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(
+        "mrtu: configuration: unknown key 'timout'; did you mean 'timeout'?\n"
+        "mrtu: configuration: unknown key 'wholly'; 'mrtu describe parameters' lists the "
+        "keys\n",
+        outcome.err);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 struct Failing {
@@ -156,9 +159,9 @@ const std::vector<std::string> kImpatient{"--sim", "--timeout", "100", "--set", 
 TEST(Read, EachFailureHasItsTextAndExitCode) {
     for (const Failing& row : kFailing) {
         const Outcome outcome = readWith(kImpatient, {row.uri});
-        EXPECT_EQ(outcome.out, "") << row.uri;
-        EXPECT_EQ(outcome.err, row.complaint);
-        EXPECT_EQ(outcome.exitCode, row.exitCode) << row.uri;
+        EXPECT_EQ("", outcome.out) << row.uri;
+        EXPECT_EQ(row.complaint, outcome.err);
+        EXPECT_EQ(row.exitCode, outcome.exitCode) << row.uri;
     }
 }
 
@@ -166,11 +169,11 @@ TEST(Read, AFailureDoesNotStopTheOthersAndTheFirstDecides) {
     const std::string good = "1?HREG?400001?unsignedShort";
     const Outcome noResponse =
         readWith(kImpatient, {good, "77?HREG?400001?int", "1?HREG?410001?int", good});
-    EXPECT_EQ(noResponse.out, good + " = 1000\n" + good + " = 1000\n");
-    EXPECT_EQ(noResponse.exitCode, 4);
+    EXPECT_EQ(good + " = 1000\n" + good + " = 1000\n", noResponse.out);
+    EXPECT_EQ(4, noResponse.exitCode);
     const Outcome exception =
         readWith(kImpatient, {"1?HREG?410001?int", "1?HREG?400001", "77?HREG?400001?int"});
-    EXPECT_EQ(exception.exitCode, 5);
+    EXPECT_EQ(5, exception.exitCode);
 }
 
 TEST(Read, JsonHoldsValuesAndErrors) {
@@ -178,12 +181,13 @@ TEST(Read, JsonHoldsValuesAndErrors) {
     options.push_back("--json");
     const Outcome outcome = readWith(
         options, {"1?HREG?400001?unsignedShort-2", "1?OUTP?3?boolean", "77?HREG?400001?int"});
-    EXPECT_EQ(nlohmann::json::parse(outcome.out), nlohmann::json::parse(R"([
+    EXPECT_EQ(nlohmann::json::parse(R"([
         {"uri": "1?HREG?400001?unsignedShort-2", "type": "unsignedShort-2", "value": [1000, 1001]},
         {"uri": "1?OUTP?3?boolean", "type": "boolean", "value": true},
-        {"uri": "77?HREG?400001?int", "error": {"code": -4, "text": "No response"}}])"));
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.exitCode, 4);
+        {"uri": "77?HREG?400001?int", "error": {"code": -4, "text": "No response"}}])"),
+              nlohmann::json::parse(outcome.out));
+    EXPECT_EQ("", outcome.err);
+    EXPECT_EQ(4, outcome.exitCode);
 }
 
 TEST(Read, TraceShowsEveryFrame) {
@@ -192,19 +196,19 @@ TEST(Read, TraceShowsEveryFrame) {
         << outcome.err;
     // CRC of 01 03 02 03 E8, computed apart from this project.
     EXPECT_NE(outcome.err.find(" com1 < 01 03 02 03 E8 B8 FA\n"), std::string::npos) << outcome.err;
-    EXPECT_EQ(outcome.out, "1?HREG?400001?unsignedShort = 1000\n");
+    EXPECT_EQ("1?HREG?400001?unsignedShort = 1000\n", outcome.out);
 }
 
 TEST(Read, APortIsNamedOrServesTheConfiguredOne) {
     const cli_test::RunningSim sim({});
     for (const std::string& port : {sim.device(), "com1=" + sim.device()}) {
         const Outcome outcome = readWith({"--port", port}, {"1?HREG?400001?unsignedShort"});
-        EXPECT_EQ(outcome.out, "1?HREG?400001?unsignedShort = 1000\n") << port;
-        EXPECT_EQ(outcome.exitCode, 0) << outcome.err;
+        EXPECT_EQ("1?HREG?400001?unsignedShort = 1000\n", outcome.out) << port;
+        EXPECT_EQ(0, outcome.exitCode) << outcome.err;
     }
     const Outcome other =
         readWith({"--set", "uart=com7", "--port", "com7=" + sim.device()}, {"1?OUTP?3?boolean"});
-    EXPECT_EQ(other.out, "1?OUTP?3?boolean = 1\n") << other.err;
+    EXPECT_EQ("1?OUTP?3?boolean = 1\n", other.out) << other.err;
 }
 
 }  // namespace

@@ -30,7 +30,7 @@ class EndSignal : public testing::TestWithParam<int> {
         own.c_iflag |= ICRNL | IXON;
         own.c_lflag |= ICANON | ECHO;
         own.c_cc[VMIN] = 7;
-        ASSERT_EQ(tcsetattr(terminal_.watch(), TCSANOW, &own), 0);
+        ASSERT_EQ(0, tcsetattr(terminal_.watch(), TCSANOW, &own));
         found_ = terminal_.settings();
     }
 
@@ -42,7 +42,7 @@ class EndSignal : public testing::TestWithParam<int> {
 
     /// Afterwards the port is open, set up, and the request sent.
     void waitForRequest() const {
-        ASSERT_EQ(terminal_.take(kRequestBytes).size(), kRequestBytes);
+        ASSERT_EQ(kRequestBytes, terminal_.take(kRequestBytes).size());
         ASSERT_FALSE(isAsFound());
     }
 
@@ -57,9 +57,9 @@ class EndSignal : public testing::TestWithParam<int> {
     void expectAsFound() const {
         EXPECT_TRUE(isAsFound());
         int exclusive = -1;
-        EXPECT_EQ(ioctl(terminal_.watch(), TIOCGEXCL, &exclusive), 0);
-        EXPECT_EQ(exclusive, 0);
-        EXPECT_EQ(flock(terminal_.watch(), LOCK_EX | LOCK_NB), 0);
+        EXPECT_EQ(0, ioctl(terminal_.watch(), TIOCGEXCL, &exclusive));
+        EXPECT_EQ(0, exclusive);
+        EXPECT_EQ(0, flock(terminal_.watch(), LOCK_EX | LOCK_NB));
     }
 
     PseudoTerminal terminal_;
@@ -76,8 +76,8 @@ TEST_P(EndSignal, EndsAWaitingReadAndPutsThePortBack) {
     waitForRequest();
     read.send(GetParam());
     const Outcome outcome = read.end();
-    EXPECT_EQ(outcome.exitCode, 128 + GetParam()) << outcome.err;
-    EXPECT_EQ(outcome.out + outcome.err, "");
+    EXPECT_EQ(128 + GetParam(), outcome.exitCode) << outcome.err;
+    EXPECT_EQ("", outcome.out + outcome.err);
     expectAsFound();
 }
 
@@ -90,7 +90,7 @@ TEST_P(EndSignal, EndsAWriteAndAConsoleCommand) {
         RunningCommand running(words(command));
         waitForRequest();
         running.send(GetParam());
-        EXPECT_EQ(running.end().exitCode, 128 + GetParam()) << command.front();
+        EXPECT_EQ(128 + GetParam(), running.end().exitCode) << command.front();
         expectAsFound();
         flock(terminal_.watch(), LOCK_UN);
     }
@@ -101,7 +101,7 @@ TEST_P(EndSignal, TwiceIsNoWorseThanOnce) {
     waitForRequest();
     for (int round = 0; round < 3; ++round)
         read.send(GetParam());
-    EXPECT_EQ(read.end().exitCode, 128 + GetParam());
+    EXPECT_EQ(128 + GetParam(), read.end().exitCode);
     expectAsFound();
 }
 
@@ -111,8 +111,8 @@ TEST_P(EndSignal, ThatWasIgnoredAtTheStartStaysIgnored) {
     read.send(GetParam());
     terminal_.put(kReply);
     const Outcome outcome = read.end();
-    EXPECT_EQ(outcome.out, std::string(kUri) + " = 1000\n") << outcome.err;
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(std::string(kUri) + " = 1000\n", outcome.out) << outcome.err;
+    EXPECT_EQ(0, outcome.exitCode);
     expectAsFound();
 }
 
@@ -122,18 +122,18 @@ TEST_P(EndSignal, PutsTheRs485ModeBack) {
                         {.environment = {{"LD_PRELOAD", RS485_TERMINAL}, {"RS485_LOG", log}}});
     waitForRequest();
     constexpr int kSending = SER_RS485_ENABLED | SER_RS485_RTS_ON_SEND;
-    EXPECT_EQ(cli_test::contentsOf(log), std::to_string(kSending) + "\n");
+    EXPECT_EQ(std::to_string(kSending) + "\n", cli_test::contentsOf(log));
     read.send(GetParam());
-    EXPECT_EQ(read.end().exitCode, 128 + GetParam());
-    EXPECT_EQ(cli_test::contentsOf(log),
-              std::to_string(kSending) + "\n" + std::to_string(SER_RS485_RTS_AFTER_SEND) + "\n");
+    EXPECT_EQ(128 + GetParam(), read.end().exitCode);
+    EXPECT_EQ(std::to_string(kSending) + "\n" + std::to_string(SER_RS485_RTS_AFTER_SEND) + "\n",
+              cli_test::contentsOf(log));
 }
 
 TEST_P(EndSignal, EndsAConsoleThatIsFedThroughAPipe) {
     RunningCommand console(words({"console"}), {.input = std::string("read ") + kUri + "\n"});
     waitForRequest();
     console.send(GetParam());
-    EXPECT_EQ(console.end().exitCode, 128 + GetParam());
+    EXPECT_EQ(128 + GetParam(), console.end().exitCode);
     expectAsFound();
 }
 
@@ -146,9 +146,9 @@ TEST_P(EndSignal, EndsATypedConsoleAndPutsItsTerminalBackToo) {
         "b");
     ASSERT_TRUE(console.shows("bc")) << console.screen();
     ASSERT_FALSE(isAsFound());
-    ASSERT_EQ(console.settings().c_lflag & ICANON, 0U);
+    ASSERT_EQ(0U, console.settings().c_lflag & ICANON);
     console.send(GetParam());
-    EXPECT_EQ(console.end(), 128 + GetParam()) << console.screen();
+    EXPECT_EQ(128 + GetParam(), console.end()) << console.screen();
     EXPECT_NE(console.settings().c_lflag & ICANON, 0U);
     EXPECT_NE(console.settings().c_lflag & ECHO, 0U);
     expectAsFound();
@@ -158,7 +158,7 @@ TEST_F(EndSignal, TypedAsControlCEndsTheConsole) {
     cli_test::TerminalSession console(words({"console"}));
     ASSERT_TRUE(console.shows("mrtu> ")) << console.screen();
     console.type("half a li\x03");
-    EXPECT_EQ(console.end(), 128 + SIGINT) << console.screen();
+    EXPECT_EQ(128 + SIGINT, console.end()) << console.screen();
     EXPECT_NE(console.settings().c_lflag & ICANON, 0U);
     expectAsFound();
 }

@@ -34,8 +34,8 @@ bool has(const std::string& text, const std::string& part) {
 
 void execute(const std::string& file, const char* sql) {
     sqlite3* database = nullptr;
-    ASSERT_EQ(sqlite3_open(file.c_str(), &database), SQLITE_OK);
-    EXPECT_EQ(sqlite3_exec(database, sql, nullptr, nullptr, nullptr), SQLITE_OK);
+    ASSERT_EQ(SQLITE_OK, sqlite3_open(file.c_str(), &database));
+    EXPECT_EQ(SQLITE_OK, sqlite3_exec(database, sql, nullptr, nullptr, nullptr));
     sqlite3_close(database);
 }
 
@@ -52,120 +52,124 @@ TEST(Storage, ThatIsDamagedIsNamedAndLeftAlone) {
         }
         words.insert(words.end(), {"--sim", "--storage", file});
         const Outcome outcome = mrtu(words);
-        EXPECT_EQ(outcome.exitCode, 1) << command;
-        EXPECT_EQ(outcome.out, "") << command;
+        EXPECT_EQ(1, outcome.exitCode) << command;
+        EXPECT_EQ("", outcome.out) << command;
         EXPECT_NE(outcome.err.find(file), std::string::npos) << outcome.err;
         EXPECT_NE(outcome.err.find("--storage none"), std::string::npos) << outcome.err;
-        EXPECT_EQ(contentsOf(file), garbage) << command;
+        EXPECT_EQ(garbage, contentsOf(file)) << command;
     }
 }
 
 TEST(Storage, ThatIsNotThereIsMadeByAChangeAlone) {
     const std::string folder = scratchFile("state");
     const std::string file = folder + "/overrides.db";
-    EXPECT_EQ(readWith(file).out, kOwnValue);
+    EXPECT_EQ(kOwnValue, readWith(file).out);
     const Outcome list = mrtu({"override", "list", "--sim", "--storage", file});
-    EXPECT_EQ(list.exitCode, 0) << list.err;
-    EXPECT_EQ(list.err, "");
-    EXPECT_EQ(mrtu({"override", "clear", "--storage", file, "all"}).exitCode, 0);
+    EXPECT_EQ(0, list.exitCode) << list.err;
+    EXPECT_EQ("", list.err);
+    EXPECT_EQ(0, mrtu({"override", "clear", "--storage", file, "all"}).exitCode);
     EXPECT_FALSE(std::filesystem::exists(folder));
-    EXPECT_EQ(setOn(file, "5=7").out, "node 5 = 7 (stored)\n");
-    EXPECT_EQ(readWith(file).out, kOverriddenValue);
+    EXPECT_EQ("node 5 = 7 (stored)\n", setOn(file, "5=7").out);
+    EXPECT_EQ(kOverriddenValue, readWith(file).out);
 }
 
 TEST(Storage, ThatCannotBeMadeStopsChangesAlone) {
     const std::string file = "/dev/null/x.db";
     const Outcome read = readWith(file);
-    EXPECT_EQ(read.out, kOwnValue);
-    EXPECT_EQ(read.err, "mrtu: overrides are not kept: " + file +
-                            ": cannot make /dev/null: Not a directory; --storage none does "
-                            "without\n");
-    EXPECT_EQ(read.exitCode, 0);
+    EXPECT_EQ(kOwnValue, read.out);
+    EXPECT_EQ("mrtu: overrides are not kept: " + file +
+                  ": cannot make /dev/null: Not a directory; --storage none does "
+                  "without\n",
+              read.err);
+    EXPECT_EQ(0, read.exitCode);
     const Outcome set = setOn(file, "5=7");
-    EXPECT_EQ(set.err, "mrtu: overrides are not kept: " + file +
-                           ": cannot make /dev/null: Not a directory\n");
-    EXPECT_EQ(set.exitCode, 1);
+    EXPECT_EQ(
+        "mrtu: overrides are not kept: " + file + ": cannot make /dev/null: Not a directory\n",
+        set.err);
+    EXPECT_EQ(1, set.exitCode);
 }
 
 TEST(Storage, WithoutAHomeStopsChangesAlone) {
     const RunOptions homeless{.unset = {"HOME", "XDG_STATE_HOME"}};
     const cli_test::RunningSim sim({});
     const Outcome read = mrtu({"read", "--port", sim.device(), kUri}, homeless);
-    EXPECT_EQ(read.out, kOwnValue);
-    EXPECT_EQ(read.err,
-              "mrtu: overrides are not kept: HOME is not set; --storage FILE names one; "
-              "--storage none does without\n");
-    EXPECT_EQ(read.exitCode, 0);
+    EXPECT_EQ(kOwnValue, read.out);
+    EXPECT_EQ(
+        "mrtu: overrides are not kept: HOME is not set; --storage FILE names one; "
+        "--storage none does without\n",
+        read.err);
+    EXPECT_EQ(0, read.exitCode);
     const Outcome set = mrtu({"override", "set", "--port", sim.device(), "node", "5=7"}, homeless);
     EXPECT_TRUE(has(set.err, "HOME is not set")) << set.err;
-    EXPECT_EQ(set.exitCode, 1);
+    EXPECT_EQ(1, set.exitCode);
 }
 
 TEST(Storage, OnAFullDiskIsReadAndNotChanged) {
     const std::string file = scratchFile("full.db");
-    ASSERT_EQ(setOn(file, "5=7").exitCode, 0);
+    ASSERT_EQ(0, setOn(file, "5=7").exitCode);
     const RunOptions full{.diskFull = true};
     const Outcome read = readWith(file, full);
-    EXPECT_EQ(read.out, kOverriddenValue);
+    EXPECT_EQ(kOverriddenValue, read.out);
     EXPECT_TRUE(has(read.err, file + ": overrides can only be read (")) << read.err;
     EXPECT_TRUE(has(read.err, "--storage none")) << read.err;
-    EXPECT_EQ(read.exitCode, 0);
+    EXPECT_EQ(0, read.exitCode);
     const Outcome set = setOn(file, "5=9", full);
-    EXPECT_EQ(set.exitCode, 1);
+    EXPECT_EQ(1, set.exitCode);
     EXPECT_TRUE(has(set.err, "storage: " + file)) << set.err;
-    EXPECT_EQ(readWith(file).out, kOverriddenValue);
+    EXPECT_EQ(kOverriddenValue, readWith(file).out);
     const std::string missing = scratchFile("none.db");
-    EXPECT_EQ(readWith(missing, full).out, kOwnValue);
-    EXPECT_EQ(setOn(missing, "5=9", full).exitCode, 1);
-    EXPECT_EQ(readWith(missing).out, kOwnValue);
+    EXPECT_EQ(kOwnValue, readWith(missing, full).out);
+    EXPECT_EQ(1, setOn(missing, "5=9", full).exitCode);
+    EXPECT_EQ(kOwnValue, readWith(missing).out);
 }
 
 TEST(Storage, ThatMayOnlyBeReadIsReadWithAWarning) {
     const std::string file = scratchFile("readonly.db");
-    ASSERT_EQ(setOn(file, "5=7").exitCode, 0);
-    ASSERT_EQ(chmod(file.c_str(), 0444), 0);
+    ASSERT_EQ(0, setOn(file, "5=7").exitCode);
+    ASSERT_EQ(0, chmod(file.c_str(), 0444));
     const Outcome read = readWith(file);
-    EXPECT_EQ(read.out, kOverriddenValue);
+    EXPECT_EQ(kOverriddenValue, read.out);
     EXPECT_TRUE(has(read.err, "mrtu: " + file +
                                   ": overrides can only be read (write-protected); --storage none "
                                   "does without\n"))
         << read.err;
-    EXPECT_EQ(read.exitCode, 0);
-    EXPECT_EQ(setOn(file, "5=9").exitCode, 1);
+    EXPECT_EQ(0, read.exitCode);
+    EXPECT_EQ(1, setOn(file, "5=9").exitCode);
 }
 
 TEST(Storage, ThatLacksItsLastByteIsRefused) {
     const std::string file = scratchFile("short.db");
-    ASSERT_EQ(setOn(file, "5=7").exitCode, 0);
+    ASSERT_EQ(0, setOn(file, "5=7").exitCode);
     std::filesystem::resize_file(file, std::filesystem::file_size(file) - 1);
     const Outcome read = readWith(file);
-    EXPECT_EQ(read.out, "");
+    EXPECT_EQ("", read.out);
     EXPECT_TRUE(has(read.err, file + ": damaged")) << read.err;
-    EXPECT_EQ(read.exitCode, 1);
+    EXPECT_EQ(1, read.exitCode);
     EXPECT_FALSE(std::filesystem::exists(file + "-wal"));
     EXPECT_FALSE(std::filesystem::exists(file + "-shm"));
 }
 
 TEST(Storage, WithAnAlteredValueReportsItAndDoesNotUseIt) {
     const std::string file = scratchFile("altered.db");
-    ASSERT_EQ(setOn(file, "5=7").exitCode, 0);
+    ASSERT_EQ(0, setOn(file, "5=7").exitCode);
     execute(file, "UPDATE settings SET value='9'");
     const Outcome read = readWith(file);
-    EXPECT_EQ(read.out, kOwnValue);
-    EXPECT_EQ(read.err,
-              "mrtu: stored override tempNode5 is not used: altered since it was written\n"
-              "mrtu: 'mrtu override clear' takes out what is not used\n");
-    EXPECT_EQ(read.exitCode, 0);
-    EXPECT_EQ(mrtu({"override", "clear", "--storage", file, "all"}).exitCode, 0);
-    EXPECT_EQ(readWith(file).err, "");
+    EXPECT_EQ(kOwnValue, read.out);
+    EXPECT_EQ(
+        "mrtu: stored override tempNode5 is not used: altered since it was written\n"
+        "mrtu: 'mrtu override clear' takes out what is not used\n",
+        read.err);
+    EXPECT_EQ(0, read.exitCode);
+    EXPECT_EQ(0, mrtu({"override", "clear", "--storage", file, "all"}).exitCode);
+    EXPECT_EQ("", readWith(file).err);
 }
 
 TEST(Storage, WithAnOverrideOutOfRangeReportsItAndDoesNotUseIt) {
     const std::string file = scratchFile("range.db");
     const Outcome console = mrtu({"console", "--sim", "--storage", file, "setid", "5", "300"});
-    ASSERT_EQ(console.out, "id 5 set to 300\n");
+    ASSERT_EQ("id 5 set to 300\n", console.out);
     const Outcome read = readWith(file);
-    EXPECT_EQ(read.out, kOwnValue);
+    EXPECT_EQ(kOwnValue, read.out);
     EXPECT_TRUE(has(read.err,
                     "mrtu: stored override tempNode5 is not used: '300' is no address from 0 to "
                     "255\n"))

@@ -18,7 +18,7 @@ void expectComplaints(const std::string& err) {
     std::istringstream lines(err);
     int count = 0;
     for (std::string line; std::getline(lines, line); ++count)
-        EXPECT_EQ(line.rfind("mrtu: ", 0), 0U) << line;
+        EXPECT_EQ(0U, line.rfind("mrtu: ", 0)) << line;
     EXPECT_GT(count, 0);
 }
 
@@ -45,8 +45,8 @@ TEST(Usage, WrongCommandLinesExitWithTwo) {
     for (const auto& words : rows) {
         const Outcome outcome = mrtu(words);
         const std::string last = words.empty() ? "nothing" : words.back();
-        EXPECT_EQ(outcome.exitCode, 2) << last;
-        EXPECT_EQ(outcome.out, "") << last;
+        EXPECT_EQ(2, outcome.exitCode) << last;
+        EXPECT_EQ("", outcome.out) << last;
         expectComplaints(outcome.err);
     }
 }
@@ -84,9 +84,9 @@ TEST(Usage, WhatIsUnknownIsAnsweredWithWhatIsAccepted) {
     };
     for (const auto& row : rows) {
         const Outcome outcome = mrtu(row.words);
-        EXPECT_EQ(outcome.err, std::string("mrtu: ") + row.answer + '\n');
-        EXPECT_EQ(outcome.out, "") << row.answer;
-        EXPECT_EQ(outcome.exitCode, 2) << row.answer;
+        EXPECT_EQ(std::string("mrtu: ") + row.answer + '\n', outcome.err);
+        EXPECT_EQ("", outcome.out) << row.answer;
+        EXPECT_EQ(2, outcome.exitCode) << row.answer;
     }
 }
 
@@ -95,14 +95,14 @@ TEST(Usage, ShortFormsRefuseWhatTheDriverWouldTakeForSomethingElse) {
          {"--baud", "--parity", "--stopbits", "--node", "--model", "--timeout"}) {
         for (const char* const value : {"abc", "", "0x10", "999999999999", "-1"}) {
             const Outcome outcome = mrtu({"read", "--sim", option, value, kUri});
-            EXPECT_EQ(outcome.exitCode, 2) << option << ' ' << value;
-            EXPECT_EQ(outcome.err.rfind(std::string("mrtu: ") + option, 0), 0U) << outcome.err;
+            EXPECT_EQ(2, outcome.exitCode) << option << ' ' << value;
+            EXPECT_EQ(0U, outcome.err.rfind(std::string("mrtu: ") + option, 0)) << outcome.err;
         }
     }
-    EXPECT_EQ(mrtu({"read", "--sim", "--baud", "0", kUri}).exitCode, 2);
+    EXPECT_EQ(2, mrtu({"read", "--sim", "--baud", "0", kUri}).exitCode);
     // The driver alone would read 010 as 8.
-    EXPECT_EQ(mrtu({"console", "--timeout", "010", "--set", "repeat=2", "getmaxtm"}).out,
-              "maxtm = 20 ms\n");
+    EXPECT_EQ("maxtm = 20 ms\n",
+              mrtu({"console", "--timeout", "010", "--set", "repeat=2", "getmaxtm"}).out);
 }
 
 TEST(Usage, WithJsonEveryFailureIsJson) {
@@ -134,11 +134,11 @@ TEST(Usage, WithJsonEveryFailureIsJson) {
         const auto document = nlohmann::json::parse(outcome.out, nullptr, false);
         EXPECT_FALSE(document.is_discarded()) << first << ": " << outcome.out;
         if (!document.is_object() || !document.contains("errors")) continue;
-        EXPECT_EQ(document["exitCode"], outcome.exitCode) << first;
+        EXPECT_EQ(outcome.exitCode, document["exitCode"]) << first;
         std::string complaints;
         for (const auto& each : document["errors"])
             complaints += "mrtu: " + each.get<std::string>() + '\n';
-        EXPECT_EQ(complaints, outcome.err) << first;
+        EXPECT_EQ(outcome.err, complaints) << first;
         expectComplaints(outcome.err);
     }
 }
@@ -170,19 +170,19 @@ TEST(Usage, EveryCommandExplainsItselfWithExamples) {
     for (const char* const command :
          {"read", "write", "console", "override", "info", "describe", "check", "inspect", "sim"}) {
         const Outcome outcome = mrtu({command, "--help"});
-        EXPECT_EQ(outcome.exitCode, 0) << command;
+        EXPECT_EQ(0, outcome.exitCode) << command;
         EXPECT_NE(outcome.out.find("Examples:\n  mrtu " + std::string(command)), std::string::npos)
             << outcome.out;
     }
     const Outcome outcome = mrtu({"--help"});
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(0, outcome.exitCode);
     EXPECT_NE(outcome.out.find("Exit codes:"), std::string::npos);
 }
 
 TEST(Usage, VersionIsTheProjects) {
     const Outcome outcome = mrtu({"--version"});
-    EXPECT_EQ(outcome.out, "mrtu " MRTU_VERSION "\n");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ("mrtu " MRTU_VERSION "\n", outcome.out);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 TEST(Configuration, ThatTheDriverRefusesIsAUsageError) {
@@ -205,38 +205,39 @@ TEST(Configuration, ThatTheDriverRefusesIsAUsageError) {
     for (const auto& row : rows) {
         cli_test::writeFile(file, row.text);
         const Outcome outcome = mrtu({"read", "--sim", "--config", file, kUri});
-        EXPECT_EQ(outcome.err, "mrtu: configuration: " + std::string(row.complaint) + "\n");
-        EXPECT_EQ(outcome.exitCode, 2) << row.text;
+        EXPECT_EQ("mrtu: configuration: " + std::string(row.complaint) + "\n", outcome.err);
+        EXPECT_EQ(2, outcome.exitCode) << row.text;
     }
 }
 
 TEST(Configuration, ThatCannotBeReadIsAUsageError) {
     const std::string missing = cli_test::scratchFolder() + "/none.cfg";
     const Outcome outcome = mrtu({"read", "--sim", "--config", missing, kUri});
-    EXPECT_EQ(outcome.err, "mrtu: configuration " + missing + ": No such file or directory\n");
-    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ("mrtu: configuration " + missing + ": No such file or directory\n", outcome.err);
+    EXPECT_EQ(2, outcome.exitCode);
 }
 
 TEST(Info, TellsWhatTheDriverSaysOfItself) {
     const Outcome outcome = mrtu({"info", "--plugin", MRTU_PLUGIN});
-    EXPECT_EQ(outcome.out, "plug-in        " MRTU_PLUGIN
-                           "\n"
-                           "name           MRTU\n"
-                           "display name   Modbus RTU\n"
-                           "type           184\n"
-                           "version        126\n"
-                           "implementation Protocol_MRTU v.100\n"
-                           "generation     IProtocol7\n"
-                           "description    compressedXML=2224\n"
-                           "\n"
-                           "Protocol: MRTU (184) v.126\n"
-                           "Implementation: Protocol_MRTU v.100\n"
-                           "ProtocolBase v.100\n"
-                           "ProtLib v.200\n"
-                           "runtime::PosixMultiTask v.100\n"
-                           "runtime::PosixSerialFactory v.100\n"
-                           "runtime::Sockets v.100\n");
-    EXPECT_EQ(outcome.exitCode, 0) << outcome.err;
+    EXPECT_EQ("plug-in        " MRTU_PLUGIN
+              "\n"
+              "name           MRTU\n"
+              "display name   Modbus RTU\n"
+              "type           184\n"
+              "version        126\n"
+              "implementation Protocol_MRTU v.100\n"
+              "generation     IProtocol7\n"
+              "description    compressedXML=2224\n"
+              "\n"
+              "Protocol: MRTU (184) v.126\n"
+              "Implementation: Protocol_MRTU v.100\n"
+              "ProtocolBase v.100\n"
+              "ProtLib v.200\n"
+              "runtime::PosixMultiTask v.100\n"
+              "runtime::PosixSerialFactory v.100\n"
+              "runtime::Sockets v.100\n",
+              outcome.out);
+    EXPECT_EQ(0, outcome.exitCode) << outcome.err;
 }
 
 }  // namespace

@@ -54,20 +54,20 @@ TEST(Write, EveryTypeIsReadBackAsItWasWritten) {
         const std::size_t equals = assignment.find('=');
         expected += assignment.substr(0, equals) + " = " + assignment.substr(equals + 1) + '\n';
     }
-    EXPECT_EQ(outcome.out, expected);
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(expected, outcome.out);
+    EXPECT_EQ("", outcome.err);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 TEST(Write, TheDeviceHoldsItAfterwards) {
     const RunningSim sim({});
     const Outcome written = mrtu(
         {"write", "--port", sim.device(), "1?HREG?400001?short=0x7f", "1?OUTP?1?boolean=true"});
-    EXPECT_EQ(written.out, "1?HREG?400001?short = 127\n1?OUTP?1?boolean = 1\n");
-    EXPECT_EQ(written.exitCode, 0) << written.err;
+    EXPECT_EQ("1?HREG?400001?short = 127\n1?OUTP?1?boolean = 1\n", written.out);
+    EXPECT_EQ(0, written.exitCode) << written.err;
     const Outcome read =
         mrtu({"read", "--port", sim.device(), "1?HREG?400001?short", "1?OUTP?1?boolean"});
-    EXPECT_EQ(read.out, "1?HREG?400001?short = 127\n1?OUTP?1?boolean = 1\n") << read.err;
+    EXPECT_EQ("1?HREG?400001?short = 127\n1?OUTP?1?boolean = 1\n", read.out) << read.err;
 }
 
 TEST(Write, OneWrongAssignmentAndNothingIsSent) {
@@ -89,9 +89,9 @@ TEST(Write, OneWrongAssignmentAndNothingIsSent) {
     };
     for (const auto& row : rows) {
         const Outcome outcome = mrtu({"write", "--sim", "--trace", good, row.wrong});
-        EXPECT_EQ(outcome.err, std::string(row.complaint) + "mrtu: nothing was sent\n");
-        EXPECT_EQ(outcome.out, "") << row.wrong;
-        EXPECT_EQ(outcome.exitCode, 2) << row.wrong;
+        EXPECT_EQ(std::string(row.complaint) + "mrtu: nothing was sent\n", outcome.err);
+        EXPECT_EQ("", outcome.out) << row.wrong;
+        EXPECT_EQ(2, outcome.exitCode) << row.wrong;
     }
     EXPECT_TRUE(sentAnything(mrtu({"write", "--sim", "--trace", good})));
 }
@@ -100,11 +100,12 @@ TEST(Write, AFailureDoesNotStopTheOthers) {
     const Outcome outcome =
         mrtu({"write", "--sim", "--timeout", "100", "--set", "repeat=0", "1?HREG?410001?short=1",
               "77?HREG?400001?short=1", "1?HREG?400001?short=1"});
-    EXPECT_EQ(outcome.out, "1?HREG?400001?short = 1\n");
-    EXPECT_EQ(outcome.err,
-              "mrtu: 1?HREG?410001?short: error -6: Exception: Illegal data address\n"
-              "mrtu: 77?HREG?400001?short: error -4: No response\n");
-    EXPECT_EQ(outcome.exitCode, 5);
+    EXPECT_EQ("1?HREG?400001?short = 1\n", outcome.out);
+    EXPECT_EQ(
+        "mrtu: 1?HREG?410001?short: error -6: Exception: Illegal data address\n"
+        "mrtu: 77?HREG?400001?short: error -4: No response\n",
+        outcome.err);
+    EXPECT_EQ(5, outcome.exitCode);
 }
 
 TEST(Write, VerifyNoticesADeviceThatHoldsSomethingElse) {
@@ -112,9 +113,9 @@ TEST(Write, VerifyNoticesADeviceThatHoldsSomethingElse) {
     const RunningSim sim({"--fault", "delay=1", "--fault", "send=01030200063846"});
     const Outcome outcome =
         mrtu({"write", "--port", sim.device(), "--verify", "1?HREG?400001?short=5"});
-    EXPECT_EQ(outcome.err, "mrtu: 1?HREG?400001?short: error 0: wrote 5 but read back 6\n");
-    EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.exitCode, 1);
+    EXPECT_EQ("mrtu: 1?HREG?400001?short: error 0: wrote 5 but read back 6\n", outcome.err);
+    EXPECT_EQ("", outcome.out);
+    EXPECT_EQ(1, outcome.exitCode);
 }
 
 TEST(Write, TheConfiguredFunctionIsUsed) {
@@ -122,7 +123,7 @@ TEST(Write, TheConfiguredFunctionIsUsed) {
         mrtu({"write", "--sim", "--trace", "--set", "presetFunction=06", "1?HREG?400001?short=7"});
     EXPECT_NE(outcome.err.find(" com1 > 01 06 00 00 00 07 C8 08\n"), std::string::npos)
         << outcome.err;
-    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 // Function 5 writes one coil, and of an array the driver sends each the first eight's values.
@@ -131,10 +132,10 @@ TEST(Write, AnArrayOfCoilsGoesCoilByCoilWithFunctionFive) {
     for (const char* const key : {"forceFunction=05", "Node1::forceFunction=5"}) {
         const Outcome written = mrtu({"write", "--port", sim.device(), "--trace", "--set", key,
                                       "1?OUTP?6?boolean-12=1,0,1,1,0,1,1,0,0,1,0,1"});
-        EXPECT_EQ(written.exitCode, 0) << written.err;
+        EXPECT_EQ(0, written.exitCode) << written.err;
         EXPECT_NE(written.err.find(" com1 > 01 05 00 10 FF 00 "), std::string::npos) << written.err;
         const Outcome read = mrtu({"read", "--port", sim.device(), "1?OUTP?6?boolean-12"});
-        EXPECT_EQ(read.out, "1?OUTP?6?boolean-12 = 1,0,1,1,0,1,1,0,0,1,0,1\n") << key;
+        EXPECT_EQ("1?OUTP?6?boolean-12 = 1,0,1,1,0,1,1,0,0,1,0,1\n", read.out) << key;
         mrtu({"write", "--port", sim.device(), "1?OUTP?6?boolean-12=0,0,0,0,0,0,0,0,0,0,0,0"});
     }
 }
@@ -142,12 +143,13 @@ TEST(Write, AnArrayOfCoilsGoesCoilByCoilWithFunctionFive) {
 TEST(Write, AnArrayThatBreaksOffTellsWhatWasWritten) {
     const Outcome outcome = mrtu({"write", "--sim", "--set", "forceFunction=05",
                                   "1?OUTP?9999?boolean-4=1,1,1,1", "1?OUTP?10001?boolean-2=1,1"});
-    EXPECT_EQ(outcome.err,
-              "mrtu: 1?OUTP?9999?boolean-4: error -6: Exception: Illegal data address (the first 2 "
-              "coils were written)\n"
-              "mrtu: 1?OUTP?10001?boolean-2: error -6: Exception: Illegal data address\n");
-    EXPECT_EQ(outcome.out, "");
-    EXPECT_EQ(outcome.exitCode, 5);
+    EXPECT_EQ(
+        "mrtu: 1?OUTP?9999?boolean-4: error -6: Exception: Illegal data address (the first 2 "
+        "coils were written)\n"
+        "mrtu: 1?OUTP?10001?boolean-2: error -6: Exception: Illegal data address\n",
+        outcome.err);
+    EXPECT_EQ("", outcome.out);
+    EXPECT_EQ(5, outcome.exitCode);
 }
 
 const std::vector<std::string> kBriefly{"write", "--sim", "--timeout", "20", "--set", "repeat=0"};
@@ -156,16 +158,16 @@ TEST(Write, ABroadcastExpectsNoAnswer) {
     std::vector<std::string> words = kBriefly;
     words.push_back("0?HREG?400001?short=5");
     const Outcome text = mrtu(words);
-    EXPECT_EQ(text.out, "0?HREG?400001?short = 5\n");
-    EXPECT_EQ(text.err, "mrtu: 0?HREG?400001?short: a broadcast: no answer is expected\n");
-    EXPECT_EQ(text.exitCode, 0);
+    EXPECT_EQ("0?HREG?400001?short = 5\n", text.out);
+    EXPECT_EQ("mrtu: 0?HREG?400001?short: a broadcast: no answer is expected\n", text.err);
+    EXPECT_EQ(0, text.exitCode);
     words.push_back("--json");
-    EXPECT_EQ(nlohmann::json::parse(mrtu(words).out),
-              nlohmann::json::parse(R"([{"uri": "0?HREG?400001?short", "type": "short", "value": 5,
-                                         "broadcast": true}])"));
+    EXPECT_EQ(nlohmann::json::parse(R"([{"uri": "0?HREG?400001?short", "type": "short", "value": 5,
+                                         "broadcast": true}])"),
+              nlohmann::json::parse(mrtu(words).out));
     words.push_back("--verify");
     const Outcome verified = mrtu(words);
-    EXPECT_EQ(verified.exitCode, 2);
+    EXPECT_EQ(2, verified.exitCode);
     EXPECT_NE(verified.err.find("a broadcast can't be read back"), std::string::npos)
         << verified.err;
 }
@@ -192,7 +194,7 @@ TEST(Write, ABroadcastOfSeveralRequestsIsRefused) {
         words.insert(words.end(), row.options.begin(), row.options.end());
         words.push_back(row.assignment);
         const Outcome outcome = mrtu(words);
-        EXPECT_EQ(outcome.exitCode, row.exitCode) << row.assignment << outcome.err;
+        EXPECT_EQ(row.exitCode, outcome.exitCode) << row.assignment << outcome.err;
         if (row.exitCode == 0) continue;
         EXPECT_NE(outcome.err.find("a broadcast must fit into one request"), std::string::npos)
             << outcome.err;
@@ -205,7 +207,7 @@ TEST(Write, AnOverrideToZeroMakesABroadcastOfIt) {
     std::vector<std::string> words = kBriefly;
     words.insert(words.end(), {"--storage", storage, "5?HREG?400001?short=5"});
     const Outcome outcome = mrtu(words);
-    EXPECT_EQ(outcome.out, "5?HREG?400001?short = 5\n");
+    EXPECT_EQ("5?HREG?400001?short = 5\n", outcome.out);
     EXPECT_NE(outcome.err.find("a broadcast: no answer is expected\n"), std::string::npos);
     words.push_back("5?HREG?400001?short-200=1" + [] {
         std::string more;
@@ -214,34 +216,34 @@ TEST(Write, AnOverrideToZeroMakesABroadcastOfIt) {
         return more;
     }());
     const Outcome tooLong = mrtu(words);
-    EXPECT_EQ(tooLong.exitCode, 4);
+    EXPECT_EQ(4, tooLong.exitCode);
     EXPECT_NE(tooLong.err.find("short-200: error -4: No response\n"), std::string::npos);
     words.push_back("--verify");
-    EXPECT_EQ(mrtu(words).exitCode, 4);
+    EXPECT_EQ(4, mrtu(words).exitCode);
 }
 
 TEST(Write, WhatIsRefusedIsJsonToo) {
     const Outcome outcome = mrtu({"write", "--sim", "--json", "1?HREG?400002?short=x"});
     const auto document = nlohmann::json::parse(outcome.out);
-    EXPECT_EQ(document["exitCode"], 2);
-    EXPECT_EQ(document["errors"],
-              (std::vector<std::string>{"1?HREG?400002?short: 'x' is no whole number (short)",
-                                        "nothing was sent"}));
-    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ(2, document["exitCode"]);
+    EXPECT_EQ((std::vector<std::string>{"1?HREG?400002?short: 'x' is no whole number (short)",
+                                        "nothing was sent"}),
+              document["errors"]);
+    EXPECT_EQ(2, outcome.exitCode);
 }
 
 TEST(Write, AValueThatTheDriversOwnAreaRefusesIsAFailure) {
     const Outcome outcome = mrtu({"write", "--sim", "1?SP_Stop?0?unsignedByte=7"});
-    EXPECT_EQ(outcome.err, "mrtu: 1?SP_Stop?0?unsignedByte: error 1: refused\n");
-    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ("mrtu: 1?SP_Stop?0?unsignedByte: error 1: refused\n", outcome.err);
+    EXPECT_EQ(2, outcome.exitCode);
 }
 
 TEST(Write, JsonTellsWhatWasWritten) {
     const Outcome outcome = mrtu({"write", "--sim", "--json", "1?HREG?400001?short=-5"});
     EXPECT_EQ(
-        nlohmann::json::parse(outcome.out),
-        nlohmann::json::parse(R"([{"uri": "1?HREG?400001?short", "type": "short", "value": -5}])"));
-    EXPECT_EQ(outcome.exitCode, 0);
+        nlohmann::json::parse(R"([{"uri": "1?HREG?400001?short", "type": "short", "value": -5}])"),
+        nlohmann::json::parse(outcome.out));
+    EXPECT_EQ(0, outcome.exitCode);
 }
 
 }  // namespace
