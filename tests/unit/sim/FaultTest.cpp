@@ -14,7 +14,7 @@ Bytes sentWith(const Fault& fault) {
     return transmit(Mode::rtu, kReply, fault).bytes;
 }
 
-TEST(TransmitTest, WithoutFaultTheFrameGoesOutInOne) {
+TEST(FaultTest, WithoutFaultTheFrameGoesOutInOne) {
     const Transmission sent = transmit(Mode::rtu, kReply, Fault{});
     EXPECT_EQ(kFrame, sent.bytes);
     EXPECT_EQ(0U, sent.delayMs);
@@ -22,33 +22,33 @@ TEST(TransmitTest, WithoutFaultTheFrameGoesOutInOne) {
     EXPECT_FALSE(sent.hangUp);
 }
 
-TEST(TransmitTest, WrongCheckSpoilsTheCheckOnly) {
+TEST(FaultTest, WrongCheckSpoilsTheCheckOnly) {
     EXPECT_EQ((Bytes{0x02, 0x07, 0xBE, 0xED}), sentWith({.wrongCheck = true}));
     const Bytes ascii = transmit(Mode::ascii, kReply, {.wrongCheck = true}).bytes;
     EXPECT_EQ(":020708\r\n", std::string(ascii.begin(), ascii.end()));
 }
 
-TEST(TransmitTest, WrongNodeHasARightCheck) {
+TEST(FaultTest, WrongNodeHasARightCheck) {
     EXPECT_EQ((Bytes{0x03, 0x07, 0x40, 0x82}), sentWith({.wrongNode = true}));
     const Bytes ascii = transmit(Mode::ascii, kReply, {.wrongNode = true}).bytes;
     EXPECT_EQ(":0307F6\r\n", std::string(ascii.begin(), ascii.end()));
 }
 
-TEST(TransmitTest, KeepCutsTheEnd) {
+TEST(FaultTest, KeepCutsTheEnd) {
     EXPECT_EQ(Bytes{}, sentWith({.keep = 0}));
     EXPECT_EQ((Bytes{0x02, 0x07, 0x41}), sentWith({.keep = 3}));
     EXPECT_EQ(kFrame, sentWith({.keep = 99}));
 }
 
-TEST(TransmitTest, NoiseComesBeforeAndDoesNotCountForKeep) {
+TEST(FaultTest, NoiseComesBeforeAndDoesNotCountForKeep) {
     EXPECT_EQ((Bytes{0x00, 0xFF, 0x02, 0x07}), sentWith({.keep = 2, .noise = {0x00, 0xFF}}));
 }
 
-TEST(TransmitTest, ReplacementIsSentAsItIs) {
+TEST(FaultTest, ReplacementIsSentAsItIs) {
     EXPECT_EQ((Bytes{1, 2, 3}), sentWith({.wrongCheck = true, .replacement = Bytes{1, 2, 3}}));
 }
 
-TEST(TransmitTest, TimesArePassedOn) {
+TEST(FaultTest, TimesArePassedOn) {
     const Transmission sent =
         transmit(Mode::rtu, kReply, {.delayMs = 200, .dripBytes = 2, .dripGapMs = 50});
     EXPECT_EQ(kFrame, sent.bytes);
@@ -57,14 +57,14 @@ TEST(TransmitTest, TimesArePassedOn) {
     EXPECT_EQ(50U, sent.dripGapMs);
 }
 
-TEST(TransmitTest, HangUpSendsWhatIsKeptOrNothing) {
+TEST(FaultTest, HangUpSendsWhatIsKeptOrNothing) {
     const Transmission silent = transmit(Mode::rtu, kReply, {.hangUp = true});
     EXPECT_TRUE(silent.hangUp);
     EXPECT_TRUE(silent.bytes.empty());
     EXPECT_EQ(Bytes{0x02}, sentWith({.keep = 1, .hangUp = true}));
 }
 
-TEST(FaultQueueTest, FaultsComeDueInOrderAndCountDown) {
+TEST(FaultTest, QueueFaultsComeDueInOrderAndCountDown) {
     FaultQueue queue;
     queue.add({.times = 2, .silent = true});
     queue.add({.wrongNode = true});
@@ -75,7 +75,7 @@ TEST(FaultQueueTest, FaultsComeDueInOrderAndCountDown) {
     EXPECT_FALSE(queue.take(1));
 }
 
-TEST(FaultQueueTest, AFaultForOneNodeLetsTheOthersPass) {
+TEST(FaultTest, QueueAFaultForOneNodeLetsTheOthersPass) {
     FaultQueue queue;
     queue.add({.node = 2, .silent = true});
     EXPECT_FALSE(queue.take(1));
@@ -83,14 +83,14 @@ TEST(FaultQueueTest, AFaultForOneNodeLetsTheOthersPass) {
     EXPECT_FALSE(queue.take(2));
 }
 
-TEST(FaultQueueTest, AFaultForNobodyIsNotKept) {
+TEST(FaultTest, QueueAFaultForNobodyIsNotKept) {
     FaultQueue queue;
     queue.add({.times = 0, .silent = true});
     queue.add({.times = -1, .silent = true});
     EXPECT_TRUE(queue.empty());
 }
 
-TEST(FaultQueueTest, ClearForgetsAll) {
+TEST(FaultTest, QueueClearForgetsAll) {
     FaultQueue queue;
     queue.add({.times = 5, .silent = true});
     queue.clear();

@@ -10,7 +10,7 @@ struct TextCase {
     Fault fault;
 };
 
-TEST(ParseFaultTest, ReadsEveryPart) {
+TEST(FaultTextTest, ReadsEveryPart) {
     for (const TextCase& each : {
              TextCase{"silent", {.silent = true}},
              TextCase{"silent,times=3", {.times = 3, .silent = true}},
@@ -33,7 +33,7 @@ TEST(ParseFaultTest, ReadsEveryPart) {
     }
 }
 
-TEST(ParseFaultTest, RefusesWithThePartInTheMessage) {
+TEST(FaultTextTest, RefusesWithThePartInTheMessage) {
     for (const auto& [text, part] : {
              std::pair{"", ""},
              std::pair{"silence", "silence"},
