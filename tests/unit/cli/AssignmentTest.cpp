@@ -6,20 +6,20 @@
 
 namespace {
 
-TEST(Assignment, IsSplitAtTheFirstEqualsSign) {
+TEST(AssignmentTest, IsSplitAtTheFirstEqualsSign) {
     const auto split = cli::parseAssignment("1?HREG?400001?string-8=a=b");
     EXPECT_EQ("1?HREG?400001?string-8", split.uri);
     EXPECT_EQ("a=b", split.value);
     EXPECT_EQ("", cli::parseAssignment("u=").value);
 }
 
-TEST(Assignment, NeedsUriAndEqualsSign) {
+TEST(AssignmentTest, NeedsUriAndEqualsSign) {
     for (const char* const text : {"", "1?HREG?400001?int", "=5", "="}) {
         EXPECT_THROW(cli::parseAssignment(text), cli::CommandError) << text;
     }
 }
 
-TEST(ExitCode, FollowsTheDriversErrorCode) {
+TEST(AssignmentTest, ExitCodeFollowsTheDriversErrorCode) {
     EXPECT_EQ(cli::ExitCode::NoResponse, cli::exitCodeOf(-4));
     EXPECT_EQ(cli::ExitCode::BadReply, cli::exitCodeOf(-6));
     for (const int other : {-1, -3, -9, -10, 0, 1}) {
@@ -27,7 +27,7 @@ TEST(ExitCode, FollowsTheDriversErrorCode) {
     }
 }
 
-TEST(ExitCode, OfSeveralFailuresTheFirstCounts) {
+TEST(AssignmentTest, ExitCodeOfSeveralFailuresTheFirstCounts) {
     cli::FirstFailure first;
     EXPECT_EQ(cli::ExitCode::Done, first.code());
     first.note(cli::ExitCode::NoResponse);

@@ -6,7 +6,7 @@ namespace {
 
 const std::vector<std::string> kParities{"none", "even", "odd", "mark"};
 
-TEST(Choices, TheNearestNameIsOffered) {
+TEST(ChoicesTest, TheNearestNameIsOffered) {
     EXPECT_EQ("; did you mean 'even'?", cli::didYouMean("evn", kParities));
     EXPECT_EQ("", cli::didYouMean("something else", kParities));
     EXPECT_EQ("; did you mean '9600'?", cli::didYouMean("9601", {"9600", "19200"}));
@@ -17,7 +17,7 @@ TEST(Choices, TheNearestNameIsOffered) {
     EXPECT_EQ("'' is not one of none, even, odd, mark", cli::notOneOf("", kParities));
 }
 
-TEST(Choices, ANumberIsDigitsAlone) {
+TEST(ChoicesTest, ANumberIsDigitsAlone) {
     EXPECT_EQ(0, cli::plainNumber("0", 9));
     EXPECT_EQ(9, cli::plainNumber("9", 9));
     EXPECT_EQ(8, cli::plainNumber("008", 9));
@@ -26,7 +26,7 @@ TEST(Choices, ANumberIsDigitsAlone) {
         EXPECT_EQ(-1, cli::plainNumber(text, 9)) << text;
 }
 
-TEST(Choices, CaseDoesNotCountInWords) {
+TEST(ChoicesTest, CaseDoesNotCountInWords) {
     EXPECT_TRUE(cli::sameWord("EVEN", "even"));
     EXPECT_FALSE(cli::sameWord("eve", "even"));
     EXPECT_TRUE(cli::sameWord("", ""));

@@ -19,7 +19,7 @@ constexpr const char* kHelp =
     "setid n m - set the node id n to m\n"
     "getid - get all changed node id's\n";
 
-TEST(Console, OneCommandIsAnsweredAsTheDriverAnswers) {
+TEST(ConsoleTest, OneCommandIsAnsweredAsTheDriverAnswers) {
     const struct {
         std::vector<std::string> words;
         const char* answer;
@@ -54,14 +54,14 @@ TEST(Console, OneCommandIsAnsweredAsTheDriverAnswers) {
     }
 }
 
-TEST(Console, ASilentDeviceIsAFailure) {
+TEST(ConsoleTest, ASilentDeviceIsAFailure) {
     const Outcome outcome = mrtu({"console", "--sim", "--timeout", "50", "--set", "repeat=0",
                                   "read", "77?HREG?400001?short"});
     EXPECT_EQ("No response", outcome.out);
     EXPECT_EQ(4, outcome.exitCode);
 }
 
-TEST(Console, AWrongByteOrderIsAUsageError) {
+TEST(ConsoleTest, AWrongByteOrderIsAUsageError) {
     const Outcome outcome =
         mrtu({"console", "--sim"}, {.input = "read 1?HREG?400001?int@ABDC\ngetmaxtm\n"});
     EXPECT_EQ("mrtu: 'ABDC' is no byte order of int: ABCD, CDAB, DCBA, BADC\n", outcome.err);
@@ -69,21 +69,21 @@ TEST(Console, AWrongByteOrderIsAUsageError) {
     EXPECT_EQ(2, outcome.exitCode);
 }
 
-TEST(Console, AnUnknownCommandIsAUsageError) {
+TEST(ConsoleTest, AnUnknownCommandIsAUsageError) {
     const Outcome outcome = mrtu({"console", "--sim", "HELP"});
     EXPECT_EQ("", outcome.out);
     EXPECT_EQ("mrtu: unknown command 'HELP'; did you mean 'help'?\n", outcome.err);
     EXPECT_EQ(2, outcome.exitCode);
 }
 
-TEST(Console, WithoutALineTheDriverStaysStopped) {
+TEST(ConsoleTest, WithoutALineTheDriverStaysStopped) {
     EXPECT_EQ(kHelp, mrtu({"console", "help"}).out);
     const Outcome outcome = mrtu({"console", "read", "1?HREG?400001?short"});
     EXPECT_EQ("Protocol not started", outcome.out);
     EXPECT_EQ(2, outcome.exitCode);
 }
 
-TEST(Console, PipedCommandsAreAnsweredLineByLine) {
+TEST(ConsoleTest, PipedCommandsAreAnsweredLineByLine) {
     const Outcome outcome = mrtu({"console", "--sim"},
                                  {.input = "getmaxtm\n\nread x\r\nsetid 5 7\ngetid\nquit\nhelp\n"});
     EXPECT_EQ(
@@ -96,14 +96,14 @@ TEST(Console, PipedCommandsAreAnsweredLineByLine) {
     EXPECT_EQ(2, outcome.exitCode);  // of "read x"
 }
 
-TEST(Console, AnUnknownPipedCommandDoesNotStopTheOthers) {
+TEST(ConsoleTest, AnUnknownPipedCommandDoesNotStopTheOthers) {
     const Outcome outcome = mrtu({"console", "--sim"}, {.input = "nonsense\ngetmaxtm"});
     EXPECT_EQ("maxtm = 4000 ms\n", outcome.out);
     EXPECT_EQ("mrtu: unknown command 'nonsense'\n", outcome.err);
     EXPECT_EQ(2, outcome.exitCode);
 }
 
-TEST(Console, LongAnswersAreCutAtSixteenKibibytes) {
+TEST(ConsoleTest, LongAnswersAreCutAtSixteenKibibytes) {
     const Outcome outcome = mrtu({"console", "--sim", "read", "1?HREG?400001?unsignedShort-5000"});
     // The driver leaves room for a line end and a zero behind the last whole byte.
     EXPECT_EQ(16 * 1024 - 3U, outcome.out.size());
@@ -111,7 +111,7 @@ TEST(Console, LongAnswersAreCutAtSixteenKibibytes) {
     EXPECT_EQ(0, outcome.exitCode);
 }
 
-TEST(Console, AtATerminalLinesAreRemembered) {
+TEST(ConsoleTest, AtATerminalLinesAreRemembered) {
     cli_test::TerminalSession session({"console", "--sim"});
     ASSERT_TRUE(session.shows("mrtu> ")) << session.screen();
     session.type("getmaxtm\r");

@@ -18,7 +18,7 @@ Outcome readOn(const std::string& port) {
     return mrtu({"read", "--port", port, kUri});
 }
 
-TEST(Port, ThatIsNotThereIsNamedWithTheReason) {
+TEST(FailureTest, PortThatIsNotThereIsNamedWithTheReason) {
     const std::string device = scratchFolder() + "/nothing";
     const Outcome outcome = readOn("com1=" + device);
     EXPECT_EQ("mrtu: Can't open serial port: com1: " + device + ": No such file or directory\n",
@@ -27,13 +27,13 @@ TEST(Port, ThatIsNotThereIsNamedWithTheReason) {
     EXPECT_EQ(3, outcome.exitCode);
 }
 
-TEST(Port, ThatIsNoTerminalIsNamedWithTheReason) {
+TEST(FailureTest, PortThatIsNoTerminalIsNamedWithTheReason) {
     const Outcome outcome = readOn("com1=/dev/null");
     EXPECT_EQ("mrtu: Can't open serial port: com1: /dev/null: not a terminal\n", outcome.err);
     EXPECT_EQ(3, outcome.exitCode);
 }
 
-TEST(Port, ThatMayNotBeOpenedIsNamedWithTheReason) {
+TEST(FailureTest, PortThatMayNotBeOpenedIsNamedWithTheReason) {
     const cli_test::RunningSim sim({});
     ASSERT_EQ(0, chmod(sim.device().c_str(), 0));
     const Outcome outcome =
@@ -44,7 +44,7 @@ TEST(Port, ThatMayNotBeOpenedIsNamedWithTheReason) {
     EXPECT_EQ(3, outcome.exitCode);
 }
 
-TEST(Port, ThatTheConfigurationUsesMustBeGiven) {
+TEST(FailureTest, PortThatTheConfigurationUsesMustBeGiven) {
     const Outcome outcome = mrtu({"read", "--port", "com2=/dev/null", kUri});
     EXPECT_EQ("mrtu: Can't open serial port: com1: no device is mapped to this port\n",
               outcome.err);
@@ -52,7 +52,7 @@ TEST(Port, ThatTheConfigurationUsesMustBeGiven) {
     EXPECT_EQ(2, mrtu({"read", "--port", "com99=/dev/null", kUri}).exitCode);
 }
 
-TEST(Port, ThatVanishesIsNoSilentDevice) {
+TEST(FailureTest, PortThatVanishesIsNoSilentDevice) {
     cli_test::RunningSim sim({"--fault", "hangup"});
     const Outcome outcome = readOn(sim.device());
     EXPECT_EQ("mrtu: " + kUri + ": error -4: No response\nmrtu: the port is gone\n", outcome.err);
@@ -61,7 +61,7 @@ TEST(Port, ThatVanishesIsNoSilentDevice) {
 }
 
 /// No further attempt finds the port gone when the only one waited for its reply.
-TEST(Port, ThatVanishesUnderTheOnlyAttemptIsNoSilentDevice) {
+TEST(FailureTest, PortThatVanishesUnderTheOnlyAttemptIsNoSilentDevice) {
     cli_test::RunningSim sim({"--fault", "hangup"});
     const Outcome outcome = mrtu({"read", "--port", sim.device(), "--set", "repeat=0", kUri});
     EXPECT_EQ("mrtu: " + kUri + ": error -4: No response\nmrtu: the port is gone\n", outcome.err);
@@ -69,13 +69,13 @@ TEST(Port, ThatVanishesUnderTheOnlyAttemptIsNoSilentDevice) {
     EXPECT_EQ(3, sim.end(0));
 }
 
-TEST(Port, WithBaudRateZeroCannotBeOpened) {
+TEST(FailureTest, PortWithBaudRateZeroCannotBeOpened) {
     const Outcome outcome = mrtu({"read", "--sim", "--set", "baudrate=0", kUri});
     EXPECT_EQ(0U, outcome.err.rfind("mrtu: Can't open serial port", 0)) << outcome.err;
     EXPECT_EQ(3, outcome.exitCode);
 }
 
-TEST(PlugIn, ThatIsNotThereIsNamed) {
+TEST(FailureTest, PlugInThatIsNotThereIsNamed) {
     const std::string file = scratchFolder() + "/missing.so";
     const Outcome outcome = mrtu({"read", "--sim", "--plugin", file, kUri});
     EXPECT_EQ("mrtu: " + file + ": No such file or directory\n", outcome.err);
@@ -83,7 +83,7 @@ TEST(PlugIn, ThatIsNotThereIsNamed) {
     EXPECT_EQ(1, mrtu({"info", "--plugin", file}).exitCode);
 }
 
-TEST(PlugIn, ThatIsNoLibraryIsNamed) {
+TEST(FailureTest, PlugInThatIsNoLibraryIsNamed) {
     const std::string file = scratchFile("text.so");
     cli_test::writeFile(file, "no library\n");
     const Outcome outcome = mrtu({"read", "--sim", "--plugin", file, kUri});
@@ -92,13 +92,13 @@ TEST(PlugIn, ThatIsNoLibraryIsNamed) {
     EXPECT_EQ(1, outcome.exitCode);
 }
 
-TEST(PlugIn, HasOnlyItsOwnProtocols) {
+TEST(FailureTest, PlugInHasOnlyItsOwnProtocols) {
     const Outcome outcome = mrtu({"read", "--sim", "--protocol", "MRTU ", kUri});
     EXPECT_NE(outcome.err.find("unknown protocol 'MRTU '"), std::string::npos) << outcome.err;
     EXPECT_EQ(1, outcome.exitCode);
 }
 
-TEST(Output, ThatCannotBeWrittenIsAFailure) {
+TEST(FailureTest, OutputThatCannotBeWrittenIsAFailure) {
     const Outcome full = mrtu({"read", "--sim", kUri}, {.outFile = "/dev/full"});
     EXPECT_EQ("mrtu: the output can't be written\n", full.err);
     EXPECT_EQ(1, full.exitCode);
@@ -107,7 +107,7 @@ TEST(Output, ThatCannotBeWrittenIsAFailure) {
     EXPECT_EQ(1, closed.exitCode);
 }
 
-TEST(Output, ThatIsClosedDoesNotEndUpOnTheLine) {
+TEST(FailureTest, OutputThatIsClosedDoesNotEndUpOnTheLine) {
     const cli_test::RunningSim sim({});
     const Outcome outcome =
         mrtu({"write", "--port", sim.device(), "1?HREG?400001?short=5"}, {.outClosed = true});

@@ -47,12 +47,12 @@ class ConfigFile {
     std::string path_;
 };
 
-TEST(LineOptions, WithoutAFileTheDefaultConfigurationServes) {
+TEST(LineOptionsTest, WithoutAFileTheDefaultConfigurationServes) {
     EXPECT_EQ(configOf({}), cli::defaultConfig("1"));
     EXPECT_EQ(configOf({"--sim"}), cli::defaultConfig("3"));
 }
 
-TEST(LineOptions, ShortFormsSetTheirItems) {
+TEST(LineOptionsTest, ShortFormsSetTheirItems) {
     const std::string text =
         configOf({"--baud", "9600", "--parity", "even", "--stopbits", "2", "--node", "5", "--model",
                   "2", "--timeout", "100", "--ascii", "--set", "repeat=0"});
@@ -66,7 +66,7 @@ TEST(LineOptions, ShortFormsSetTheirItems) {
     EXPECT_EQ("0", cli::itemOf(text, "repeat"));
 }
 
-TEST(LineOptions, OptionsWinOverTheFile) {
+TEST(LineOptionsTest, OptionsWinOverTheFile) {
     const ConfigFile file("CfgVer=1\ntimeout=1\nbits=7\nuart=com3\n");
     const std::string text = configOf({"--config", file.path(), "--set", "timeout=2", "--ascii"});
     EXPECT_EQ("2", cli::itemOf(text, "timeout"));
@@ -74,13 +74,13 @@ TEST(LineOptions, OptionsWinOverTheFile) {
     EXPECT_EQ("com3", cli::itemOf(text, "uart"));
 }
 
-TEST(LineOptions, AsciiNeedsDataBitsAndGetsThem) {
+TEST(LineOptionsTest, AsciiNeedsDataBitsAndGetsThem) {
     const ConfigFile file("CfgVer=1 uart=com1");
     EXPECT_EQ("8", cli::itemOf(configOf({"--config", file.path(), "--ascii"}), "bits"));
     EXPECT_EQ(std::nullopt, cli::itemOf(configOf({"--config", file.path()}), "bits"));
 }
 
-TEST(LineOptions, AFileThatCannotBeTakenIsAUsageError) {
+TEST(LineOptionsTest, AFileThatCannotBeTakenIsAUsageError) {
     const ConfigFile zero(std::string("CfgVer=1 \0 x=1", 14));
     const ConfigFile* const files[] = {&zero};
     for (const std::string& path : {files[0]->path(), std::string("/nowhere/at/all"),
@@ -95,7 +95,7 @@ TEST(LineOptions, AFileThatCannotBeTakenIsAUsageError) {
     }
 }
 
-TEST(LineOptions, APortTakesOneWordAndCanBeRepeated) {
+TEST(LineOptionsTest, APortTakesOneWordAndCanBeRepeated) {
     const cli::LineOptions options =
         parsed({"--port", "com1=/dev/a", "--port", "com2=/dev/b", "1?HREG?400001?int"});
     const auto ports = cli::portsOf(options, "CfgVer=1 uart=com1");
@@ -106,7 +106,7 @@ TEST(LineOptions, APortTakesOneWordAndCanBeRepeated) {
     EXPECT_EQ("/dev/b", ports[1].device);
 }
 
-TEST(LineOptions, ADeviceAloneServesTheConfiguredPort) {
+TEST(LineOptionsTest, ADeviceAloneServesTheConfiguredPort) {
     const auto ports =
         cli::portsOf(parsed({"--port", "/dev/serial/by-id/com=1"}), "CfgVer=1 uart=com5");
     ASSERT_EQ(1U, ports.size());
@@ -114,11 +114,11 @@ TEST(LineOptions, ADeviceAloneServesTheConfiguredPort) {
     EXPECT_EQ("/dev/serial/by-id/com=1", ports[0].device);
 }
 
-TEST(LineOptions, APortWithoutDeviceIsRefused) {
+TEST(LineOptionsTest, APortWithoutDeviceIsRefused) {
     EXPECT_THROW(cli::portsOf(parsed({"--port", "com1="}), "CfgVer=1"), cli::CommandError);
 }
 
-TEST(LineOptions, SimulatorAndPortExcludeEachOther) {
+TEST(LineOptionsTest, SimulatorAndPortExcludeEachOther) {
     EXPECT_THROW(parsed({"--sim", "--port", "/dev/a"}), CLI::ParseError);
 }
 

@@ -19,7 +19,7 @@ struct Row {
     const char* words;
 };
 
-TEST(OverrideNotice, TellsWhatDiffersFromTheConfiguration) {
+TEST(OverrideNoticeTest, TellsWhatDiffersFromTheConfiguration) {
     const Row rows[] = {
         {{"baud", 38400}, "baud 38400 instead of 19200", "baud"},
         {{"baud", 19200}, nullptr, nullptr},
@@ -49,13 +49,13 @@ TEST(OverrideNotice, TellsWhatDiffersFromTheConfiguration) {
 }
 
 // A node's own model makes it count from 1 only where the model of all nodes does.
-TEST(OverrideNotice, KnowsTheDriversRuleForModiconMode) {
+TEST(OverrideNoticeTest, KnowsTheDriversRuleForModiconMode) {
     const std::string config = "CfgVer=1 model=2 Node5::model=1";
     EXPECT_TRUE(cli::activeOverrides({{"node5_ModiconMode", false}}, config).empty());
     EXPECT_EQ(1U, cli::activeOverrides({{"node5_ModiconMode", true}}, config).size());
 }
 
-TEST(OverrideKeys, NameTheirNode) {
+TEST(OverrideNoticeTest, KeysNameTheirNode) {
     EXPECT_EQ("tempNode5", cli::addressKey(5));
     EXPECT_EQ(5, cli::nodeOfAddressKey("tempNode5"));
     EXPECT_EQ(31, cli::nodeOfAddressKey("tempNode0x1F"));

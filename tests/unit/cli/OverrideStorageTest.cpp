@@ -17,7 +17,7 @@ struct Row {
     const char* fault;
 };
 
-TEST(StoredOverride, OutOfItsRangeIsRefused) {
+TEST(OverrideStorageTest, OutOfItsRangeIsRefused) {
     const Row rows[] = {
         {"tempNode5", std::string("0"), ""},
         {"tempNode5", std::string("255"), ""},
@@ -100,7 +100,7 @@ std::string reportOn(int count) {
     return err.str();
 }
 
-TEST(StoredOverride, ThatIsNotUsedIsReported) {
+TEST(OverrideStorageTest, ThatIsNotUsedIsReported) {
     EXPECT_EQ("", reportOn(0));
     EXPECT_EQ(
         "mrtu: stored override key0 is not used: why\n"

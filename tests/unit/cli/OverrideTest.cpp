@@ -10,7 +10,7 @@ using cli_test::mrtu;
 using cli_test::Outcome;
 
 /// A storage of the test's own, on the simulated line.
-class Override : public testing::Test {
+class OverrideTest : public testing::Test {
   protected:
     Outcome run(std::vector<std::string> words, const std::vector<std::string>& tail) const {
         words.insert(words.end(), {"--sim", "--storage", storage_});
@@ -31,11 +31,11 @@ class Override : public testing::Test {
 constexpr const char* kNothing =
     "node 1 = 1\nmodicon 1 = on\nbaud = 19200\nparity = none\nstop = 1\nmode = RS-232\n";
 
-TEST_F(Override, WithoutAnyTheConfigurationIsListed) {
+TEST_F(OverrideTest, WithoutAnyTheConfigurationIsListed) {
     EXPECT_EQ(kNothing, list());
 }
 
-TEST_F(Override, OutlastsItsProcess) {
+TEST_F(OverrideTest, OutlastsItsProcess) {
     const Outcome outcome = set({"node", "5=7", "6=off", "modicon", "5=off", "baud=38400",
                                  "parity=even", "stop=2", "mode=RS-485"});
     EXPECT_EQ(
@@ -52,7 +52,7 @@ TEST_F(Override, OutlastsItsProcess) {
         list());
 }
 
-TEST_F(Override, ActsOnTheReadsOfALaterProcess) {
+TEST_F(OverrideTest, ActsOnTheReadsOfALaterProcess) {
     set({"node", "5=7", "6=off", "modicon", "8=off"});
     const Outcome outcome =
         run({"read"}, {"5?HREG?400001?unsignedShort", "6?HREG?400001?unsignedShort",
@@ -66,7 +66,7 @@ TEST_F(Override, ActsOnTheReadsOfALaterProcess) {
     EXPECT_EQ(1, outcome.exitCode);
 }
 
-TEST_F(Override, ThatIsInForceIsToldOnceWithTheWayOut) {
+TEST_F(OverrideTest, ThatIsInForceIsToldOnceWithTheWayOut) {
     set({"node", "5=7", "baud=38400"});
     const std::string clear = "mrtu override clear --storage " + storage_ + " baud node 5";
     const std::string notice =
@@ -83,7 +83,7 @@ TEST_F(Override, ThatIsInForceIsToldOnceWithTheWayOut) {
     EXPECT_EQ(kNothing, list());
 }
 
-TEST_F(Override, ThatKeepsThePortShutIsToldBeforeThat) {
+TEST_F(OverrideTest, ThatKeepsThePortShutIsToldBeforeThat) {
     mrtu({"override", "set", "--sim", "--storage", storage_, "baud=150"});
     const Outcome outcome =
         mrtu({"read", "--port", "/dev/null", "--storage", storage_, "1?HREG?400001?unsignedShort"});
@@ -91,25 +91,25 @@ TEST_F(Override, ThatKeepsThePortShutIsToldBeforeThat) {
     EXPECT_LT(outcome.err.find("baud 150"), outcome.err.find("not a terminal")) << outcome.err;
 }
 
-TEST_F(Override, ThatSaysWhatTheConfigurationSaysIsNotWorthAWord) {
+TEST_F(OverrideTest, ThatSaysWhatTheConfigurationSaysIsNotWorthAWord) {
     set({"baud=38400", "parity=even"});
     EXPECT_EQ("", run({"read"}, {"--baud", "38400", "--parity", "EVEN", "1?OUTP?1?boolean"}).err);
 }
 
-TEST_F(Override, IsTheConsolesToo) {
+TEST_F(OverrideTest, IsTheConsolesToo) {
     set({"node", "5=7"});
     EXPECT_EQ("id 5 -> 7\n", run({"console"}, {"getid"}).out);
     EXPECT_EQ("id 5 set to 9\n", run({"console"}, {"setid", "5", "9"}).out);
     EXPECT_NE(list().find("node 5 = 9 (stored)\n"), std::string::npos);
 }
 
-TEST_F(Override, BelongsToOneIdent) {
+TEST_F(OverrideTest, BelongsToOneIdent) {
     set({"--ident", "left", "node", "5=7"});
     EXPECT_EQ(kNothing, list());
     EXPECT_EQ("id 5 -> 7\n", run({"console"}, {"--ident", "left", "getid"}).out);
 }
 
-TEST_F(Override, IsClearedOneByOne) {
+TEST_F(OverrideTest, IsClearedOneByOne) {
     set({"node", "5=7", "6=off", "modicon", "5=off", "baud=38400", "parity=even"});
     const Outcome outcome = clear({"node", "5", "modicon", "5", "baud"});
     EXPECT_EQ("cleared\n", outcome.out);
@@ -120,7 +120,7 @@ TEST_F(Override, IsClearedOneByOne) {
         list());
 }
 
-TEST_F(Override, IsClearedAtOnceWithoutALine) {
+TEST_F(OverrideTest, IsClearedAtOnceWithoutALine) {
     set({"node", "5=7", "modicon", "9=off", "mode=RS-485"});
     const Outcome outcome = mrtu({"override", "clear", "--storage", storage_, "all"});
     EXPECT_EQ("cleared\n", outcome.out);
@@ -128,7 +128,7 @@ TEST_F(Override, IsClearedAtOnceWithoutALine) {
     EXPECT_EQ(kNothing, list());
 }
 
-TEST_F(Override, AWrongWordChangesNothing) {
+TEST_F(OverrideTest, AWrongWordChangesNothing) {
     for (const char* const wrong : {"baud=14400", "stop=7", "6=256", "nonsense"}) {
         const Outcome outcome = set({"node", "5=7", wrong});
         EXPECT_EQ(2, outcome.exitCode) << wrong;
@@ -138,7 +138,7 @@ TEST_F(Override, AWrongWordChangesNothing) {
     EXPECT_EQ(kNothing, list());
 }
 
-TEST_F(Override, WithoutAStorageItEndsWithItsCommand) {
+TEST_F(OverrideTest, WithoutAStorageItEndsWithItsCommand) {
     const Outcome outcome = mrtu({"override", "set", "--sim", "node", "5=7"});
     EXPECT_EQ("node 5 = 7\n", outcome.out);
     EXPECT_EQ("mrtu: there is no storage: the overrides end with this command\n", outcome.err);
@@ -146,13 +146,13 @@ TEST_F(Override, WithoutAStorageItEndsWithItsCommand) {
     EXPECT_EQ(2, mrtu({"override", "clear", "--sim", "all"}).exitCode);
 }
 
-TEST_F(Override, NeedsALine) {
+TEST_F(OverrideTest, NeedsALine) {
     const Outcome outcome = mrtu({"override", "list", "--storage", "none"});
     EXPECT_EQ("mrtu: no line: --port com1=/dev/ttyUSB0, or --sim\n", outcome.err);
     EXPECT_EQ(2, outcome.exitCode);
 }
 
-TEST_F(Override, AStorageThatMayNotBeWrittenIsAFailureAndKeepsItsValues) {
+TEST_F(OverrideTest, AStorageThatMayNotBeWrittenIsAFailureAndKeepsItsValues) {
     set({"node", "5=7"});
     ASSERT_EQ(0, chmod(storage_.c_str(), 0444));
     const Outcome outcome = mrtu({"override", "set", "--sim", "--storage", storage_, "node", "5=9"},

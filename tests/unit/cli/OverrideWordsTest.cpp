@@ -24,7 +24,7 @@ std::string removalRefusal(const std::vector<std::string>& words) {
     return "accepted";
 }
 
-TEST(OverrideWords, NodesModiconModeAndSettingsInOneGo) {
+TEST(OverrideWordsTest, NodesModiconModeAndSettingsInOneGo) {
     const auto changes = cli::parseChanges({"node", "5=7", "6=off", "modicon", "5=on", "6=off",
                                             "baud=38400", "parity=Even", "stop=2", "mode=rs-485"});
     ASSERT_EQ(2U, changes.nodes.size());
@@ -42,7 +42,7 @@ TEST(OverrideWords, NodesModiconModeAndSettingsInOneGo) {
     EXPECT_EQ(1U, changes.serial[3].code);
 }
 
-TEST(OverrideWords, EveryWordHasItsCodeAndBack) {
+TEST(OverrideWordsTest, EveryWordHasItsCodeAndBack) {
     struct Row {
         const char* text;
         std::uint32_t code;
@@ -64,13 +64,13 @@ TEST(OverrideWords, EveryWordHasItsCodeAndBack) {
     }
 }
 
-TEST(OverrideWords, ACodeWithoutAWordIsShownAsItIs) {
+TEST(OverrideWordsTest, ACodeWithoutAWordIsShownAsItIs) {
     EXPECT_EQ("3", cli::wordOf(cli::serialSettings()[3], 3));
     EXPECT_EQ("off", cli::addressWord(255));
     EXPECT_EQ("7", cli::addressWord(7));
 }
 
-TEST(OverrideWords, WhatCannotBeSetIsNamed) {
+TEST(OverrideWordsTest, WhatCannotBeSetIsNamed) {
     struct Row {
         std::vector<std::string> words;
         const char* complaint;
@@ -100,7 +100,7 @@ TEST(OverrideWords, WhatCannotBeSetIsNamed) {
         EXPECT_EQ(row.complaint, changeRefusal(row.words));
 }
 
-TEST(OverrideWords, RemovalsNameTheirThings) {
+TEST(OverrideWordsTest, RemovalsNameTheirThings) {
     const auto removals = cli::parseRemovals({"node", "5", "6", "baud", "modicon", "5", "mode"});
     EXPECT_EQ((std::vector<int>{5, 6}), removals.nodes);
     EXPECT_EQ(std::vector<int>{5}, removals.modicon);
@@ -111,7 +111,7 @@ TEST(OverrideWords, RemovalsNameTheirThings) {
     EXPECT_TRUE(cli::parseRemovals({"all"}).all);
 }
 
-TEST(OverrideWords, RemovalsOfSomethingElseAreRefused) {
+TEST(OverrideWordsTest, RemovalsOfSomethingElseAreRefused) {
     const std::vector<std::string> rows[] = {{"5"},           {"node"},      {"node", "x"},
                                              {"node", "256"}, {"baud=9600"}, {"all", "baud"}};
     for (const auto& words : rows) {

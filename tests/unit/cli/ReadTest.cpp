@@ -41,21 +41,21 @@ constexpr const char* kEveryAreaText =
     "1?SP_Done?0?boolean = 0\n"
     "2?HREG?400010.3?boolean = 1\n";  // 2009 is 0x7D9
 
-TEST(Read, EveryAreaOfTheSimulatedLine) {
+TEST(ReadTest, EveryAreaOfTheSimulatedLine) {
     const Outcome outcome = readWith({"--sim"}, kEveryArea);
     EXPECT_EQ(kEveryAreaText, outcome.out);
     EXPECT_EQ("", outcome.err);
     EXPECT_EQ(0, outcome.exitCode);
 }
 
-TEST(Read, TheSameInAsciiFrames) {
+TEST(ReadTest, TheSameInAsciiFrames) {
     const Outcome outcome = readWith({"--sim", "--ascii"}, kEveryArea);
     EXPECT_EQ(kEveryAreaText, outcome.out);
     EXPECT_EQ("", outcome.err);
     EXPECT_EQ(0, outcome.exitCode);
 }
 
-TEST(Read, TheSimulatorFollowsTheConfigurationFile) {
+TEST(ReadTest, TheSimulatorFollowsTheConfigurationFile) {
     const std::string file = cli_test::scratchFile("line.cfg");
     cli_test::writeFile(file,
                         "CfgVer=1 defNodeId=20 model=2 txMode=ASCII uart=com3 baudrate=9600\n"
@@ -70,7 +70,7 @@ TEST(Read, TheSimulatorFollowsTheConfigurationFile) {
     EXPECT_EQ(0, outcome.exitCode);
 }
 
-TEST(Read, ArraysLongerThanARequestComeWhole) {
+TEST(ReadTest, ArraysLongerThanARequestComeWhole) {
     const Outcome outcome = readWith({"--sim"}, {"1?HREG?400001?unsignedShort-300"});
     std::string expected = "1?HREG?400001?unsignedShort-300 = 1000";
     for (int i = 1; i < 300; ++i)
@@ -79,13 +79,13 @@ TEST(Read, ArraysLongerThanARequestComeWhole) {
     EXPECT_EQ(0, outcome.exitCode);
 }
 
-TEST(Read, FloatsAreShortAndExact) {
+TEST(ReadTest, FloatsAreShortAndExact) {
     // Registers 1009 and 1010 of node 1: 0x03F1 and 0x03F2, low word first.
     const Outcome outcome = readWith({"--sim"}, {"1?HREG?400010?float"});
     EXPECT_EQ("1?HREG?400010?float = 1.42243865e-36\n", outcome.out);
 }
 
-TEST(Read, AByteOrderCanBeNamed) {
+TEST(ReadTest, AByteOrderCanBeNamed) {
     // Registers 1000 to 1003 of node 1: 0x03E8 to 0x03EB.
     const Outcome outcome =
         readWith({"--sim"}, {"1?HREG?400001?unsignedInt@ABCD", "1?HREG?400001?unsignedInt@CDAB",
@@ -105,7 +105,7 @@ TEST(Read, AByteOrderCanBeNamed) {
     EXPECT_EQ(0, outcome.exitCode);
 }
 
-TEST(Read, KeysThatTheDriverDoesNotKnowAreToldOnce) {
+TEST(ReadTest, KeysThatTheDriverDoesNotKnowAreToldOnce) {
     const Outcome outcome = readWith({"--sim", "--set", "timout=5", "--set", "Node3::timout=5",
                                       "--set", "Node3::timeout=5", "--set", "wholly=1"},
                                      {"1?OUTP?3?boolean"});
@@ -156,7 +156,7 @@ const Failing kFailing[] = {
 
 const std::vector<std::string> kImpatient{"--sim", "--timeout", "100", "--set", "repeat=0"};
 
-TEST(Read, EachFailureHasItsTextAndExitCode) {
+TEST(ReadTest, EachFailureHasItsTextAndExitCode) {
     for (const Failing& row : kFailing) {
         const Outcome outcome = readWith(kImpatient, {row.uri});
         EXPECT_EQ("", outcome.out) << row.uri;
@@ -165,7 +165,7 @@ TEST(Read, EachFailureHasItsTextAndExitCode) {
     }
 }
 
-TEST(Read, AFailureDoesNotStopTheOthersAndTheFirstDecides) {
+TEST(ReadTest, AFailureDoesNotStopTheOthersAndTheFirstDecides) {
     const std::string good = "1?HREG?400001?unsignedShort";
     const Outcome noResponse =
         readWith(kImpatient, {good, "77?HREG?400001?int", "1?HREG?410001?int", good});
@@ -176,7 +176,7 @@ TEST(Read, AFailureDoesNotStopTheOthersAndTheFirstDecides) {
     EXPECT_EQ(5, exception.exitCode);
 }
 
-TEST(Read, JsonHoldsValuesAndErrors) {
+TEST(ReadTest, JsonHoldsValuesAndErrors) {
     std::vector<std::string> options = kImpatient;
     options.push_back("--json");
     const Outcome outcome = readWith(
@@ -190,7 +190,7 @@ TEST(Read, JsonHoldsValuesAndErrors) {
     EXPECT_EQ(4, outcome.exitCode);
 }
 
-TEST(Read, TraceShowsEveryFrame) {
+TEST(ReadTest, TraceShowsEveryFrame) {
     const Outcome outcome = readWith({"--sim", "--trace"}, {"1?HREG?400001?unsignedShort"});
     EXPECT_NE(outcome.err.find(" com1 > 01 03 00 00 00 01 84 0A\n"), std::string::npos)
         << outcome.err;
@@ -199,7 +199,7 @@ TEST(Read, TraceShowsEveryFrame) {
     EXPECT_EQ("1?HREG?400001?unsignedShort = 1000\n", outcome.out);
 }
 
-TEST(Read, APortIsNamedOrServesTheConfiguredOne) {
+TEST(ReadTest, APortIsNamedOrServesTheConfiguredOne) {
     const cli_test::RunningSim sim({});
     for (const std::string& port : {sim.device(), "com1=" + sim.device()}) {
         const Outcome outcome = readWith({"--port", port}, {"1?HREG?400001?unsignedShort"});

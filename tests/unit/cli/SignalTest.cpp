@@ -22,7 +22,7 @@ const std::vector<std::uint8_t> kReply{0x01, 0x03, 0x02, 0x03, 0xE8, 0xB8, 0xFA}
 
 /// A terminal that somebody has set up in a way of his own, and a command that waits on it for an
 /// answer that does not come.
-class EndSignal : public testing::TestWithParam<int> {
+class SignalTest : public testing::TestWithParam<int> {
   protected:
     void SetUp() override {
         termios own = terminal_.settings();
@@ -69,9 +69,9 @@ class EndSignal : public testing::TestWithParam<int> {
 std::string nameOf(const testing::TestParamInfo<int>& row) {
     return sigabbrev_np(row.param);
 }
-INSTANTIATE_TEST_SUITE_P(Each, EndSignal, testing::Values(SIGINT, SIGTERM, SIGHUP), nameOf);
+INSTANTIATE_TEST_SUITE_P(Each, SignalTest, testing::Values(SIGINT, SIGTERM, SIGHUP), nameOf);
 
-TEST_P(EndSignal, EndsAWaitingReadAndPutsThePortBack) {
+TEST_P(SignalTest, EndsAWaitingReadAndPutsThePortBack) {
     RunningCommand read(words({"read", kUri}));
     waitForRequest();
     read.send(GetParam());
@@ -81,7 +81,7 @@ TEST_P(EndSignal, EndsAWaitingReadAndPutsThePortBack) {
     expectAsFound();
 }
 
-TEST_P(EndSignal, EndsAWriteAndAConsoleCommand) {
+TEST_P(SignalTest, EndsAWriteAndAConsoleCommand) {
     const std::vector<std::string> commands[] = {
         {"write", "1?HREG?400001?short=1"},
         {"console", "read", kUri},
@@ -96,7 +96,7 @@ TEST_P(EndSignal, EndsAWriteAndAConsoleCommand) {
     }
 }
 
-TEST_P(EndSignal, TwiceIsNoWorseThanOnce) {
+TEST_P(SignalTest, TwiceIsNoWorseThanOnce) {
     RunningCommand read(words({"read", kUri}));
     waitForRequest();
     for (int round = 0; round < 3; ++round)
@@ -105,7 +105,7 @@ TEST_P(EndSignal, TwiceIsNoWorseThanOnce) {
     expectAsFound();
 }
 
-TEST_P(EndSignal, ThatWasIgnoredAtTheStartStaysIgnored) {
+TEST_P(SignalTest, ThatWasIgnoredAtTheStartStaysIgnored) {
     RunningCommand read(words({"read", kUri}), {.ignoredSignal = GetParam()});
     waitForRequest();
     read.send(GetParam());
@@ -116,7 +116,7 @@ TEST_P(EndSignal, ThatWasIgnoredAtTheStartStaysIgnored) {
     expectAsFound();
 }
 
-TEST_P(EndSignal, PutsTheRs485ModeBack) {
+TEST_P(SignalTest, PutsTheRs485ModeBack) {
     const std::string log = cli_test::scratchFile("rs485");
     RunningCommand read(words({"read", kUri}),
                         {.environment = {{"LD_PRELOAD", RS485_TERMINAL}, {"RS485_LOG", log}}});
@@ -129,7 +129,7 @@ TEST_P(EndSignal, PutsTheRs485ModeBack) {
               cli_test::contentsOf(log));
 }
 
-TEST_P(EndSignal, EndsAConsoleThatIsFedThroughAPipe) {
+TEST_P(SignalTest, EndsAConsoleThatIsFedThroughAPipe) {
     RunningCommand console(words({"console"}), {.input = std::string("read ") + kUri + "\n"});
     waitForRequest();
     console.send(GetParam());
@@ -137,7 +137,7 @@ TEST_P(EndSignal, EndsAConsoleThatIsFedThroughAPipe) {
     expectAsFound();
 }
 
-TEST_P(EndSignal, EndsATypedConsoleAndPutsItsTerminalBackToo) {
+TEST_P(SignalTest, EndsATypedConsoleAndPutsItsTerminalBackToo) {
     cli_test::TerminalSession console(words({"console"}));
     ASSERT_TRUE(console.shows("mrtu> ")) << console.screen();
     // Ctrl-B goes back by one: only the editor, at work on a raw terminal, shows "bc".
@@ -154,7 +154,7 @@ TEST_P(EndSignal, EndsATypedConsoleAndPutsItsTerminalBackToo) {
     expectAsFound();
 }
 
-TEST_F(EndSignal, TypedAsControlCEndsTheConsole) {
+TEST_F(SignalTest, TypedAsControlCEndsTheConsole) {
     cli_test::TerminalSession console(words({"console"}));
     ASSERT_TRUE(console.shows("mrtu> ")) << console.screen();
     console.type("half a li\x03");

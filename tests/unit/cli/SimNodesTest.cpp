@@ -4,7 +4,7 @@
 
 namespace {
 
-TEST(SimNodes, AreOneToTen) {
+TEST(SimNodesTest, AreOneToTen) {
     const auto nodes = cli::defaultSimNodes(false);
     ASSERT_EQ(10U, nodes.size());
     EXPECT_EQ(1, nodes.front().address);
@@ -13,7 +13,7 @@ TEST(SimNodes, AreOneToTen) {
     EXPECT_FALSE(cli::defaultSimNodes(true).front().longs.has_value());
 }
 
-TEST(SimNodes, FollowTheConfiguration) {
+TEST(SimNodesTest, FollowTheConfiguration) {
     const auto nodes =
         cli::simNodesFor("CfgVer=1 defNodeId=77 model=1 Node2::model=4 Node300::x=1 Node0::x=1");
     ASSERT_EQ(11U, nodes.size());

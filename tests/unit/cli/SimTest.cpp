@@ -11,7 +11,7 @@ namespace {
 using cli_test::mrtu;
 using cli_test::RunningSim;
 
-TEST(Sim, AnnouncesItsDeviceAndAnExampleThatWorks) {
+TEST(SimTest, AnnouncesItsDeviceAndAnExampleThatWorks) {
     const RunningSim sim({"--ascii", "--node", "17", "--plain"});
     EXPECT_EQ("simulated ASCII line: " + sim.device() + "\ntry: mrtu read --port " + sim.device() +
                   " --ascii '17?HREG?400001?unsignedShort'\nCtrl-C ends it.\n",
@@ -21,7 +21,7 @@ TEST(Sim, AnnouncesItsDeviceAndAnExampleThatWorks) {
     EXPECT_EQ("17?HREG?400001?unsignedShort = 17000\n", outcome.out) << outcome.err;
 }
 
-TEST(Sim, EndsWithAnEndSignalAndTakesItsLinkAway) {
+TEST(SimTest, EndsWithAnEndSignalAndTakesItsLinkAway) {
     for (const int signal : {SIGINT, SIGTERM, SIGHUP}) {
         const std::string link = cli_test::scratchFile("line");
         RunningSim sim({"--link", link});
@@ -32,7 +32,7 @@ TEST(Sim, EndsWithAnEndSignalAndTakesItsLinkAway) {
     }
 }
 
-TEST(Sim, OnlyNamedNodesAnswer) {
+TEST(SimTest, OnlyNamedNodesAnswer) {
     const RunningSim sim({"--node", "3", "--node", "4"});
     const auto outcome = mrtu({"read", "--port", sim.device(), "--timeout", "100", "--set",
                                "repeat=0", "3?OUTP?1?boolean", "5?OUTP?1?boolean"});
@@ -41,7 +41,7 @@ TEST(Sim, OnlyNamedNodesAnswer) {
 }
 
 /// As a USB adapter does it; the driver's own gap at 115200 baud is 2 ms.
-TEST(Sim, RepliesWithPausesNeedALongerGap) {
+TEST(SimTest, RepliesWithPausesNeedALongerGap) {
     const RunningSim sim({"--fault", "drip=4/100,times=100"});
     const std::vector<std::string> read{"read",   "--port", sim.device(), "--baud",
                                         "115200", "--set",  "repeat=0",   "1?HREG?400001?int"};
@@ -54,7 +54,7 @@ TEST(Sim, RepliesWithPausesNeedALongerGap) {
     EXPECT_NE(hasty.err.find("error -6"), std::string::npos) << hasty.err;
 }
 
-TEST(Sim, DoesNotReplaceAFileByItsLink) {
+TEST(SimTest, DoesNotReplaceAFileByItsLink) {
     const std::string file = cli_test::scratchFile("precious");
     cli_test::writeFile(file, "kept");
     const auto outcome = mrtu({"sim", "--link", file});
@@ -63,7 +63,7 @@ TEST(Sim, DoesNotReplaceAFileByItsLink) {
     EXPECT_EQ("kept", cli_test::contentsOf(file));
 }
 
-TEST(Sim, DoesNotReplaceALinkThatItDidNotMake) {
+TEST(SimTest, DoesNotReplaceALinkThatItDidNotMake) {
     const std::string link = cli_test::scratchFile("real_port");
     std::filesystem::create_symlink("/dev/ttyUSB7", link);
     const auto outcome = mrtu({"sim", "--link", link});

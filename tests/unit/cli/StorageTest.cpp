@@ -39,7 +39,7 @@ void execute(const std::string& file, const char* sql) {
     sqlite3_close(database);
 }
 
-TEST(Storage, ThatIsDamagedIsNamedAndLeftAlone) {
+TEST(StorageTest, ThatIsDamagedIsNamedAndLeftAlone) {
     const std::string file = scratchFile("damaged.db");
     const std::string garbage(4096, 'x');
     cli_test::writeFile(file, garbage);
@@ -60,7 +60,7 @@ TEST(Storage, ThatIsDamagedIsNamedAndLeftAlone) {
     }
 }
 
-TEST(Storage, ThatIsNotThereIsMadeByAChangeAlone) {
+TEST(StorageTest, ThatIsNotThereIsMadeByAChangeAlone) {
     const std::string folder = scratchFile("state");
     const std::string file = folder + "/overrides.db";
     EXPECT_EQ(kOwnValue, readWith(file).out);
@@ -73,7 +73,7 @@ TEST(Storage, ThatIsNotThereIsMadeByAChangeAlone) {
     EXPECT_EQ(kOverriddenValue, readWith(file).out);
 }
 
-TEST(Storage, ThatCannotBeMadeStopsChangesAlone) {
+TEST(StorageTest, ThatCannotBeMadeStopsChangesAlone) {
     const std::string file = "/dev/null/x.db";
     const Outcome read = readWith(file);
     EXPECT_EQ(kOwnValue, read.out);
@@ -89,7 +89,7 @@ TEST(Storage, ThatCannotBeMadeStopsChangesAlone) {
     EXPECT_EQ(1, set.exitCode);
 }
 
-TEST(Storage, WithoutAHomeStopsChangesAlone) {
+TEST(StorageTest, WithoutAHomeStopsChangesAlone) {
     const RunOptions homeless{.unset = {"HOME", "XDG_STATE_HOME"}};
     const cli_test::RunningSim sim({});
     const Outcome read = mrtu({"read", "--port", sim.device(), kUri}, homeless);
@@ -104,7 +104,7 @@ TEST(Storage, WithoutAHomeStopsChangesAlone) {
     EXPECT_EQ(1, set.exitCode);
 }
 
-TEST(Storage, OnAFullDiskIsReadAndNotChanged) {
+TEST(StorageTest, OnAFullDiskIsReadAndNotChanged) {
     const std::string file = scratchFile("full.db");
     ASSERT_EQ(0, setOn(file, "5=7").exitCode);
     const RunOptions full{.diskFull = true};
@@ -123,7 +123,7 @@ TEST(Storage, OnAFullDiskIsReadAndNotChanged) {
     EXPECT_EQ(kOwnValue, readWith(missing).out);
 }
 
-TEST(Storage, ThatMayOnlyBeReadIsReadWithAWarning) {
+TEST(StorageTest, ThatMayOnlyBeReadIsReadWithAWarning) {
     const std::string file = scratchFile("readonly.db");
     ASSERT_EQ(0, setOn(file, "5=7").exitCode);
     ASSERT_EQ(0, chmod(file.c_str(), 0444));
@@ -137,7 +137,7 @@ TEST(Storage, ThatMayOnlyBeReadIsReadWithAWarning) {
     EXPECT_EQ(1, setOn(file, "5=9").exitCode);
 }
 
-TEST(Storage, ThatLacksItsLastByteIsRefused) {
+TEST(StorageTest, ThatLacksItsLastByteIsRefused) {
     const std::string file = scratchFile("short.db");
     ASSERT_EQ(0, setOn(file, "5=7").exitCode);
     std::filesystem::resize_file(file, std::filesystem::file_size(file) - 1);
@@ -149,7 +149,7 @@ TEST(Storage, ThatLacksItsLastByteIsRefused) {
     EXPECT_FALSE(std::filesystem::exists(file + "-shm"));
 }
 
-TEST(Storage, WithAnAlteredValueReportsItAndDoesNotUseIt) {
+TEST(StorageTest, WithAnAlteredValueReportsItAndDoesNotUseIt) {
     const std::string file = scratchFile("altered.db");
     ASSERT_EQ(0, setOn(file, "5=7").exitCode);
     execute(file, "UPDATE settings SET value='9'");
@@ -164,7 +164,7 @@ TEST(Storage, WithAnAlteredValueReportsItAndDoesNotUseIt) {
     EXPECT_EQ("", readWith(file).err);
 }
 
-TEST(Storage, WithAnOverrideOutOfRangeReportsItAndDoesNotUseIt) {
+TEST(StorageTest, WithAnOverrideOutOfRangeReportsItAndDoesNotUseIt) {
     const std::string file = scratchFile("range.db");
     const Outcome console = mrtu({"console", "--sim", "--storage", file, "setid", "5", "300"});
     ASSERT_EQ("id 5 set to 300\n", console.out);
@@ -177,7 +177,7 @@ TEST(Storage, WithAnOverrideOutOfRangeReportsItAndDoesNotUseIt) {
 }
 
 // A key's number may be hexadecimal: the driver understands it, and so must the one who clears it.
-TEST(Storage, ClearsAnUnusedOverrideHoweverItsNodeIsWritten) {
+TEST(StorageTest, ClearsAnUnusedOverrideHoweverItsNodeIsWritten) {
     const std::string file = scratchFile("spelling.db");
     ASSERT_EQ(0, setOn(file, "5=7").exitCode);
     execute(file, "UPDATE settings SET key='tempNode0x05'");

@@ -16,7 +16,7 @@ Bytes bytesOf(std::string_view text) {
     return {text.begin(), text.end()};
 }
 
-class TraceText : public testing::Test {
+class TraceTextTest : public testing::Test {
   protected:
     void SetUp() override {
         setenv("TZ", "UTC", 1);
@@ -32,18 +32,18 @@ class TraceText : public testing::Test {
     std::string port_ = "com1";
 };
 
-TEST_F(TraceText, ShowsTimePortDirectionAndBytes) {
+TEST_F(TraceTextTest, ShowsTimePortDirectionAndBytes) {
     const Bytes bytes{0x01, 0x0A, 0xFF};
     EXPECT_EQ("01:46:40.007 com1 > 01 0A FF", lineOf({}, TraceDirection::Sent, bytes));
     EXPECT_EQ("01:46:40.007 com1 < 01 0A FF", lineOf({}, TraceDirection::Received, bytes));
 }
 
-TEST_F(TraceText, TellsThatAFrameWasCutShort) {
+TEST_F(TraceTextTest, TellsThatAFrameWasCutShort) {
     EXPECT_EQ("01:46:40.007 com1 < 01 (cut)",
               lineOf({.meaning = true}, TraceDirection::Received, Bytes{0x01}, false));
 }
 
-TEST_F(TraceText, ShowsAsciiFramesAsCharacters) {
+TEST_F(TraceTextTest, ShowsAsciiFramesAsCharacters) {
     const TraceStyle ascii{.ascii = true};
     EXPECT_EQ("01:46:40.007 com1 > :010300000001FB",
               lineOf(ascii, TraceDirection::Sent, bytesOf(":010300000001FB\r\n")));
@@ -54,19 +54,19 @@ TEST_F(TraceText, ShowsAsciiFramesAsCharacters) {
               lineOf(ascii, TraceDirection::Received, bytesOf(":01\n")));
 }
 
-TEST_F(TraceText, ShowsTheBytesOfAsciiFramesWhenAsked) {
+TEST_F(TraceTextTest, ShowsTheBytesOfAsciiFramesWhenAsked) {
     EXPECT_EQ("01:46:40.007 com1 > 3A 30 31 0D 0A",
               lineOf({.ascii = true, .hex = true}, TraceDirection::Sent, bytesOf(":01\r\n")));
 }
 
-TEST_F(TraceText, AddsTheMeaning) {
+TEST_F(TraceTextTest, AddsTheMeaning) {
     EXPECT_EQ("01:46:40.007 com1 > :010300090001F2 | node 1: read 1 holding register at 9",
               lineOf({.ascii = true, .meaning = true}, TraceDirection::Sent,
                      bytesOf(":010300090001F2\r\n")));
 }
 
 /// Requests on several lines do not mix.
-TEST_F(TraceText, KnowsWhichRequestAReplyAnswers) {
+TEST_F(TraceTextTest, KnowsWhichRequestAReplyAnswers) {
     cli::TraceText text({.meaning = true});
     const Bytes one{0x01, 0x01, 0x00, 0x00, 0x00, 0x02, 0xBD, 0xCB};
     const Bytes other{0x01, 0x01, 0x00, 0x00, 0x00, 0x08, 0x3D, 0xCC};

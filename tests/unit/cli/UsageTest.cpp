@@ -22,7 +22,7 @@ void expectComplaints(const std::string& err) {
     EXPECT_GT(count, 0);
 }
 
-TEST(Usage, WrongCommandLinesExitWithTwo) {
+TEST(UsageTest, WrongCommandLinesExitWithTwo) {
     const std::vector<std::string> rows[] = {
         {},
         {"nonsense"},
@@ -51,7 +51,7 @@ TEST(Usage, WrongCommandLinesExitWithTwo) {
     }
 }
 
-TEST(Usage, WhatIsUnknownIsAnsweredWithWhatIsAccepted) {
+TEST(UsageTest, WhatIsUnknownIsAnsweredWithWhatIsAccepted) {
     const struct {
         std::vector<std::string> words;
         const char* answer;
@@ -90,7 +90,7 @@ TEST(Usage, WhatIsUnknownIsAnsweredWithWhatIsAccepted) {
     }
 }
 
-TEST(Usage, ShortFormsRefuseWhatTheDriverWouldTakeForSomethingElse) {
+TEST(UsageTest, ShortFormsRefuseWhatTheDriverWouldTakeForSomethingElse) {
     for (const char* const option :
          {"--baud", "--parity", "--stopbits", "--node", "--model", "--timeout"}) {
         for (const char* const value : {"abc", "", "0x10", "999999999999", "-1"}) {
@@ -105,7 +105,7 @@ TEST(Usage, ShortFormsRefuseWhatTheDriverWouldTakeForSomethingElse) {
               mrtu({"console", "--timeout", "010", "--set", "repeat=2", "getmaxtm"}).out);
 }
 
-TEST(Usage, WithJsonEveryFailureIsJson) {
+TEST(UsageTest, WithJsonEveryFailureIsJson) {
     const std::vector<std::string> rows[] = {
         {"read"},
         {"read", "--bogus", kUri},
@@ -148,7 +148,7 @@ bool hasLineFor(const std::string& text, const std::string& front) {
     return text.find('\n' + front) != std::string::npos;
 }
 
-TEST(Usage, EveryCommandStandsInTheHelpAndInTheDocuments) {
+TEST(UsageTest, EveryCommandStandsInTheHelpAndInTheDocuments) {
     const std::string help = mrtu({"--help"}).out;
     const std::string page = cli_test::contentsOf(SOURCE_FOLDER "/docs/command-line.md");
     const std::string readme = cli_test::contentsOf(SOURCE_FOLDER "/README.md");
@@ -166,7 +166,7 @@ TEST(Usage, EveryCommandStandsInTheHelpAndInTheDocuments) {
     EXPECT_EQ(9, count);
 }
 
-TEST(Usage, EveryCommandExplainsItselfWithExamples) {
+TEST(UsageTest, EveryCommandExplainsItselfWithExamples) {
     for (const char* const command :
          {"read", "write", "console", "override", "info", "describe", "check", "inspect", "sim"}) {
         const Outcome outcome = mrtu({command, "--help"});
@@ -179,13 +179,13 @@ TEST(Usage, EveryCommandExplainsItselfWithExamples) {
     EXPECT_NE(outcome.out.find("Exit codes:"), std::string::npos);
 }
 
-TEST(Usage, VersionIsTheProjects) {
+TEST(UsageTest, VersionIsTheProjects) {
     const Outcome outcome = mrtu({"--version"});
     EXPECT_EQ("mrtu " MRTU_VERSION "\n", outcome.out);
     EXPECT_EQ(0, outcome.exitCode);
 }
 
-TEST(Configuration, ThatTheDriverRefusesIsAUsageError) {
+TEST(UsageTest, ConfigurationThatTheDriverRefusesIsAUsageError) {
     const struct {
         const char* text;
         const char* complaint;
@@ -210,14 +210,14 @@ TEST(Configuration, ThatTheDriverRefusesIsAUsageError) {
     }
 }
 
-TEST(Configuration, ThatCannotBeReadIsAUsageError) {
+TEST(UsageTest, ConfigurationThatCannotBeReadIsAUsageError) {
     const std::string missing = cli_test::scratchFolder() + "/none.cfg";
     const Outcome outcome = mrtu({"read", "--sim", "--config", missing, kUri});
     EXPECT_EQ("mrtu: configuration " + missing + ": No such file or directory\n", outcome.err);
     EXPECT_EQ(2, outcome.exitCode);
 }
 
-TEST(Info, TellsWhatTheDriverSaysOfItself) {
+TEST(UsageTest, InfoTellsWhatTheDriverSaysOfItself) {
     const Outcome outcome = mrtu({"info", "--plugin", MRTU_PLUGIN});
     EXPECT_EQ("plug-in        " MRTU_PLUGIN
               "\n"

@@ -15,7 +15,7 @@ bool sentAnything(const Outcome& outcome) {
     return outcome.err.find(" > ") != std::string::npos;
 }
 
-TEST(Write, EveryTypeIsReadBackAsItWasWritten) {
+TEST(WriteTest, EveryTypeIsReadBackAsItWasWritten) {
     const std::vector<std::string> assignments{
         "1?OUTP?1?boolean=1",
         "1?OUTP?9?boolean-10=1,0,1,1,0,0,1,1,1,0",
@@ -59,7 +59,7 @@ TEST(Write, EveryTypeIsReadBackAsItWasWritten) {
     EXPECT_EQ(0, outcome.exitCode);
 }
 
-TEST(Write, TheDeviceHoldsItAfterwards) {
+TEST(WriteTest, TheDeviceHoldsItAfterwards) {
     const RunningSim sim({});
     const Outcome written = mrtu(
         {"write", "--port", sim.device(), "1?HREG?400001?short=0x7f", "1?OUTP?1?boolean=true"});
@@ -70,7 +70,7 @@ TEST(Write, TheDeviceHoldsItAfterwards) {
     EXPECT_EQ("1?HREG?400001?short = 127\n1?OUTP?1?boolean = 1\n", read.out) << read.err;
 }
 
-TEST(Write, OneWrongAssignmentAndNothingIsSent) {
+TEST(WriteTest, OneWrongAssignmentAndNothingIsSent) {
     const std::string good = "1?HREG?400001?short=1";
     const struct {
         const char* wrong;
@@ -96,7 +96,7 @@ TEST(Write, OneWrongAssignmentAndNothingIsSent) {
     EXPECT_TRUE(sentAnything(mrtu({"write", "--sim", "--trace", good})));
 }
 
-TEST(Write, AFailureDoesNotStopTheOthers) {
+TEST(WriteTest, AFailureDoesNotStopTheOthers) {
     const Outcome outcome =
         mrtu({"write", "--sim", "--timeout", "100", "--set", "repeat=0", "1?HREG?410001?short=1",
               "77?HREG?400001?short=1", "1?HREG?400001?short=1"});
@@ -108,7 +108,7 @@ TEST(Write, AFailureDoesNotStopTheOthers) {
     EXPECT_EQ(5, outcome.exitCode);
 }
 
-TEST(Write, VerifyNoticesADeviceThatHoldsSomethingElse) {
+TEST(WriteTest, VerifyNoticesADeviceThatHoldsSomethingElse) {
     // The first answer, the acknowledgement, is only late; the second tells of a 6.
     const RunningSim sim({"--fault", "delay=1", "--fault", "send=01030200063846"});
     const Outcome outcome =
@@ -118,7 +118,7 @@ TEST(Write, VerifyNoticesADeviceThatHoldsSomethingElse) {
     EXPECT_EQ(1, outcome.exitCode);
 }
 
-TEST(Write, TheConfiguredFunctionIsUsed) {
+TEST(WriteTest, TheConfiguredFunctionIsUsed) {
     const Outcome outcome =
         mrtu({"write", "--sim", "--trace", "--set", "presetFunction=06", "1?HREG?400001?short=7"});
     EXPECT_NE(outcome.err.find(" com1 > 01 06 00 00 00 07 C8 08\n"), std::string::npos)
@@ -127,7 +127,7 @@ TEST(Write, TheConfiguredFunctionIsUsed) {
 }
 
 // Function 5 writes one coil, and of an array the driver sends each the first eight's values.
-TEST(Write, AnArrayOfCoilsGoesCoilByCoilWithFunctionFive) {
+TEST(WriteTest, AnArrayOfCoilsGoesCoilByCoilWithFunctionFive) {
     const RunningSim sim({});
     for (const char* const key : {"forceFunction=05", "Node1::forceFunction=5"}) {
         const Outcome written = mrtu({"write", "--port", sim.device(), "--trace", "--set", key,
@@ -140,7 +140,7 @@ TEST(Write, AnArrayOfCoilsGoesCoilByCoilWithFunctionFive) {
     }
 }
 
-TEST(Write, AnArrayThatBreaksOffTellsWhatWasWritten) {
+TEST(WriteTest, AnArrayThatBreaksOffTellsWhatWasWritten) {
     const Outcome outcome = mrtu({"write", "--sim", "--set", "forceFunction=05",
                                   "1?OUTP?9999?boolean-4=1,1,1,1", "1?OUTP?10001?boolean-2=1,1"});
     EXPECT_EQ(
@@ -154,7 +154,7 @@ TEST(Write, AnArrayThatBreaksOffTellsWhatWasWritten) {
 
 const std::vector<std::string> kBriefly{"write", "--sim", "--timeout", "20", "--set", "repeat=0"};
 
-TEST(Write, ABroadcastExpectsNoAnswer) {
+TEST(WriteTest, ABroadcastExpectsNoAnswer) {
     std::vector<std::string> words = kBriefly;
     words.push_back("0?HREG?400001?short=5");
     const Outcome text = mrtu(words);
@@ -173,7 +173,7 @@ TEST(Write, ABroadcastExpectsNoAnswer) {
 }
 
 // Nobody answers its first request, so the driver never sends the second.
-TEST(Write, ABroadcastOfSeveralRequestsIsRefused) {
+TEST(WriteTest, ABroadcastOfSeveralRequestsIsRefused) {
     const struct {
         std::vector<std::string> options;
         const char* assignment;
@@ -201,7 +201,7 @@ TEST(Write, ABroadcastOfSeveralRequestsIsRefused) {
     }
 }
 
-TEST(Write, AnOverrideToZeroMakesABroadcastOfIt) {
+TEST(WriteTest, AnOverrideToZeroMakesABroadcastOfIt) {
     const std::string storage = cli_test::scratchFile("broadcast.db");
     mrtu({"override", "set", "--sim", "--storage", storage, "node", "5=0"});
     std::vector<std::string> words = kBriefly;
@@ -222,7 +222,7 @@ TEST(Write, AnOverrideToZeroMakesABroadcastOfIt) {
     EXPECT_EQ(4, mrtu(words).exitCode);
 }
 
-TEST(Write, WhatIsRefusedIsJsonToo) {
+TEST(WriteTest, WhatIsRefusedIsJsonToo) {
     const Outcome outcome = mrtu({"write", "--sim", "--json", "1?HREG?400002?short=x"});
     const auto document = nlohmann::json::parse(outcome.out);
     EXPECT_EQ(2, document["exitCode"]);
@@ -232,13 +232,13 @@ TEST(Write, WhatIsRefusedIsJsonToo) {
     EXPECT_EQ(2, outcome.exitCode);
 }
 
-TEST(Write, AValueThatTheDriversOwnAreaRefusesIsAFailure) {
+TEST(WriteTest, AValueThatTheDriversOwnAreaRefusesIsAFailure) {
     const Outcome outcome = mrtu({"write", "--sim", "1?SP_Stop?0?unsignedByte=7"});
     EXPECT_EQ("mrtu: 1?SP_Stop?0?unsignedByte: error 1: refused\n", outcome.err);
     EXPECT_EQ(2, outcome.exitCode);
 }
 
-TEST(Write, JsonTellsWhatWasWritten) {
+TEST(WriteTest, JsonTellsWhatWasWritten) {
     const Outcome outcome = mrtu({"write", "--sim", "--json", "1?HREG?400001?short=-5"});
     EXPECT_EQ(
         nlohmann::json::parse(R"([{"uri": "1?HREG?400001?short", "type": "short", "value": -5}])"),

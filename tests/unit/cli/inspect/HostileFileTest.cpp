@@ -56,7 +56,7 @@ bool has(const std::string& text, const std::string& part) {
     return text.find(part) != std::string::npos;
 }
 
-TEST(HostileFile, VersionListThatLeadsBackEnds) {
+TEST(HostileFileTest, VersionListThatLeadsBackEnds) {
     for (const std::uint32_t way : {0xFFFFFFF0U, 0x80000000U, 0xFFFFFFFFU, 1U, 4U}) {
         MutableFile file(PLUGIN);
         const Elf64_Shdr needs = sectionOf(file, SHT_GNU_verneed);
@@ -67,7 +67,7 @@ TEST(HostileFile, VersionListThatLeadsBackEnds) {
     }
 }
 
-TEST(HostileFile, ListOfVersionsThatLeadsBackEnds) {
+TEST(HostileFileTest, ListOfVersionsThatLeadsBackEnds) {
     for (const std::uint32_t way : {0xFFFFFFF0U, 0x80000000U, 1U}) {
         MutableFile file(PLUGIN);
         const Elf64_Shdr needs = sectionOf(file, SHT_GNU_verneed);
@@ -78,7 +78,7 @@ TEST(HostileFile, ListOfVersionsThatLeadsBackEnds) {
     }
 }
 
-TEST(HostileFile, OneSectionGivenAThousandTimesIsNotReadAThousandTimes) {
+TEST(HostileFileTest, OneSectionGivenAThousandTimesIsNotReadAThousandTimes) {
     // Every section header of the file becomes a dynamic section over the whole file, and the
     // table is said to be as long as it can be.
     MutableFile file(PLUGIN);
@@ -104,19 +104,19 @@ TEST(HostileFile, OneSectionGivenAThousandTimesIsNotReadAThousandTimes) {
     EXPECT_TRUE(has(outcomeOf(file.path()), "there is no end to what it holds"));
 }
 
-TEST(HostileFile, SectionsCountedElsewhereAreRefused) {
+TEST(HostileFileTest, SectionsCountedElsewhereAreRefused) {
     MutableFile file(PLUGIN);
     file.putValue(offsetof(Elf64_Ehdr, e_shnum), std::uint16_t{0});
     EXPECT_TRUE(has(outcomeOf(file.path()), "more than 65000 sections"));
 }
 
-TEST(HostileFile, FileBeyondAllMeasureIsNotRead) {
+TEST(HostileFileTest, FileBeyondAllMeasureIsNotRead) {
     MutableFile file(OTHER_LIBRARY);
     file.resizeTo(kLargestLibrary + 1);
     EXPECT_TRUE(has(outcomeOf(file.path()), "larger than 128 MiB"));
 }
 
-TEST(HostileFile, NameWithoutEndIsNone) {
+TEST(HostileFileTest, NameWithoutEndIsNone) {
     MutableFile file(PLUGIN);
     const Elf64_Shdr strings = sectionOf(file, SHT_STRTAB);
     for (std::uint64_t i = 0; i < strings.sh_size; ++i)
@@ -125,7 +125,7 @@ TEST(HostileFile, NameWithoutEndIsNone) {
     EXPECT_TRUE(ElfLibrary::read(file.path()).defined.empty());
 }
 
-TEST(HostileFile, WhatIsNoFileIsNotOpened) {
+TEST(HostileFileTest, WhatIsNoFileIsNotOpened) {
     const SampleFiles files;
     const std::string pipe = files.path("pipe");
     ASSERT_EQ(0, mkfifo(pipe.c_str(), 0600));
@@ -137,7 +137,7 @@ TEST(HostileFile, WhatIsNoFileIsNotOpened) {
     }
 }
 
-TEST(HostileFile, TextsReachNeitherTerminalNorJsonAsTheyAre) {
+TEST(HostileFileTest, TextsReachNeitherTerminalNorJsonAsTheyAre) {
     MutableFile file(PLUGIN);
     const std::string marker = "<<ICOM_XML_START>>";
     const auto& bytes = file.original();
@@ -155,7 +155,7 @@ TEST(HostileFile, TextsReachNeitherTerminalNorJsonAsTheyAre) {
     EXPECT_TRUE(Json::parse(json.out).at("header").get<std::string>().starts_with("\x1b[2J"));
 }
 
-TEST(HostileFile, NamesDoNotGrowBeyondReason) {
+TEST(HostileFileTest, NamesDoNotGrowBeyondReason) {
     EXPECT_EQ("ProtgenTag::PackedLen() const", readableName("_ZNK10ProtgenTag9PackedLenEv"));
     EXPECT_EQ("main", readableName("main"));
     EXPECT_EQ("i", readableName("i")) << "not the type int";
@@ -211,7 +211,7 @@ void tryMutations(const std::string& original, unsigned seed, int rounds,
     }
 }
 
-TEST(HostileFile, ThousandsOfMutationsAllEnd) {
+TEST(HostileFileTest, ThousandsOfMutationsAllEnd) {
     int refused = 0;
     const auto look = [&refused](const std::string& path) {
         if (outcomeOf(path) != "read") ++refused;
@@ -224,7 +224,7 @@ TEST(HostileFile, ThousandsOfMutationsAllEnd) {
     EXPECT_LT(refused, 3000);
 }
 
-TEST(HostileFile, MutationsReachTheUserAsPlainText) {
+TEST(HostileFileTest, MutationsReachTheUserAsPlainText) {
     const auto look = [](const std::string& path) {
         const Outcome outcome = runInProcess({"inspect", path});
         EXPECT_TRUE(outcome.code == 0 || outcome.code == 1) << outcome.code;

@@ -1,7 +1,6 @@
 // The sub-command as it is typed.
 #include <gtest/gtest.h>
 
-#include <iostream>
 #include <utility>
 #include <vector>
 
@@ -21,7 +20,7 @@ bool has(const std::string& text, const std::string& part) {
     return text.find(part) != std::string::npos;
 }
 
-TEST(InspectCommand, PluginForThisMachineIsAskedItselfWhenWanted) {
+TEST(InspectCommandTest, PluginForThisMachineIsAskedItselfWhenWanted) {
     const Outcome outcome = inspect({"--load", PLUGIN});
     EXPECT_EQ(0, outcome.code) << outcome.err;
     for (const char* line :
@@ -30,7 +29,7 @@ TEST(InspectCommand, PluginForThisMachineIsAskedItselfWhenWanted) {
         EXPECT_TRUE(has(outcome.out, line)) << line << "in\n" << outcome.out;
 }
 
-TEST(InspectCommand, JsonHoldsTheSame) {
+TEST(InspectCommandTest, JsonHoldsTheSame) {
     const Outcome outcome = inspect({"--json", "--load", PLUGIN});
     ASSERT_EQ(0, outcome.code) << outcome.err;
     const Json json = Json::parse(outcome.out);
@@ -43,7 +42,7 @@ TEST(InspectCommand, JsonHoldsTheSame) {
     EXPECT_FALSE(json.contains("notLoaded"));
 }
 
-TEST(InspectCommand, ForeignFileIsNeverExecuted) {
+TEST(InspectCommandTest, ForeignFileIsNeverExecuted) {
     const SampleFiles files;
     const std::string engine = files.foreignCopyOf(ENGINE);
     const Outcome outcome = inspect({"--json", "--load", files.foreignCopyOf(PLUGIN)});
@@ -53,7 +52,7 @@ TEST(InspectCommand, ForeignFileIsNeverExecuted) {
     EXPECT_EQ("another architecture; nothing of it was executed", json.at("notLoaded"));
 }
 
-TEST(InspectCommand, LibraryWithoutEntryIsNotLoaded) {
+TEST(InspectCommandTest, LibraryWithoutEntryIsNotLoaded) {
     // Its constructor would end this process.
     const Outcome outcome = inspect({"--load", OTHER_LIBRARY});
     EXPECT_EQ(1, outcome.code);
@@ -61,7 +60,7 @@ TEST(InspectCommand, LibraryWithoutEntryIsNotLoaded) {
     EXPECT_TRUE(has(outcome.out, "not loaded     it is not complete\n")) << outcome.out;
 }
 
-TEST(InspectCommand, PluginWithoutEngineIsNamedIncomplete) {
+TEST(InspectCommandTest, PluginWithoutEngineIsNamedIncomplete) {
     const SampleFiles files;
     const Outcome outcome = inspect({files.copyOf(PLUGIN)});
     EXPECT_EQ(1, outcome.code);
@@ -69,7 +68,7 @@ TEST(InspectCommand, PluginWithoutEngineIsNamedIncomplete) {
     EXPECT_TRUE(has(outcome.out, "ProtgenTag::PackedLen() const\n")) << outcome.out;
 }
 
-TEST(InspectCommand, NothingOfTheFileIsExecutedUnlessWanted) {
+TEST(InspectCommandTest, NothingOfTheFileIsExecutedUnlessWanted) {
     // Its constructor would end this process.
     const Outcome outcome = inspect({DEADLY_PLUGIN});
     EXPECT_EQ(0, outcome.code) << outcome.err;
@@ -80,19 +79,13 @@ TEST(InspectCommand, NothingOfTheFileIsExecutedUnlessWanted) {
     EXPECT_TRUE(Json::parse(inspect({"--json", DEADLY_PLUGIN}).out).contains("notLoaded"));
 }
 
-TEST(InspectCommandDeathTest, LoadingIsAnnouncedBeforeItHappens) {
-    const char* const words[] = {"mrtu", "inspect", "--load", DEADLY_PLUGIN};
-    EXPECT_EXIT(runCommandLine(4, words, std::cout, std::cerr), testing::ExitedWithCode(99),
-                "^mrtu: loading .*: its start-up code runs now\n$");
-}
-
-TEST(InspectCommand, UnknownProtocolIsAFailure) {
+TEST(InspectCommandTest, UnknownProtocolIsAFailure) {
     const Outcome outcome = inspect({"--load", "--protocol", "MTCP", PLUGIN});
     EXPECT_EQ(1, outcome.code);
     EXPECT_TRUE(has(outcome.out, "not loaded     ")) << outcome.out;
 }
 
-TEST(InspectCommand, FileThatCannotBeReadIsComplainedAbout) {
+TEST(InspectCommandTest, FileThatCannotBeReadIsComplainedAbout) {
     const Outcome outcome = inspect({"/nonexistent.so"});
     EXPECT_EQ(1, outcome.code);
     EXPECT_EQ("mrtu: /nonexistent.so: No such file or directory\n", outcome.err);

@@ -26,7 +26,7 @@ const NeededLibrary* needed(const Inspection& found, const std::string& name) {
     return nullptr;
 }
 
-TEST(Inspection, PluginBesideItsEngineIsComplete) {
+TEST(InspectionTest, PluginBesideItsEngineIsComplete) {
     const Inspection found = inspect(PLUGIN);
     EXPECT_TRUE(found.runsHere);
     EXPECT_TRUE(found.hasEntry);
@@ -38,7 +38,7 @@ TEST(Inspection, PluginBesideItsEngineIsComplete) {
     EXPECT_EQ(ENGINE, needed(found, "libprotgen.so")->file);
 }
 
-TEST(Inspection, PluginAloneMissesItsEngine) {
+TEST(InspectionTest, PluginAloneMissesItsEngine) {
     const SampleFiles files;
     const Inspection found = inspect(files.copyOf(PLUGIN));
     EXPECT_TRUE(found.hasEntry);
@@ -53,7 +53,7 @@ TEST(Inspection, PluginAloneMissesItsEngine) {
         << ::testing::PrintToString(found.missing);
 }
 
-TEST(Inspection, EngineBesideIsFound) {
+TEST(InspectionTest, EngineBesideIsFound) {
     const SampleFiles files;
     const std::string engine = files.copyOf(ENGINE);
     const Inspection found = inspect(files.copyOf(PLUGIN));
@@ -61,7 +61,7 @@ TEST(Inspection, EngineBesideIsFound) {
     EXPECT_EQ(engine, needed(found, "libprotgen.so")->file);
 }
 
-TEST(Inspection, EngineForAnotherArchitectureIsNotTheOne) {
+TEST(InspectionTest, EngineForAnotherArchitectureIsNotTheOne) {
     const SampleFiles files;
     files.foreignCopyOf(ENGINE);
     const Inspection found = inspect(files.copyOf(PLUGIN));
@@ -69,14 +69,14 @@ TEST(Inspection, EngineForAnotherArchitectureIsNotTheOne) {
     EXPECT_FALSE(found.isComplete());
 }
 
-TEST(Inspection, AnotherLibraryHasNoEntry) {
+TEST(InspectionTest, AnotherLibraryHasNoEntry) {
     const Inspection found = inspect(OTHER_LIBRARY);
     EXPECT_FALSE(found.hasEntry);
     EXPECT_FALSE(found.isComplete());
     EXPECT_EQ("", found.descriptionHeader);
 }
 
-TEST(Inspection, ForeignFileIsReadAllTheSame) {
+TEST(InspectionTest, ForeignFileIsReadAllTheSame) {
     const SampleFiles files;
     const Inspection found = inspect(files.foreignCopyOf(PLUGIN));
     EXPECT_FALSE(found.runsHere);
@@ -85,7 +85,7 @@ TEST(Inspection, ForeignFileIsReadAllTheSame) {
     EXPECT_TRUE(found.descriptionHeader.starts_with("Name=MRTU?")) << found.descriptionHeader;
 }
 
-TEST(Inspection, WhatIsNoLibraryIsRefused) {
+TEST(InspectionTest, WhatIsNoLibraryIsRefused) {
     const SampleFiles files;
     EXPECT_EQ("/nonexistent.so: No such file or directory", refusalOf("/nonexistent.so"));
     EXPECT_EQ("/etc/passwd: not an ELF file", refusalOf("/etc/passwd"));
@@ -94,7 +94,7 @@ TEST(Inspection, WhatIsNoLibraryIsRefused) {
     EXPECT_EQ(empty + ": not an ELF file", refusalOf(empty));
 }
 
-TEST(Inspection, TruncatedFilesNeitherCrashNorCount) {
+TEST(InspectionTest, TruncatedFilesNeitherCrashNorCount) {
     const auto whole = std::filesystem::file_size(PLUGIN);
     for (std::uintmax_t length = 1; length < whole; length = length * 3 / 2 + 1) {
         const SampleFiles files;

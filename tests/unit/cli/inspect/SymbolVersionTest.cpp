@@ -5,7 +5,7 @@
 namespace cli {
 namespace {
 
-TEST(NewestGlibc, ComparesByNumberAndIgnoresOtherVersions) {
+TEST(SymbolVersionTest, ComparesByNumberAndIgnoresOtherVersions) {
     const struct {
         std::vector<std::string> versions;
         std::string newest;

@@ -10,11 +10,11 @@ using testing::Not;
 namespace manual_test {
 namespace {
 
-TEST(Completion, TextsAreQuotedForTheShells) {
+TEST(CompletionTest, TextsAreQuotedForTheShells) {
     EXPECT_EQ("'it'\\''s $5'", cli::manual::shellQuoted("it's $5"));
 }
 
-TEST(Completion, NoScriptTellsOfWhatIsHidden) {
+TEST(CompletionTest, NoScriptTellsOfWhatIsHidden) {
     const auto program = sampleProgram();
     for (const std::string& script :
          {cli::manual::bashCompletion(program), cli::manual::zshCompletion(program),
@@ -25,19 +25,19 @@ TEST(Completion, NoScriptTellsOfWhatIsHidden) {
     }
 }
 
-TEST(Completion, BashKnowsTheChoicesOfAnOption) {
+TEST(CompletionTest, BashKnowsTheChoicesOfAnOption) {
     EXPECT_THAT(cli::manual::bashCompletion(sampleProgram()),
                 HasSubstr("'fetch --parity') words='none even odd' ;;\n"));
 }
 
-TEST(Completion, ZshTextsCannotEndTheirSpecification) {
+TEST(CompletionTest, ZshTextsCannotEndTheirSpecification) {
     EXPECT_THAT(cli::manual::zshCompletion(sampleProgram()),
                 HasSubstr("'--file=[Where\\: a path]:FILE:_files'"));
     EXPECT_THAT(cli::manual::zshCompletion(sampleProgram()),
                 HasSubstr("'fetch:Fetch it'\\''s [all]'"));
 }
 
-TEST(Completion, FishTellsCommandsOfTheSameNameApart) {
+TEST(CompletionTest, FishTellsCommandsOfTheSameNameApart) {
     EXPECT_THAT(
         cli::manual::fishCompletion(sampleProgram()),
         HasSubstr("complete -c tool -n 'test (__tool_command) = \"store set\"' -l file -r -F"));

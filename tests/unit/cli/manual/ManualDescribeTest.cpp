@@ -18,7 +18,7 @@ const Option& optionOf(const Command& command, const std::string& name) {
     throw std::logic_error("no such option: " + name);
 }
 
-TEST(ManualDescribe, CommandsStandInTheOrderOfTheirDeclarationWithoutHiddenOnes) {
+TEST(ManualDescribeTest, CommandsStandInTheOrderOfTheirDeclarationWithoutHiddenOnes) {
     const Command program = sampleProgram();
     std::vector<std::string> paths;
     for (const Command* each : withSubcommands(program))
@@ -26,38 +26,38 @@ TEST(ManualDescribe, CommandsStandInTheOrderOfTheirDeclarationWithoutHiddenOnes)
     EXPECT_THAT(paths, ElementsAre("", "fetch", "store", "store set", "store list"));
 }
 
-TEST(ManualDescribe, HiddenOptionsAreLeftOut) {
+TEST(ManualDescribeTest, HiddenOptionsAreLeftOut) {
     const Command program = sampleProgram();
     for (const Option& option : commandOf(program, "fetch").options)
         EXPECT_THAT(option.names, testing::Not(testing::Contains("--hidden")));
 }
 
-TEST(ManualDescribe, AFlagTakesNoValue) {
+TEST(ManualDescribeTest, AFlagTakesNoValue) {
     const Command program = sampleProgram();
     const Option& quiet = optionOf(commandOf(program, "fetch"), "--quiet");
     EXPECT_FALSE(quiet.takesValue());
     EXPECT_THAT(quiet.names, ElementsAre("-q", "--quiet"));
 }
 
-TEST(ManualDescribe, ChoicesComeFromAListThatIsChecked) {
+TEST(ManualDescribeTest, ChoicesComeFromAListThatIsChecked) {
     const Command program = sampleProgram();
     EXPECT_THAT(optionOf(commandOf(program, "fetch"), "--colour").choices,
                 testing::UnorderedElementsAre("red", "blue"));
 }
 
-TEST(ManualDescribe, ChoicesComeFromAHelpTextWithBars) {
+TEST(ManualDescribeTest, ChoicesComeFromAHelpTextWithBars) {
     const Command program = sampleProgram();
     EXPECT_THAT(optionOf(commandOf(program, "fetch"), "--parity").choices,
                 ElementsAre("none", "even", "odd"));
 }
 
-TEST(ManualDescribe, FilesAreKnownByTheNameOfTheValue) {
+TEST(ManualDescribeTest, FilesAreKnownByTheNameOfTheValue) {
     const Command program = sampleProgram();
     EXPECT_TRUE(optionOf(commandOf(program, "fetch"), "--file").takesFile());
     EXPECT_FALSE(optionOf(commandOf(program, "fetch"), "--parity").takesFile());
 }
 
-TEST(ManualDescribe, PositionalsSayWhetherTheyAreNeededAndRepeated) {
+TEST(ManualDescribeTest, PositionalsSayWhetherTheyAreNeededAndRepeated) {
     const Command program = sampleProgram();
     const Command& fetch = commandOf(program, "fetch");
     ASSERT_EQ(1U, fetch.positionals.size());
@@ -66,7 +66,7 @@ TEST(ManualDescribe, PositionalsSayWhetherTheyAreNeededAndRepeated) {
     EXPECT_TRUE(fetch.positionals[0].repeated);
 }
 
-TEST(ManualDescribe, TheTextUnderTheOptionsIsCutAtItsTitles) {
+TEST(ManualDescribeTest, TheTextUnderTheOptionsIsCutAtItsTitles) {
     const Command program = sampleProgram();
     const Command& fetch = commandOf(program, "fetch");
     ASSERT_EQ(2U, fetch.sections.size());
