@@ -73,8 +73,9 @@ std::string TranscriptTest::decimals(const ITag& tag, const Bytes& value) {
         const bool negative =
             isSigned(ProtUtilsN::GetBasicType(&tag)) && (number >> (8 * length - 1) & 1U) != 0;
         if (negative) number = (std::uint64_t{1} << (8 * length)) - number;
-        text +=
-            (text.empty() ? "" : " ") + std::string(negative ? "-" : "") + std::to_string(number);
+        if (!text.empty()) text += ' ';
+        if (negative) text += '-';
+        text += std::to_string(number);
     }
     return text;
 }
