@@ -81,7 +81,7 @@ std::vector<sim::NodeOptions> nodesOf(const SimOptions& options) {
 
 std::unique_ptr<sim::Simulator> makeSimulator(CommandContext& context, const SimOptions& options) {
     sim::SimulatorOptions simOptions;
-    simOptions.mode = options.ascii ? sim::Mode::ascii : sim::Mode::rtu;
+    simOptions.mode = options.ascii ? wire::Mode::ascii : wire::Mode::rtu;
     simOptions.nodes = nodesOf(options);
     simOptions.link = options.link;
     if (options.trace) {

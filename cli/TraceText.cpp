@@ -5,9 +5,12 @@
 #include <ctime>
 
 #include "cli/TextEscapes.h"
+#include "wire/Hex.h"
 
 namespace cli {
 namespace {
+
+using wire::FrameMeaning;
 
 std::string timeOfDay(std::chrono::system_clock::time_point moment) {
     using std::chrono::milliseconds;
@@ -28,15 +31,6 @@ ByteView withoutLineEnd(ByteView bytes) {
 
 }  // namespace
 
-std::string hexText(ByteView bytes) {
-    std::string text;
-    for (const std::uint8_t byte : bytes) {
-        if (!text.empty()) text += ' ';
-        text += fmt::format("{:02X}", byte);
-    }
-    return text;
-}
-
 std::string TraceText::lineOf(const runtime::TraceEvent& event) {
     const bool sent = event.direction == runtime::TraceDirection::Sent;
     return fmt::format("{} {} {} {}{}", timeOfDay(event.realTime), event.port, sent ? '>' : '<',
@@ -45,12 +39,12 @@ std::string TraceText::lineOf(const runtime::TraceEvent& event) {
 
 std::string TraceText::frameOf(ByteView bytes) const {
     const bool characters = style_.ascii && !style_.hex;
-    return characters ? escapeText(withoutLineEnd(bytes)) : hexText(bytes);
+    return characters ? escapeText(withoutLineEnd(bytes)) : wire::hexText(bytes);
 }
 
 std::string TraceText::meaningOf(const runtime::TraceEvent& event) {
     if (!style_.meaning) return {};
-    const FrameMeaning fresh(style_.ascii ? sim::Mode::ascii : sim::Mode::rtu);
+    const FrameMeaning fresh(style_.ascii ? wire::Mode::ascii : wire::Mode::rtu);
     FrameMeaning& port = ports_.try_emplace(event.port, fresh).first->second;
     const bool sent = event.direction == runtime::TraceDirection::Sent;
     return " | " + (sent ? port.ofRequest(event.bytes) : port.ofReply(event.bytes));

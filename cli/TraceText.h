@@ -5,13 +5,10 @@
 #include <string>
 
 #include "cli/Bytes.h"
-#include "cli/FrameMeaning.h"
 #include "runtime/TracingSerialFactory.h"
+#include "wire/FrameMeaning.h"
 
 namespace cli {
-
-/// @return the bytes as two upper-case hexadecimal digits each, separated by blanks.
-std::string hexText(ByteView bytes);
 
 /// How frames are shown.
 struct TraceStyle {
@@ -36,7 +33,7 @@ class TraceText {
     std::string meaningOf(const runtime::TraceEvent& event);
 
     TraceStyle style_;
-    std::map<std::string, FrameMeaning> ports_;
+    std::map<std::string, wire::FrameMeaning> ports_;
 };
 
 }  // namespace cli

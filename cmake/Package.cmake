@@ -39,12 +39,12 @@ install(FILES plugin/ProtModule.h COMPONENT development DESTINATION ${MRTU_HEADE
 
 # The run time and the simulated line, for whoever writes a host.
 if(MRTU_TOOLS)
-  foreach(room runtime sim)
+  foreach(room wire sim runtime)
     set_target_properties(mrtu_${room} PROPERTIES EXPORT_NAME ${room})
     target_link_libraries(mrtu_${room} PUBLIC $<INSTALL_INTERFACE:mrtu_platform>)
   endforeach()
-  list(APPEND packaged mrtu_runtime mrtu_sim)
-  list(APPEND packaged_headers runtime sim)
+  list(APPEND packaged mrtu_wire mrtu_sim mrtu_runtime)
+  list(APPEND packaged_headers wire sim runtime)
 endif()
 
 install(TARGETS ${packaged} EXPORT mrtu

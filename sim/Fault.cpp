@@ -3,15 +3,19 @@
 #include <algorithm>
 #include <utility>
 
-#include "sim/Framing.h"
+#include "wire/Framing.h"
 
 namespace sim {
 namespace {
 
+using wire::Bytes;
+using wire::ByteView;
+using wire::Mode;
+
 Bytes spoiltFrame(Mode mode, ByteView reply, const Fault& fault) {
     Bytes message(reply.begin(), reply.end());
     if (fault.wrongNode && !message.empty()) ++message[0];
-    return fault.replacement.value_or(encodeFrame(mode, message, fault.wrongCheck));
+    return fault.replacement.value_or(wire::encodeFrame(mode, message, fault.wrongCheck));
 }
 
 }  // namespace

@@ -8,7 +8,7 @@
 #include <string>
 #include <string_view>
 
-#include "sim/Bytes.h"
+#include "wire/Bytes.h"
 
 namespace sim {
 
@@ -22,15 +22,15 @@ struct Fault {
     std::uint8_t exception = 0;  ///< Not executed; answered with this exception code (not 0).
 
     // The request is executed, its reply suffers:
-    bool wrongNode = false;              ///< The node is one too high, the check is right.
-    bool wrongCheck = false;             ///< All bits of CRC or LRC are inverted.
-    std::optional<std::size_t> keep{};   ///< Only so many bytes (characters) are sent; 0: lost.
-    std::optional<Bytes> replacement{};  ///< Sent as it is instead of the reply's frame.
-    Bytes noise{};                       ///< Bytes on the line right before the reply.
-    std::uint32_t delayMs = 0;           ///< Wait before the first byte.
-    std::size_t dripBytes = 0;           ///< Sent in pieces of so many bytes; 0: in one.
-    std::uint32_t dripGapMs = 0;         ///< Wait between two pieces.
-    bool hangUp = false;                 ///< Then (after `keep` bytes, or none) the line dies.
+    bool wrongNode = false;             ///< The node is one too high, the check is right.
+    bool wrongCheck = false;            ///< All bits of CRC or LRC are inverted.
+    std::optional<std::size_t> keep{};  ///< Only so many bytes (characters) are sent; 0: lost.
+    std::optional<wire::Bytes> replacement{};  ///< Sent as it is instead of the reply's frame.
+    wire::Bytes noise{};                       ///< Bytes on the line right before the reply.
+    std::uint32_t delayMs = 0;                 ///< Wait before the first byte.
+    std::size_t dripBytes = 0;                 ///< Sent in pieces of so many bytes; 0: in one.
+    std::uint32_t dripGapMs = 0;               ///< Wait between two pieces.
+    bool hangUp = false;  ///< Then (after `keep` bytes, or none) the line dies.
 
     bool operator==(const Fault&) const = default;
 };
@@ -43,7 +43,7 @@ std::optional<Fault> parseFault(std::string_view text, std::string& error);
 
 /// How a reply goes out.
 struct Transmission {
-    Bytes bytes;
+    wire::Bytes bytes;
     std::uint32_t delayMs = 0;
     std::size_t dripBytes = 0;  ///< 0: all in one piece.
     std::uint32_t dripGapMs = 0;
@@ -52,7 +52,7 @@ struct Transmission {
 
 /// Frames a reply, spoilt as the fault says. `silent` and `exception` are not looked at: they
 /// decide before there is a reply. With hangUp and without `keep` there are no bytes.
-Transmission transmit(Mode mode, ByteView reply, const Fault& fault);
+Transmission transmit(wire::Mode mode, wire::ByteView reply, const Fault& fault);
 
 /// The faults that wait for their requests; they come due in the order of their arrival.
 /// Threads: any thread may call.

@@ -5,10 +5,12 @@
 #include <limits>
 
 #include "sim/Fault.h"
-#include "sim/Hex.h"
+#include "wire/Hex.h"
 
 namespace sim {
 namespace {
+
+using wire::Bytes;
 
 /// Reads the value of a part into the fault. @return whether it could.
 using Setter = bool (*)(std::string_view value, Fault& fault);
@@ -24,7 +26,7 @@ bool readNumber(std::string_view text, Number min, Number max, Number& out) {
 }
 
 bool readHex(std::string_view text, Bytes& out) {
-    const auto bytes = fromHex(Bytes(text.begin(), text.end()));
+    const auto bytes = wire::fromHex(Bytes(text.begin(), text.end()));
     if (!bytes) return false;
     out = *bytes;
     return true;

@@ -6,6 +6,9 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+using wire::ByteView;
+
 enum class Shape : std::uint8_t { read, writeOne, writeMany };
 
 /// A function code. Source of the limits: Modbus Application Protocol V1.1b3, 6.1 to 6.12.

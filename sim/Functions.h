@@ -3,8 +3,8 @@
 
 #include <optional>
 
-#include "sim/Bytes.h"
 #include "sim/Memory.h"
+#include "wire/Bytes.h"
 
 namespace sim {
 
@@ -19,10 +19,10 @@ enum class Exception : std::uint8_t {
 /// @param request  Function and data, without node and check; at least the function.
 /// @return the reply in the same form, perhaps an exception. `memory` changes only when the
 /// request is valid as a whole.
-Bytes execute(Memory& memory, ByteView request);
+wire::Bytes execute(Memory& memory, wire::ByteView request);
 
 /// @return the reply that carries an exception code.
-Bytes exceptionReply(std::uint8_t function, std::uint8_t code);
+wire::Bytes exceptionReply(std::uint8_t function, std::uint8_t code);
 
 /// Whether the function changes memory, so that it may be broadcast.
 bool isWrite(std::uint8_t function);
@@ -30,9 +30,9 @@ bool isWrite(std::uint8_t function);
 /// How long an RTU request is, check included, judged by its first bytes.
 /// @param longAt  Whether the request's node has a 32-bit register at its address.
 /// @return nothing when more bytes are needed or the function is unknown.
-std::optional<std::size_t> lengthOfRequest(ByteView firstBytes, bool longAt);
+std::optional<std::size_t> lengthOfRequest(wire::ByteView firstBytes, bool longAt);
 
 /// The start address of a request that begins with its node; nothing when it is not there yet.
-std::optional<std::uint16_t> addressOfRequest(ByteView firstBytes);
+std::optional<std::uint16_t> addressOfRequest(wire::ByteView firstBytes);
 
 }  // namespace sim

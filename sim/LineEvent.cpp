@@ -1,18 +1,12 @@
 #include "sim/LineEvent.h"
 
-#include "sim/Hex.h"
+#include "wire/Hex.h"
 
 namespace sim {
 namespace {
 
-std::string hexText(ByteView bytes) {
-    Bytes text;
-    for (const std::uint8_t byte : bytes) {
-        if (!text.empty()) text.push_back(' ');
-        putHex(text, byte);
-    }
-    return {text.begin(), text.end()};
-}
+using wire::ByteView;
+using wire::Mode;
 
 /// What cannot be printed becomes a point: the bytes come from outside.
 std::string characters(ByteView bytes) {
@@ -41,7 +35,7 @@ const char* nameOf(LineEvent::Kind kind) {
 }
 
 std::string describe(const LineEvent& event, Mode mode) {
-    const std::string bytes = mode == Mode::rtu ? hexText(event.raw) : characters(event.raw);
+    const std::string bytes = mode == Mode::rtu ? wire::hexText(event.raw) : characters(event.raw);
     return nameOf(event.kind) + (bytes.empty() ? "" : " " + bytes);
 }
 

@@ -4,7 +4,7 @@
 #include <chrono>
 #include <string>
 
-#include "sim/Bytes.h"
+#include "wire/Bytes.h"
 
 namespace sim {
 
@@ -17,7 +17,7 @@ struct LineEvent {
         hangUp,   ///< A fault ended the line; no bytes.
     };
     Kind kind = Kind::request;
-    Bytes raw;  ///< As on the line: RTU bytes or ASCII characters, check included.
+    wire::Bytes raw;  ///< As on the line: RTU bytes or ASCII characters, check included.
     std::chrono::steady_clock::time_point at{};
 };
 
@@ -27,6 +27,6 @@ const char* nameOf(LineEvent::Kind kind);
 /// @return one line of text: the kind's name, then the bytes in hexadecimal (RTU) or the characters
 /// without CR and LF (ASCII, a point for what cannot be printed). `request 01 03 00 00 00 01 84
 /// 0A`.
-std::string describe(const LineEvent& event, Mode mode);
+std::string describe(const LineEvent& event, wire::Mode mode);
 
 }  // namespace sim

@@ -84,7 +84,7 @@ void PtyLine::makeLink() {
     if (::symlink(device_.c_str(), link_.c_str()) != 0) fail(link_);
 }
 
-Bytes PtyLine::read() {
+wire::Bytes PtyLine::read() {
     std::array<std::uint8_t, 4096> buffer{};
     const ssize_t count = ::read(master_.get(), buffer.data(), buffer.size());
     if (count > 0) return {buffer.begin(), buffer.begin() + count};
@@ -93,7 +93,7 @@ Bytes PtyLine::read() {
     return {};
 }
 
-void PtyLine::write(ByteView bytes) {
+void PtyLine::write(wire::ByteView bytes) {
     while (!bytes.empty()) {
         const ssize_t count = ::write(master_.get(), bytes.data(), bytes.size());
         if (count < 0 && errno == EINTR) continue;

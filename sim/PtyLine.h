@@ -3,7 +3,7 @@
 
 #include <string>
 
-#include "sim/Bytes.h"
+#include "wire/Bytes.h"
 
 namespace sim {
 
@@ -47,10 +47,10 @@ class PtyLine {
     int descriptor() const { return master_.get(); }
 
     /// @return what has arrived; empty when nothing has. Never waits. A line that fails hangs up.
-    Bytes read();
+    wire::Bytes read();
 
     /// Sends. Never waits: bytes that nobody has room for are lost, as on a real line.
-    void write(ByteView bytes);
+    void write(wire::ByteView bytes);
 
     /// Closes the line and removes the link: the device vanishes and a master that has it open
     /// sees the end of file or EIO. A second call does nothing.

@@ -17,6 +17,11 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+using wire::ByteView;
+using wire::FrameSplitter;
+using wire::Received;
+
 constexpr auto kForever = std::chrono::steady_clock::time_point::max();
 
 Descriptor openEvent() {

@@ -1,6 +1,6 @@
 // A simulated line with Modbus nodes on a pseudo terminal, with faults on demand.
 //
-//     sim::Simulator simulator({.mode = sim::Mode::rtu, .nodes = {{.address = 1}}});
+//     sim::Simulator simulator({.mode = wire::Mode::rtu, .nodes = {{.address = 1}}});
 //     simulator.start();
 //     openPort(simulator.path());
 #pragma once
@@ -17,17 +17,17 @@
 #include <thread>
 #include <vector>
 
-#include "sim/Bytes.h"
 #include "sim/Fault.h"
-#include "sim/Framing.h"
 #include "sim/LineEvent.h"
 #include "sim/PtyLine.h"
 #include "sim/Slave.h"
+#include "wire/Bytes.h"
+#include "wire/Framing.h"
 
 namespace sim {
 
 struct SimulatorOptions {
-    Mode mode = Mode::rtu;
+    wire::Mode mode = wire::Mode::rtu;
     std::vector<NodeOptions> nodes = {NodeOptions{}};
     std::string link{};            ///< Symbolic link to the device, see PtyLine. Empty: none.
     std::uint32_t silenceMs = 20;  ///< Silence that ends an RTU frame of no announced length, 1..
@@ -69,7 +69,7 @@ class Simulator {
     std::string path() const;
     /// The device itself, /dev/pts/N; empty before the first start().
     std::string device() const;
-    Mode mode() const { return options_.mode; }
+    wire::Mode mode() const { return options_.mode; }
 
     /// The nodes: values to look at or to change while serving.
     Slave& slave() { return slave_; }
@@ -96,12 +96,12 @@ class Simulator {
 
     // The serving thread's steps.
     void serve();
-    void receive(FrameSplitter& splitter, Clock::time_point& silence);
-    void handle(const Received& frame);
+    void receive(wire::FrameSplitter& splitter, Clock::time_point& silence);
+    void handle(const wire::Received& frame);
     void send(const Transmission& transmission);
     void sendPieces(const Transmission& transmission);
     void hangUp();
-    void record(LineEvent::Kind kind, Bytes raw);
+    void record(LineEvent::Kind kind, wire::Bytes raw);
 
     SimulatorOptions options_;
     Slave slave_;

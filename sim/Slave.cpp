@@ -10,6 +10,9 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+using wire::ByteView;
+
 constexpr std::uint8_t kBroadcast = 0;
 
 void requireItem(const Memory& memory, Area area, std::uint32_t address) {

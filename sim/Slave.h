@@ -7,8 +7,8 @@
 #include <optional>
 #include <vector>
 
-#include "sim/Bytes.h"
 #include "sim/Memory.h"
+#include "wire/Bytes.h"
 
 namespace sim {
 
@@ -35,11 +35,11 @@ class Slave {
     /// Executes a message without its check.
     /// @return the reply without its check; nothing for a broadcast, a node that is not on this
     /// line or a message of fewer than 2 bytes.
-    std::optional<Bytes> answer(ByteView request);
+    std::optional<wire::Bytes> answer(wire::ByteView request);
 
-    /// See RequestLength in sim/Framing.h. A broadcast of function 6 counts as 32-bit when any
+    /// See RequestLength in wire/Framing.h. A broadcast of function 6 counts as 32-bit when any
     /// node has a 32-bit register of that address.
-    std::optional<std::size_t> requestLength(ByteView firstBytes) const;
+    std::optional<std::size_t> requestLength(wire::ByteView firstBytes) const;
 
     bool hasNode(std::uint8_t node) const { return memories_.count(node) != 0; }
 
@@ -49,7 +49,7 @@ class Slave {
     void set(std::uint8_t node, Area area, std::uint32_t address, std::uint32_t value);
 
   private:
-    void broadcast(ByteView request);
+    void broadcast(wire::ByteView request);
     bool isLong(std::uint8_t node, std::uint16_t address) const;
 
     mutable std::mutex mutex_;

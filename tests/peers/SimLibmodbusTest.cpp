@@ -12,7 +12,7 @@
 namespace {
 
 using sim::Area;
-using sim::Bytes;
+using wire::Bytes;
 
 constexpr std::uint8_t kNode = 17;
 

@@ -109,7 +109,7 @@ TEST_F(SimMbpollTest, Function6WritesOneRegister) {
 TEST_F(SimMbpollTest, Function15WritesManyCoils) {
     const auto result = mbpoll(kCoil, {"-r", "8"}, {"1", "0", "0", "1", "1", "0", "1", "1", "1"});
     EXPECT_EQ(0, result.exitCode) << result.output;
-    const sim::Bytes written{1, 0, 0, 1, 1, 0, 1, 1, 1};
+    const wire::Bytes written{1, 0, 0, 1, 1, 0, 1, 1, 1};
     for (std::uint32_t i = 0; i < written.size(); ++i) {
         EXPECT_EQ(written[i], item(Area::coil, 8 + i)) << i;
     }

@@ -13,7 +13,7 @@ using sim::Area;
 // Debian's own interpreter: it is the one that sees Debian's python3-pymodbus.
 constexpr const char* kPython = "/usr/bin/python3";
 
-class SimPymodbusTest : public testing::TestWithParam<std::pair<sim::Mode, const char*>> {};
+class SimPymodbusTest : public testing::TestWithParam<std::pair<wire::Mode, const char*>> {};
 
 TEST_P(SimPymodbusTest, EveryFunctionCodeAgrees) {
     const auto installed = peers::runProgram({kPython, "-c", "import pymodbus.client"});
@@ -47,8 +47,8 @@ TEST_P(SimPymodbusTest, EveryFunctionCodeAgrees) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Modes, SimPymodbusTest,
-                         testing::Values(std::pair{sim::Mode::rtu, "rtu"},
-                                         std::pair{sim::Mode::ascii, "ascii"}),
+                         testing::Values(std::pair{wire::Mode::rtu, "rtu"},
+                                         std::pair{wire::Mode::ascii, "ascii"}),
                          [](const auto& each) { return std::string(each.param.second); });
 
 }  // namespace

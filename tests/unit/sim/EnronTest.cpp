@@ -6,6 +6,8 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+
 class EnronTest : public testing::Test {
   protected:
     Slave slave{{NodeOptions{.address = 1, .longs = LongRange{.base = 5000, .count = 100}},

@@ -8,6 +8,8 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+
 struct RefusedCase {
     const char* what;
     Bytes request;

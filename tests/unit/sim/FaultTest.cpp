@@ -7,6 +7,9 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+using wire::Mode;
+
 const Bytes kReply{0x02, 0x07};  // Its CRC on the line is 41 12.
 const Bytes kFrame{0x02, 0x07, 0x41, 0x12};
 

@@ -18,7 +18,7 @@ TEST(FaultTextTest, ReadsEveryPart) {
              TextCase{"node", {.wrongNode = true}},
              TextCase{"check", {.wrongCheck = true}},
              TextCase{"keep=0", {.keep = 0}},
-             TextCase{"send=0103FF", {.replacement = Bytes{0x01, 0x03, 0xFF}}},
+             TextCase{"send=0103FF", {.replacement = wire::Bytes{0x01, 0x03, 0xFF}}},
              TextCase{"noise=00", {.noise = {0x00}}},
              TextCase{"delay=200", {.delayMs = 200}},
              TextCase{"drip=1/50", {.dripBytes = 1, .dripGapMs = 50}},

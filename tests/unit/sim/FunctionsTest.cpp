@@ -8,6 +8,8 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+
 constexpr std::uint8_t kNode = 0x11;
 
 class FunctionsTest : public testing::Test {

@@ -5,6 +5,7 @@
 namespace sim {
 namespace {
 
+using wire::Mode;
 TEST(LineEventTest, RtuShowsBytesInHexadecimal) {
     EXPECT_EQ(
         "request 02 07 41 FE",

@@ -15,6 +15,8 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+
 namespace fs = std::filesystem;
 
 class PtyLineTest : public testing::Test {

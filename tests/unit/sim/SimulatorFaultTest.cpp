@@ -10,6 +10,8 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+
 using namespace std::chrono_literals;
 using Kind = LineEvent::Kind;
 using Clock = std::chrono::steady_clock;

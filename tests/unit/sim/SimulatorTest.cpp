@@ -14,6 +14,9 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+using wire::Mode;
+
 using namespace std::chrono_literals;
 using Kind = LineEvent::Kind;
 

@@ -8,6 +8,8 @@
 namespace sim {
 namespace {
 
+using wire::Bytes;
+
 TEST(SlaveTest, EachNodeHasItsOwnMemory) {
     Slave slave({{.address = 1}, {.address = 2}});
     ASSERT_TRUE(slave.answer(Bytes{1, 6, 0, 7, 0x12, 0x34}));

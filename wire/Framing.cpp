@@ -1,11 +1,11 @@
-#include "sim/Framing.h"
+#include "wire/Framing.h"
 
 #include <utility>
 
-#include "sim/Checksum.h"
-#include "sim/Hex.h"
+#include "wire/Checksum.h"
+#include "wire/Hex.h"
 
-namespace sim {
+namespace wire {
 namespace {
 
 constexpr std::size_t kMinMessage = 1 + 1;  // Node and function.
@@ -97,4 +97,4 @@ std::optional<Received> FrameSplitter::addAscii(std::uint8_t character) {
     return decodeFrame(mode_, std::exchange(pending_, {}));
 }
 
-}  // namespace sim
+}  // namespace wire

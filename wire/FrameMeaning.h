@@ -6,9 +6,9 @@
 #include <optional>
 #include <string>
 
-#include "sim/Bytes.h"
+#include "wire/Bytes.h"
 
-namespace cli {
+namespace wire {
 
 /// Follows the frames of one line, since a reply says only part of what it answers. Items count
 /// from 0 as on the line; values are decimal and without a sign, registers of 16 bits unless the
@@ -16,16 +16,16 @@ namespace cli {
 /// Threads: one at a time.
 class FrameMeaning {
   public:
-    explicit FrameMeaning(sim::Mode mode) : mode_(mode) {}
+    explicit FrameMeaning(Mode mode) : mode_(mode) {}
 
     /// @param frame  As on the line, check included.
     /// @return "node 1: read 1 holding register at 9", "all nodes: write coil at 4: on";
     /// "damaged" for what is no frame.
-    std::string ofRequest(sim::ByteView frame);
+    std::string ofRequest(ByteView frame);
 
     /// @return what the answer to the last request says: "node 1: 1009", "node 1: written",
     /// "node 1: exception 2, illegal data address".
-    std::string ofReply(sim::ByteView frame) const;
+    std::string ofReply(ByteView frame) const;
 
   private:
     struct Request {
@@ -34,8 +34,8 @@ class FrameMeaning {
         std::size_t count;  ///< Items that it asks for; 0 when it says nothing of that.
     };
 
-    sim::Mode mode_;
+    Mode mode_;
     std::optional<Request> last_;
 };
 
-}  // namespace cli
+}  // namespace wire

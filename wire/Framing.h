@@ -7,9 +7,9 @@
 #include <optional>
 #include <vector>
 
-#include "sim/Bytes.h"
+#include "wire/Bytes.h"
 
-namespace sim {
+namespace wire {
 
 /// Bytes of the longest RTU frame. Source: Modbus over Serial Line V1.02, 2.5.1.
 inline constexpr std::size_t kMaxRtuFrame = 256;
@@ -63,4 +63,4 @@ class FrameSplitter {
     Bytes pending_;
 };
 
-}  // namespace sim
+}  // namespace wire

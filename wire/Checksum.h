@@ -1,9 +1,9 @@
 // The two checks of serial Modbus.
 #pragma once
 
-#include "sim/Bytes.h"
+#include "wire/Bytes.h"
 
-namespace sim {
+namespace wire {
 
 /// CRC-16/MODBUS: start 0xFFFF, reflected polynomial 0xA001, no final change. The check value of
 /// "123456789" is 0x4B37. On the line its low byte goes first.
@@ -14,4 +14,4 @@ std::uint16_t crc16(ByteView bytes);
 /// Source: Modbus over Serial Line V1.02, 2.5.2.2 and appendix 6.2.1.
 std::uint8_t lrc8(ByteView bytes);
 
-}  // namespace sim
+}  // namespace wire

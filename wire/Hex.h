@@ -2,11 +2,12 @@
 #pragma once
 
 #include <optional>
+#include <string>
 #include <string_view>
 
-#include "sim/Bytes.h"
+#include "wire/Bytes.h"
 
-namespace sim {
+namespace wire {
 
 /// Upper-case digits, the only ones of the ASCII mode.
 inline constexpr std::string_view kHexDigits = "0123456789ABCDEF";
@@ -20,4 +21,7 @@ void putHex(Bytes& out, std::uint8_t byte);
 /// @return the bytes of an even number of digits; nothing for any other text.
 std::optional<Bytes> fromHex(ByteView characters);
 
-}  // namespace sim
+/// @return two digits for each byte with `between` in between: "01 0A".
+std::string hexText(ByteView bytes, std::string_view between = " ");
+
+}  // namespace wire

@@ -1,14 +1,14 @@
-#include "cli/FrameMeaning.h"
+#include "wire/FrameMeaning.h"
 
 #include <gtest/gtest.h>
 
-#include "sim/Framing.h"
+#include "wire/Framing.h"
 
 namespace {
 
-using cli::FrameMeaning;
-using sim::Bytes;
-using sim::Mode;
+using wire::Bytes;
+using wire::FrameMeaning;
+using wire::Mode;
 
 struct Row {
     Bytes request;  // Without their checks.
@@ -77,15 +77,15 @@ TEST(FrameMeaning, OfRequestAndReplyInBothModes) {
     for (const Mode mode : {Mode::rtu, Mode::ascii}) {
         for (const Row& row : kRows) {
             FrameMeaning meaning(mode);
-            EXPECT_EQ(row.asked, meaning.ofRequest(sim::encodeFrame(mode, row.request)));
-            EXPECT_EQ(row.answered, meaning.ofReply(sim::encodeFrame(mode, row.reply)))
+            EXPECT_EQ(row.asked, meaning.ofRequest(wire::encodeFrame(mode, row.request)));
+            EXPECT_EQ(row.answered, meaning.ofReply(wire::encodeFrame(mode, row.reply)))
                 << row.asked;
         }
     }
 }
 
 TEST(FrameMeaning, ABroadcastIsForAllNodes) {
-    EXPECT_EQ("all nodes: write coil at 4: on", FrameMeaning(Mode::rtu).ofRequest(sim::encodeFrame(
+    EXPECT_EQ("all nodes: write coil at 4: on", FrameMeaning(Mode::rtu).ofRequest(wire::encodeFrame(
                                                     Mode::rtu, Bytes{0, 5, 0, 4, 0xFF, 0})));
 }
 
@@ -93,24 +93,24 @@ TEST(FrameMeaning, AFrameWithAWrongCheckIsDamaged) {
     const Bytes request{1, 3, 0, 9, 0, 1};
     for (const Mode mode : {Mode::rtu, Mode::ascii}) {
         FrameMeaning meaning(mode);
-        EXPECT_EQ("damaged", meaning.ofRequest(sim::encodeFrame(mode, request, true)));
+        EXPECT_EQ("damaged", meaning.ofRequest(wire::encodeFrame(mode, request, true)));
         EXPECT_EQ("damaged", meaning.ofReply(Bytes{0x01}));
     }
 }
 
 TEST(FrameMeaning, AReplyThatNobodyAskedForIsToldApart) {
     FrameMeaning meaning(Mode::rtu);
-    const Bytes reply = sim::encodeFrame(Mode::rtu, Bytes{2, 3, 2, 3, 0xF1});
+    const Bytes reply = wire::encodeFrame(Mode::rtu, Bytes{2, 3, 2, 3, 0xF1});
     EXPECT_EQ("node 2: 1009 (not what was asked for)", meaning.ofReply(reply));
-    meaning.ofRequest(sim::encodeFrame(Mode::rtu, Bytes{1, 3, 0, 9, 0, 1}));
+    meaning.ofRequest(wire::encodeFrame(Mode::rtu, Bytes{1, 3, 0, 9, 0, 1}));
     EXPECT_EQ("node 2: 1009 (not what was asked for)", meaning.ofReply(reply));
 }
 
 TEST(FrameMeaning, LongListsAreCut) {
     FrameMeaning meaning(Mode::rtu);
-    meaning.ofRequest(sim::encodeFrame(Mode::rtu, Bytes{1, 1, 0, 0, 0, 17}));
+    meaning.ofRequest(wire::encodeFrame(Mode::rtu, Bytes{1, 1, 0, 0, 0, 17}));
     EXPECT_EQ("node 1: 1 0 0 0 0 0 0 0 0 0 0 0 0 0 0 0 ...",
-              meaning.ofReply(sim::encodeFrame(Mode::rtu, Bytes{1, 1, 3, 1, 0, 1})));
+              meaning.ofReply(wire::encodeFrame(Mode::rtu, Bytes{1, 1, 3, 1, 0, 1})));
 }
 
 /// Frames come from outside: any bytes behind node and function have some meaning.
@@ -120,7 +120,7 @@ TEST(FrameMeaning, OfEveryTruncationIsHarmless) {
             Bytes message(size, 0x11);
             message[1] = static_cast<std::uint8_t>(function);
             FrameMeaning meaning(Mode::rtu);
-            const Bytes frame = sim::encodeFrame(Mode::rtu, message);
+            const Bytes frame = wire::encodeFrame(Mode::rtu, message);
             EXPECT_EQ(0U, meaning.ofRequest(frame).find("node 17: ")) << function << ' ' << size;
             EXPECT_EQ(0U, meaning.ofReply(frame).find("node 17: ")) << function << ' ' << size;
         }

@@ -1,11 +1,11 @@
-#include "sim/Framing.h"
+#include "wire/Framing.h"
 
 #include <gtest/gtest.h>
 
 #include <string>
 #include <string_view>
 
-namespace sim {
+namespace wire {
 namespace {
 
 Bytes bytesOf(std::string_view text) {
@@ -173,4 +173,4 @@ TEST(AsciiSplitterTest, EndlessFrameIsGivenUpAsDamaged) {
 }
 
 }  // namespace
-}  // namespace sim
+}  // namespace wire

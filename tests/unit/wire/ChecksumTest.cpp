@@ -1,11 +1,11 @@
 // Golden values: Modbus over Serial Line V1.02 and the catalogued check value of CRC-16/MODBUS.
-#include "sim/Checksum.h"
+#include "wire/Checksum.h"
 
 #include <gtest/gtest.h>
 
 #include <string_view>
 
-namespace sim {
+namespace wire {
 namespace {
 
 Bytes bytesOf(std::string_view text) {
@@ -50,4 +50,4 @@ TEST(LrcTest, NothingGivesZero) {
 }
 
 }  // namespace
-}  // namespace sim
+}  // namespace wire

@@ -1,17 +1,14 @@
-#include "cli/FrameMeaning.h"
-
-#include <fmt/format.h>
+#include "wire/FrameMeaning.h"
 
 #include <algorithm>
 #include <array>
 #include <string_view>
 
-#include "sim/Framing.h"
+#include "wire/Framing.h"
+#include "wire/Hex.h"
 
-namespace cli {
+namespace wire {
 namespace {
-
-using sim::ByteView;
 
 constexpr std::uint8_t kExceptionFlag = 0x80;
 /// More values make no line that anybody reads.
@@ -85,11 +82,11 @@ std::uint32_t numberOf(ByteView bytes) {
 }
 
 std::string whose(std::uint8_t node) {
-    return node == 0 ? "all nodes: " : fmt::format("node {}: ", node);
+    return node == 0 ? "all nodes: " : "node " + std::to_string(node) + ": ";
 }
 
 std::string some(std::size_t count, std::string_view item) {
-    return fmt::format("{} {}{}", count, item, count == 1 ? "" : "s");
+    return std::to_string(count) + " " + std::string(item) + (count == 1 ? "" : "s");
 }
 
 /// @param value  Gives the value with an index as a number.
@@ -97,7 +94,7 @@ template <class ValueAt>
 std::string listOf(std::size_t count, ValueAt value) {
     std::string text;
     for (std::size_t i = 0; i < std::min(count, kShownValues); ++i)
-        text += fmt::format("{}{}", i == 0 ? "" : " ", value(i));
+        text += (i == 0 ? "" : " ") + std::to_string(value(i));
     return count > kShownValues ? text + " ..." : text;
 }
 
@@ -122,11 +119,18 @@ std::string_view itemOf(const FunctionRow& row, std::size_t width) {
 
 std::string bitWord(std::uint32_t value) {
     if (value == 0xFF00) return "on";
-    return value == 0 ? "off" : fmt::format("0x{:04X}", value);
+    return value == 0 ? "off"
+                      : "0x" + hexText(Bytes{static_cast<std::uint8_t>(value >> 8),
+                                             static_cast<std::uint8_t>(value & 0xFFU)},
+                                       "");
+}
+
+std::string placeText(std::size_t address) {
+    return " at " + std::to_string(address);
 }
 
 std::string unknown(std::uint8_t function, ByteView data) {
-    return fmt::format("function {}, {}", function, some(data.size(), "byte"));
+    return "function " + std::to_string(function) + ", " + some(data.size(), "byte");
 }
 
 /// @param values  Behind the byte count.
@@ -134,8 +138,8 @@ std::string writeText(const FunctionRow& row, std::size_t address, std::size_t c
                       ByteView values) {
     const bool bits = row.form == Form::WriteBits;
     const std::size_t width = bits ? 0 : widthOf(values, count);
-    return fmt::format("write {} at {}: {}", some(count, itemOf(row, width)), address,
-                       bits ? bitList(values, count) : wordList(values, width));
+    return "write " + some(count, itemOf(row, width)) + placeText(address) + ": " +
+           (bits ? bitList(values, count) : wordList(values, width));
 }
 
 /// @param data  What stands behind the function.
@@ -148,14 +152,13 @@ std::string requestText(std::uint8_t function, ByteView data) {
     switch (row->form) {
         case Form::ReadBits:
         case Form::ReadWords:
-            return fmt::format("read {} at {}", some(numberOf(behind.first(2)), row->item),
-                               address);
+            return "read " + some(numberOf(behind.first(2)), row->item) + placeText(address);
         case Form::WriteBit:
-            return fmt::format("write {} at {}: {}", row->item, address,
-                               bitWord(numberOf(behind.first(2))));
+            return "write " + std::string(row->item) + placeText(address) + ": " +
+                   bitWord(numberOf(behind.first(2)));
         case Form::WriteWord:
-            return fmt::format("write {} at {}: {}", itemOf(*row, behind.size()), address,
-                               numberOf(behind.first(std::min(behind.size(), kLong))));
+            return "write " + std::string(itemOf(*row, behind.size())) + placeText(address) + ": " +
+                   std::to_string(numberOf(behind.first(std::min(behind.size(), kLong))));
         case Form::WriteBits:
         case Form::WriteWords:
             break;
@@ -167,9 +170,9 @@ std::string requestText(std::uint8_t function, ByteView data) {
 std::string exceptionText(ByteView data) {
     if (data.empty()) return "exception without a code";
     for (const auto& [code, text] : kExceptions) {
-        if (code == data[0]) return fmt::format("exception {}, {}", code, text);
+        if (code == data[0]) return "exception " + std::to_string(code) + ", " + std::string(text);
     }
-    return fmt::format("exception {}", data[0]);
+    return "exception " + std::to_string(data[0]);
 }
 
 /// @param count  Items that were asked for; 0 when that is not known.
@@ -187,7 +190,7 @@ std::string replyText(std::uint8_t function, ByteView data, std::size_t count) {
 
 std::string FrameMeaning::ofRequest(ByteView frame) {
     last_.reset();
-    const auto [raw, message] = sim::decodeFrame(mode_, frame);
+    const auto [raw, message] = decodeFrame(mode_, frame);
     if (message.empty()) return kDamaged;
     const ByteView data = ByteView(message).subspan(2);
     const FunctionRow* const row = rowOf(message[1]);
@@ -198,7 +201,7 @@ std::string FrameMeaning::ofRequest(ByteView frame) {
 }
 
 std::string FrameMeaning::ofReply(ByteView frame) const {
-    const auto [raw, message] = sim::decodeFrame(mode_, frame);
+    const auto [raw, message] = decodeFrame(mode_, frame);
     if (message.empty()) return kDamaged;
     const auto function = static_cast<std::uint8_t>(message[1] & ~kExceptionFlag);
     const bool answers = last_ && last_->node == message[0] && last_->function == function;
@@ -207,4 +210,4 @@ std::string FrameMeaning::ofReply(ByteView frame) const {
            (answers ? "" : " (not what was asked for)");
 }
 
-}  // namespace cli
+}  // namespace wire

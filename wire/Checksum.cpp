@@ -1,6 +1,6 @@
-#include "sim/Checksum.h"
+#include "wire/Checksum.h"
 
-namespace sim {
+namespace wire {
 
 std::uint16_t crc16(ByteView bytes) {
     // Bit by bit, without a table: nothing here is in a hurry, and there is less to get wrong.
@@ -20,4 +20,4 @@ std::uint8_t lrc8(ByteView bytes) {
     return static_cast<std::uint8_t>((0x100U - (sum & 0xFFU)) & 0xFFU);
 }
 
-}  // namespace sim
+}  // namespace wire

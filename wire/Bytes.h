@@ -1,11 +1,11 @@
-// The simulator's words for bytes on the line.
+// The words for bytes on a line.
 #pragma once
 
 #include <cstdint>
 #include <span>
 #include <vector>
 
-namespace sim {
+namespace wire {
 
 using Bytes = std::vector<std::uint8_t>;
 using ByteView = std::span<const std::uint8_t>;
@@ -13,4 +13,4 @@ using ByteView = std::span<const std::uint8_t>;
 /// How frames travel. Source: Modbus over Serial Line V1.02, 2.5.
 enum class Mode : std::uint8_t { rtu, ascii };
 
-}  // namespace sim
+}  // namespace wire

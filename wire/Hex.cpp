@@ -1,6 +1,6 @@
-#include "sim/Hex.h"
+#include "wire/Hex.h"
 
-namespace sim {
+namespace wire {
 
 std::optional<std::uint8_t> hexValue(std::uint8_t character) {
     const std::size_t value = kHexDigits.find(static_cast<char>(character));
@@ -25,4 +25,13 @@ std::optional<Bytes> fromHex(ByteView characters) {
     return bytes;
 }
 
-}  // namespace sim
+std::string hexText(ByteView bytes, std::string_view between) {
+    Bytes digits;
+    for (const std::uint8_t byte : bytes) {
+        if (!digits.empty()) digits.insert(digits.end(), between.begin(), between.end());
+        putHex(digits, byte);
+    }
+    return {digits.begin(), digits.end()};
+}
+
+}  // namespace wire
