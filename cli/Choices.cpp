@@ -6,7 +6,7 @@
 
 #include <charconv>
 
-#include "cli/NearestName.h"
+#include "values/NearestName.h"
 
 namespace cli {
 
@@ -15,10 +15,10 @@ bool sameWord(std::string_view a, std::string_view b) {
 }
 
 std::string didYouMean(std::string_view word, const std::vector<std::string>& names) {
-    const std::string nearest = nearestName(word, names);
+    const std::string nearest = values::nearestName(word, names);
     // Numbers that differ in two digits have nothing to do with each other.
     const bool number = word.find_first_not_of("0123456789") == std::string_view::npos;
-    if (nearest.empty() || (number && editDistance(word, nearest) > 1)) return {};
+    if (nearest.empty() || (number && values::editDistance(word, nearest) > 1)) return {};
     return fmt::format("; did you mean '{}'?", nearest);
 }
 

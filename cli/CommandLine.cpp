@@ -8,11 +8,14 @@
 #include <string_view>
 
 #include "cli/Commands.h"
-#include "cli/JsonValues.h"
+#include "cli/UsageErrors.h"
 #include "cli/UsageText.h"
+#include "values/JsonValues.h"
 
 namespace cli {
 namespace {
+
+using values::Json;
 
 constexpr const char* kNoCommand = "what shall be done? mrtu --help lists the commands";
 
@@ -60,7 +63,7 @@ ExitCode answerParser(const CLI::App& app, const CLI::ParseError& error, Command
 
 ExitCode run(CLI::App& app, int argc, const char* const* argv, CommandContext& context) {
     try {
-        app.parse(argc, argv);
+        withUsageErrors([&] { app.parse(argc, argv); });
         // CLI11's own demand comes before its complaint about a misspelt command.
         if (app.get_subcommands().empty()) throw CommandError(ExitCode::Usage, kNoCommand);
         return context.exitCode;

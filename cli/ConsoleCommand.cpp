@@ -6,12 +6,13 @@
 #include <ostream>
 #include <sstream>
 
-#include "cli/ByteOrder.h"
 #include "cli/Choices.h"
 #include "cli/Commands.h"
 #include "cli/LineEditor.h"
 #include "cli/OverrideNotice.h"
 #include "cli/Session.h"
+#include "cli/UsageErrors.h"
+#include "values/ByteOrder.h"
 
 namespace cli {
 namespace {
@@ -53,7 +54,7 @@ std::string withoutByteOrders(const std::string& line) {
     if (!takesUri || uri.find('@') == std::string::npos) return line;
     std::string rest;
     std::getline(in, rest);
-    return command + ' ' + withoutByteOrder(uri) + rest;
+    return command + ' ' + values::withoutByteOrder(uri) + rest;
 }
 
 bool isHexLine(std::string_view answer) {
@@ -103,7 +104,7 @@ ExitCode ask(CommandContext& context, Session& session, const std::string& line,
 ExitCode askOrComplain(CommandContext& context, Session& session, const std::string& line,
                        bool ownLine) {
     try {
-        return ask(context, session, line, ownLine);
+        return withUsageErrors([&] { return ask(context, session, line, ownLine); });
     } catch (const CommandError& error) {
         complain(context, error.what());
         return error.code();

@@ -4,10 +4,10 @@
 
 #include <sstream>
 
-#include "cli/Bytes.h"
 #include "cli/ConfigText.h"
 #include "cli/OverrideKeys.h"
-#include "cli/ValueTypes.h"
+#include "values/LittleEndian.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
@@ -44,15 +44,15 @@ std::uint32_t Overrides::read(const std::string& uri) {
     const auto value = channel.read(*tag.value());
     channel.freeTag(tag.value());
     if (!value) throw CommandError(ExitCode::Other, uri + ": " + value.error().text);
-    return static_cast<std::uint32_t>(fromLittleEndian(value.value()));
+    return static_cast<std::uint32_t>(values::fromLittleEndian(value.value()));
 }
 
 void Overrides::write(const std::string& uri, std::uint32_t value, std::size_t bytes) {
     runtime::Channel& channel = session_.channel();
     const auto tag = channel.createTag(uri);
     if (!tag) throw CommandError(ExitCode::Other, tag.error().text);
-    Bytes data;
-    appendLittleEndian(data, value, bytes);
+    values::Bytes data;
+    values::appendLittleEndian(data, value, bytes);
     const auto done = channel.write(*tag.value(), data);
     channel.freeTag(tag.value());
     // Special areas refuse without a text of their own.

@@ -51,7 +51,7 @@ void readOne(Session& session, const std::string& uri, const TagResult& tag, Res
     if (!tag) return results.failure(uri, tag.error());
     const auto value = session.read(*tag.value());
     if (!value) return results.failure(uri, value.error());
-    results.value(uri, shapeOf(*tag.value()), value.value());
+    results.value(uri, values::shapeOf(*tag.value()), value.value());
 }
 
 void read(CommandContext& context, const ReadOptions& options) {

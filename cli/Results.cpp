@@ -4,10 +4,14 @@
 
 #include <ostream>
 
-#include "cli/Values.h"
+#include "values/Values.h"
 
 namespace cli {
 namespace {
+
+using values::ByteView;
+using values::Json;
+using values::ValueShape;
 
 const std::string kNoReason = "refused";
 
@@ -15,10 +19,11 @@ const std::string kNoReason = "refused";
 
 void Results::value(const std::string& uri, ValueShape shape, ByteView value) {
     if (json_) {
-        array_.push_back(
-            {{"uri", uri}, {"type", typeName(shape)}, {"value", jsonValue(shape, value)}});
+        array_.push_back({{"uri", uri},
+                          {"type", values::typeName(shape)},
+                          {"value", values::jsonValue(shape, value)}});
     } else {
-        context_.out << uri << " = " << formatValue(shape, value) << '\n';
+        context_.out << uri << " = " << values::formatValue(shape, value) << '\n';
     }
 }
 

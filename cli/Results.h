@@ -3,11 +3,11 @@
 
 #include <string>
 
-#include "cli/Bytes.h"
 #include "cli/Command.h"
-#include "cli/JsonValues.h"
 #include "cli/Session.h"
-#include "cli/ValueTypes.h"
+#include "values/JsonValues.h"
+#include "values/LittleEndian.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 
@@ -18,10 +18,10 @@ class Results {
   public:
     Results(CommandContext& context, bool json) : context_(context), json_(json) {}
 
-    void value(const std::string& uri, ValueShape shape, ByteView value);
+    void value(const std::string& uri, values::ValueShape shape, values::ByteView value);
 
     /// A value that was sent to every node, of which none answers.
-    void broadcast(const std::string& uri, ValueShape shape, ByteView value);
+    void broadcast(const std::string& uri, values::ValueShape shape, values::ByteView value);
 
     /// The failure's code decides the exit code when it is the first.
     void failure(const std::string& uri, const Failure& failure);
@@ -32,7 +32,7 @@ class Results {
   private:
     CommandContext& context_;
     bool json_;
-    Json array_ = Json::array();
+    values::Json array_ = values::Json::array();
     FirstFailure first_;
 };
 

@@ -4,11 +4,11 @@
 #include <memory>
 #include <string>
 
-#include "cli/Bytes.h"
 #include "cli/LineOptions.h"
 #include "cli/OverrideStorage.h"
 #include "runtime/Channel.h"
 #include "runtime/Storage.h"
+#include "values/LittleEndian.h"
 
 namespace cli {
 
@@ -48,10 +48,10 @@ class Session {
 
     /// As the channel does. What the driver refuses without asking the device is a wrong URI or
     /// value (Usage), unless an override disabled the node.
-    runtime::Result<Bytes, Failure> read(const ITag& tag);
-    runtime::Result<runtime::Done, Failure> write(const ITag& tag, ByteView value);
+    runtime::Result<values::Bytes, Failure> read(const ITag& tag);
+    runtime::Result<runtime::Done, Failure> write(const ITag& tag, values::ByteView value);
     /// Writes an array item by item. @param written  Receives the items that the device took.
-    runtime::Result<runtime::Done, Failure> writeItems(const ITag& tag, ByteView value,
+    runtime::Result<runtime::Done, Failure> writeItems(const ITag& tag, values::ByteView value,
                                                        std::size_t& written);
 
     /// @return the node that the tag's URI names; 0 from a driver without nodes.

@@ -1,12 +1,16 @@
 // How a session makes, reads and writes tags.
 #include <algorithm>
 
-#include "cli/ByteOrder.h"
 #include "cli/Session.h"
-#include "cli/ValueTypes.h"
+#include "values/ByteOrder.h"
+#include "values/ValueError.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
+
+using values::Bytes;
+using values::ByteView;
 
 // Codes of IProtocol::GetLastError().
 constexpr int kGeneralError = -1;
@@ -22,7 +26,7 @@ constexpr std::size_t kLongestValue = std::size_t{4} * 65536;
 
 /// Zeroes are a value that every conversion takes which can be applied to the type at all.
 bool conversionsApply(const ITag& tag) {
-    const std::size_t length = shapeOf(tag).bytes;
+    const std::size_t length = values::shapeOf(tag).bytes;
     const auto packed = static_cast<std::size_t>(std::max(0, tag.PackedLen()));
     const bool possible = tag.GetBitIndex() >= 0 && std::max(length, packed) <= kLongestValue;
     if (length == 0 || !possible) return true;
@@ -38,13 +42,13 @@ runtime::Result<ITag*, Failure> Session::createTag(const std::string& uri) {
         return Failure{std::move(error), ExitCode::Usage};
     };
     try {
-        const auto tag = channel().createTag(withoutByteOrder(uri));
+        const auto tag = channel().createTag(values::withoutByteOrder(uri));
         if (!tag) return refuse(tag.error());
         if (!conversionsApply(*tag.value())) {
             return refuse({kConversionError, "the conversions can't be applied to this type"});
         }
         return tag.value();
-    } catch (const CommandError& error) {
+    } catch (const values::ValueError& error) {
         return refuse({kGeneralError, error.what()});
     }
 }
@@ -90,7 +94,7 @@ runtime::Result<runtime::Done, Failure> Session::write(const ITag& tag, ByteView
 runtime::Result<runtime::Done, Failure> Session::writeItems(const ITag& tag, ByteView value,
                                                             std::size_t& written) {
     auto* const items = channel().as<IProtocol7>("IProtocol7");
-    const std::size_t count = itemCount(shapeOf(tag));
+    const std::size_t count = values::itemCount(values::shapeOf(tag));
     const std::size_t length = value.size() / std::max<std::size_t>(1, count);
     const std::uint64_t before = framesSent();
     for (written = 0; written < count; ++written) {

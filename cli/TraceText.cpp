@@ -4,11 +4,13 @@
 
 #include <ctime>
 
-#include "cli/TextEscapes.h"
+#include "values/TextEscapes.h"
 #include "wire/Hex.h"
 
 namespace cli {
 namespace {
+
+using values::ByteView;
 
 using wire::FrameMeaning;
 
@@ -39,7 +41,7 @@ std::string TraceText::lineOf(const runtime::TraceEvent& event) {
 
 std::string TraceText::frameOf(ByteView bytes) const {
     const bool characters = style_.ascii && !style_.hex;
-    return characters ? escapeText(withoutLineEnd(bytes)) : wire::hexText(bytes);
+    return characters ? values::escapeText(withoutLineEnd(bytes)) : wire::hexText(bytes);
 }
 
 std::string TraceText::meaningOf(const runtime::TraceEvent& event) {

@@ -4,8 +4,8 @@
 #include <map>
 #include <string>
 
-#include "cli/Bytes.h"
 #include "runtime/TracingSerialFactory.h"
+#include "values/LittleEndian.h"
 #include "wire/FrameMeaning.h"
 
 namespace cli {
@@ -29,7 +29,7 @@ class TraceText {
     std::string lineOf(const runtime::TraceEvent& event);
 
   private:
-    std::string frameOf(ByteView bytes) const;
+    std::string frameOf(values::ByteView bytes) const;
     std::string meaningOf(const runtime::TraceEvent& event);
 
     TraceStyle style_;

@@ -9,11 +9,14 @@
 #include "cli/Overrides.h"
 #include "cli/Results.h"
 #include "cli/Session.h"
-#include "cli/Values.h"
+#include "cli/UsageErrors.h"
 #include "cli/WriteRequests.h"
+#include "values/Values.h"
 
 namespace cli {
 namespace {
+
+using values::ValueShape;
 
 constexpr const char* kFooter =
     R"(Values are written as `mrtu read` prints them: numbers (0x... too), 0 or 1 (false, true), arrays as
@@ -38,7 +41,7 @@ constexpr std::uint8_t kBroadcast = 0;
 struct Job {
     std::string uri;
     const ITag* tag;
-    Bytes value;
+    values::Bytes value;
 };
 
 /// @return the address that the tag's node has on the line unless an override gives it another.
@@ -61,7 +64,9 @@ Job prepare(Session& session, const std::string& text, bool verify) {
     try {
         if (!tag) throw CommandError(tag.error().code, tag.error().error.text);
         refuseUnwritable(session, *tag.value(), verify);
-        return {assignment.uri, tag.value(), parseValue(shapeOf(*tag.value()), assignment.value)};
+        const ValueShape shape = values::shapeOf(*tag.value());
+        return {assignment.uri, tag.value(),
+                withUsageErrors([&] { return values::parseValue(shape, assignment.value); })};
     } catch (const CommandError& error) {
         throw CommandError(error.code(), assignment.uri + ": " + error.what());
     }
@@ -87,11 +92,11 @@ std::vector<Job> prepareAll(CommandContext& context, Session& session,
 void verifyOne(Session& session, const Job& job, Results& results) {
     const auto back = session.read(*job.tag);
     if (!back) return results.failure(job.uri, back.error());
-    const ValueShape shape = shapeOf(*job.tag);
+    const ValueShape shape = values::shapeOf(*job.tag);
     if (back.value() != job.value) {
         const std::string text =
-            fmt::format("wrote {} but read back {}", formatValue(shape, job.value),
-                        formatValue(shape, back.value()));
+            fmt::format("wrote {} but read back {}", values::formatValue(shape, job.value),
+                        values::formatValue(shape, back.value()));
         return results.failure(job.uri, {{0, text}, ExitCode::Other});
     }
     results.value(job.uri, shape, back.value());
@@ -116,7 +121,7 @@ bool wasBroadcast(Session& session, const ITag& tag, const Failure& failure) {
 
 void writeOne(Session& session, const Job& job, bool verify, Results& results) {
     const auto done = send(session, job);
-    const ValueShape shape = shapeOf(*job.tag);
+    const ValueShape shape = values::shapeOf(*job.tag);
     if (!done && wasBroadcast(session, *job.tag, done.error()) && !verify)
         return results.broadcast(job.uri, shape, job.value);
     if (!done) return results.failure(job.uri, done.error());

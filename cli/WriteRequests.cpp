@@ -4,7 +4,7 @@
 #include <cstdlib>
 
 #include "cli/ConfigText.h"
-#include "cli/ValueTypes.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
@@ -56,7 +56,7 @@ bool goesInOneRequest(const Session& session, const ITag& tag) {
     if (area == "OUTP") return coilsFit(session, tag);
     if (area == "HREG") return registersFit(session, tag);
     // A 32-bit register goes alone, whatever the configuration says.
-    return shapeOf(tag).bytes <= kLongRegisterBytes;
+    return values::shapeOf(tag).bytes <= kLongRegisterBytes;
 }
 
 }  // namespace cli

@@ -15,6 +15,8 @@
 namespace cli {
 namespace {
 
+using values::Json;
+
 struct Options {
     std::string configFile;
     std::string tagsFile;

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <iterator>
 
-#include "cli/ValueTypes.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
@@ -15,7 +15,7 @@ constexpr unsigned char kTrialByte = 1;
 
 int itemBytes(const TagFacts& facts) {
     const ICU_Type item = facts.itemType == ICU_Type::none ? facts.type : facts.itemType;
-    return std::max<int>(rowOf(item).bytes, 1);
+    return std::max<int>(values::rowOf(item).bytes, 1);
 }
 
 /// @return how many items are no longer what they were.

@@ -7,10 +7,12 @@
 #include <tuple>
 #include <utility>
 
-#include "cli/TextEscapes.h"
+#include "values/TextEscapes.h"
 
 namespace cli {
 namespace {
+
+using values::Json;
 
 const char* word(Severity severity) {
     return severity == Severity::Error ? "error" : "warning";
@@ -46,8 +48,9 @@ std::string findingsText(const Findings& findings) {
                                              finding.place.line, finding.place.column,
                                              word(finding.severity), finding.message, finding.rule);
         // They quote the files, which may hold anything.
-        text += printableText(line) + '\n';
-        if (!finding.suggestion.empty()) text += "    " + printableText(finding.suggestion) + '\n';
+        text += values::printableText(line) + '\n';
+        if (!finding.suggestion.empty())
+            text += "    " + values::printableText(finding.suggestion) + '\n';
     }
     return text;
 }

@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "cli/ExitCode.h"
-#include "cli/JsonValues.h"
+#include "values/JsonValues.h"
 
 namespace cli {
 
@@ -47,7 +47,7 @@ void sortByPlace(Findings& findings);
 /// one, the suggestion below; nothing for no findings.
 std::string findingsText(const Findings& findings);
 /// @return an array with one object a finding.
-Json findingsJson(const Findings& findings);
+values::Json findingsJson(const Findings& findings);
 
 /// @return 2 (Usage) with errors, 1 (Other) with warnings that count, else 0 (Done).
 ExitCode verdictOf(const Findings& findings, bool warningsCount);

@@ -4,11 +4,11 @@
 
 #include <algorithm>
 
-#include "cli/ValueTypes.h"
 #include "cli/check/LintTags.h"
 #include "cli/check/NodeNumber.h"
 #include "cli/check/NumberText.h"
 #include "cli/check/TagSpan.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {

@@ -7,9 +7,9 @@
 #include <charconv>
 #include <set>
 
-#include "cli/NearestName.h"
 #include "cli/check/NodeNumber.h"
 #include "cli/check/NumberText.h"
+#include "values/NearestName.h"
 
 namespace cli {
 namespace {
@@ -49,7 +49,7 @@ void notAnItem(const Item& item, Findings& out) {
 
 void unknownKey(const Item& item, Findings& out) {
     if (!item.word.value || item.parameter != nullptr) return;
-    const std::string nearest = nearestName(item.word.key, keysOf(item.description));
+    const std::string nearest = values::nearestName(item.word.key, keysOf(item.description));
     warn(out, "unknown-key", item.word.place, fmt::format("unknown key '{}'", item.word.key),
          nearest.empty() ? "'mrtu describe parameters' lists the keys"
                          : fmt::format("did you mean '{}'?", nearest));
@@ -156,7 +156,7 @@ bool isCheckedElsewhere(const std::string& key) {
 void unlistedValue(const Item& item, Findings& out) {
     if (item.parameter == nullptr || item.parameter->choices.empty() || !item.word.value) return;
     if (isCheckedElsewhere(item.word.key) || isListed(*item.parameter, *item.word.value)) return;
-    const std::string nearest = nearestName(*item.word.value, item.parameter->choices);
+    const std::string nearest = values::nearestName(*item.word.value, item.parameter->choices);
     warn(out, "unlisted-value", item.word.valuePlace,
          fmt::format("'{}' is no value that {} is described with", *item.word.value, item.word.key),
          (nearest.empty() || item.parameter->isNumber()

@@ -3,9 +3,9 @@
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 
-#include "cli/NearestName.h"
-#include "cli/ValueTypes.h"
 #include "cli/check/LintTags.h"
+#include "values/NearestName.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
@@ -13,8 +13,8 @@ namespace {
 constexpr std::size_t kTypeField = 3;
 
 std::uint32_t flagOf(const std::string& name) {
-    for (std::size_t row = 0; row < kValueTypes.size(); ++row) {
-        if (kValueTypes[row].name == name) return std::uint32_t{1} << row;
+    for (std::size_t row = 0; row < values::kValueTypes.size(); ++row) {
+        if (values::kValueTypes[row].name == name) return std::uint32_t{1} << row;
     }
     return 0;
 }
@@ -24,7 +24,7 @@ Finding unknownConversion(const TagLine& tag, const Description& description,
     std::vector<std::string> names;
     for (const ConversionInfo& each : description.conversions)
         names.push_back(each.name);
-    const std::string nearest = nearestName(name, names);
+    const std::string nearest = values::nearestName(name, names);
     return {Severity::Error, "unknown-conversion", tag.placeOf(kTypeField),
             fmt::format("unknown conversion '{}': every access will fail", name),
             nearest.empty() ? fmt::format("choices: {}", fmt::join(names, ", "))
@@ -38,13 +38,13 @@ bool impossibleConversion(const TagLine& tag, const ConversionFacts& facts, Find
     const char* const fails =
         facts.reads ? "every write" : (facts.writes ? "every read" : "every access");
     const bool never = !facts.reads && (!facts.writes || tag.facts->readOnly);
-    out.push_back(
-        {never ? Severity::Error : Severity::Warning, "impossible-conversion",
-         tag.placeOf(kTypeField),
-         fmt::format("conversion '{}' can't be applied to {}: {} will fail", facts.name,
-                     typeName({tag.facts->type, static_cast<std::size_t>(tag.facts->length)}),
-                     fails),
-         "check the data type, its length and the conversion"});
+    out.push_back({never ? Severity::Error : Severity::Warning, "impossible-conversion",
+                   tag.placeOf(kTypeField),
+                   fmt::format("conversion '{}' can't be applied to {}: {} will fail", facts.name,
+                               values::typeName(
+                                   {tag.facts->type, static_cast<std::size_t>(tag.facts->length)}),
+                               fails),
+                   "check the data type, its length and the conversion"});
     return true;
 }
 

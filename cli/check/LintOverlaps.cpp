@@ -5,10 +5,10 @@
 #include <map>
 #include <utility>
 
-#include "cli/ValueTypes.h"
 #include "cli/check/FirstMeetings.h"
 #include "cli/check/LintTags.h"
 #include "cli/check/TagSpan.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
@@ -61,7 +61,7 @@ using Reports = std::map<std::size_t, Finding>;  ///< By the order of the tag.
 class Kinds {
   public:
     int of(const Span& span) {
-        const long long bits = std::max<long long>(rowOf(span.item).bytes, 1) * 8;
+        const long long bits = std::max<long long>(values::rowOf(span.item).bytes, 1) * 8;
         const long long phase = (span.begin % bits + bits) % bits;
         const auto next = static_cast<int>(numbers_.size());
         return numbers_.try_emplace({span.item, phase}, next).first->second;

@@ -2,8 +2,8 @@
 
 #include <algorithm>
 
-#include "cli/ByteOrder.h"
-#include "cli/ExitCode.h"
+#include "values/ByteOrder.h"
+#include "values/ValueError.h"
 
 namespace cli {
 namespace {
@@ -58,8 +58,8 @@ TagLine tagLine(std::string_view uri, const std::string& source, int line, int c
                 .driverUri = std::string(uri),
                 .orderRefusal = {}};
     try {
-        tag.driverUri = withoutByteOrder(tag.uri);
-    } catch (const CommandError& error) {
+        tag.driverUri = values::withoutByteOrder(tag.uri);
+    } catch (const values::ValueError& error) {
         tag.orderRefusal = error.what();
     }
     tag.fields = fieldsOf(tag.driverUri, column);

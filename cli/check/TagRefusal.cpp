@@ -5,14 +5,16 @@
 #include <algorithm>
 #include <optional>
 
-#include "cli/NearestName.h"
-#include "cli/ValueTypes.h"
 #include "cli/check/LintTags.h"
 #include "cli/check/NumberText.h"
 #include "cli/describe/DescriptionTables.h"
+#include "values/NearestName.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
+
+using values::ValueType;
 
 struct Blame {
     std::size_t field;
@@ -38,7 +40,7 @@ Verdict wrongArea(const TagLine& tag, const ModelInfo* model, const Description&
     std::vector<std::string> names;
     for (const AreaOffer& offer : model->offers)
         names.push_back(offer.area);
-    const std::string nearest = nearestName(tag.area(), names);
+    const std::string nearest = values::nearestName(tag.area(), names);
     // What the model lacks is not to blame when the driver knows the area all the same.
     const bool elsewhere = description.area(tag.area()) != nullptr;
     if (!elsewhere && !nearest.empty()) {
@@ -48,19 +50,19 @@ Verdict wrongArea(const TagLine& tag, const ModelInfo* model, const Description&
 }
 
 const ValueType* typeNamed(const std::string& name) {
-    const auto row = std::find_if(kValueTypes.begin(), kValueTypes.end(),
+    const auto row = std::find_if(values::kValueTypes.begin(), values::kValueTypes.end(),
                                   [&](const ValueType& each) { return each.name == name; });
-    return row != kValueTypes.end() ? &*row : nullptr;
+    return row != values::kValueTypes.end() ? &*row : nullptr;
 }
 
 Verdict unknownType(const TagLine& tag) {
     const std::string name = dataTypeText(tag.dataType()).name;
     if (typeNamed(name) != nullptr) return std::nullopt;
     std::vector<std::string> names;
-    names.reserve(kValueTypes.size());
-    for (const ValueType& row : kValueTypes)
+    names.reserve(values::kValueTypes.size());
+    for (const ValueType& row : values::kValueTypes)
         names.emplace_back(row.name);
-    const std::string nearest = nearestName(name, names);
+    const std::string nearest = values::nearestName(name, names);
     return Blame{3, nearest.empty() ? "'mrtu describe memory' lists the data types"
                                     : fmt::format("did you mean '{}'?", nearest)};
 }

@@ -2,13 +2,15 @@
 
 #include <algorithm>
 
-#include "cli/ValueTypes.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
 
+using values::ValueType;
+
 const ValueType* typeNamed(const std::string& name) {
-    for (const ValueType& row : kValueTypes) {
+    for (const ValueType& row : values::kValueTypes) {
         if (row.name == name) return &row;
     }
     return nullptr;

@@ -28,7 +28,7 @@ struct Options {
 struct Section {
     const char* name;  ///< Empty: everything.
     std::string (*text)(const Description&);
-    Json (*json)(const Description&);
+    values::Json (*json)(const Description&);
 };
 
 constexpr std::array kSections{

@@ -1,14 +1,16 @@
 #include "cli/describe/DescriptionJson.h"
 
-#include "cli/ValueTypes.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
 
+using values::Json;
+
 Json typesJson(std::uint32_t mask) {
     Json names = Json::array();
-    for (std::size_t row = 0; row < kValueTypes.size(); ++row) {
-        if ((mask >> row & 1U) != 0) names.push_back(std::string(kValueTypes[row].name));
+    for (std::size_t row = 0; row < values::kValueTypes.size(); ++row) {
+        if ((mask >> row & 1U) != 0) names.push_back(std::string(values::kValueTypes[row].name));
     }
     return names;
 }

@@ -5,20 +5,20 @@
 
 #include <bit>
 
-#include "cli/ValueTypes.h"
 #include "cli/describe/TextTable.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
 
 using Rows = std::vector<std::vector<std::string>>;
 
-constexpr std::uint32_t kAllTypes = (std::uint32_t{1} << kValueTypes.size()) - 1;
+constexpr std::uint32_t kAllTypes = (std::uint32_t{1} << values::kValueTypes.size()) - 1;
 
 std::string namesOf(std::uint32_t mask) {
     std::vector<std::string_view> names;
-    for (std::size_t row = 0; row < kValueTypes.size(); ++row) {
-        if ((mask >> row & 1U) != 0) names.push_back(kValueTypes[row].name);
+    for (std::size_t row = 0; row < values::kValueTypes.size(); ++row) {
+        if ((mask >> row & 1U) != 0) names.push_back(values::kValueTypes[row].name);
     }
     return fmt::format("{}", fmt::join(names, ", "));
 }

@@ -11,8 +11,8 @@
 
 #include "cli/ExitCode.h"
 #include "cli/FileReader.h"
-#include "cli/TextEscapes.h"
 #include "cli/inspect/ElfLibrary.h"
+#include "values/TextEscapes.h"
 
 namespace cli {
 namespace {
@@ -25,7 +25,7 @@ runtime::FileDescriptor opened(const std::string& path) {
         return openRegularFile(path);
     } catch (const FileError& error) {
         throw CommandError(ExitCode::Other,
-                           fmt::format("{}: {}", printableText(path), error.what()));
+                           fmt::format("{}: {}", values::printableText(path), error.what()));
     }
 }
 
@@ -73,7 +73,7 @@ ElfFile::~ElfFile() {
 }
 
 void ElfFile::refuse(const std::string& why) const {
-    throw CommandError(ExitCode::Other, fmt::format("{}: {}", printableText(path_), why));
+    throw CommandError(ExitCode::Other, fmt::format("{}: {}", values::printableText(path_), why));
 }
 
 void ElfFile::pay(std::size_t bytes) {

@@ -8,13 +8,15 @@
 #include <ostream>
 
 #include "cli/Commands.h"
-#include "cli/JsonValues.h"
-#include "cli/TextEscapes.h"
 #include "cli/describe/OfflineDriver.h"
 #include "cli/inspect/Inspection.h"
+#include "values/JsonValues.h"
+#include "values/TextEscapes.h"
 
 namespace cli {
 namespace {
+
+using values::Json;
 
 constexpr const char* kFooter = R"(Examples:
   mrtu inspect build/arm/out/libmrtu.so
@@ -72,7 +74,7 @@ Loading load(const Inspection& found, const InspectOptions& options, CommandCont
         // The loader would look for a name without a folder somewhere else.
         const auto file = std::filesystem::absolute(options.file).string();
         complain(context, fmt::format("loading {}: its start-up code runs now",
-                                      printableText(options.file)));
+                                      values::printableText(options.file)));
         const OfflineDriver driver(file, options.protocol);
         return {identityOf(driver.protocol()), {}, false};
     } catch (const CommandError& error) {
@@ -82,7 +84,7 @@ Loading load(const Inspection& found, const InspectOptions& options, CommandCont
 
 /// Prints "name           value"; a value may be whatever the file holds.
 void printLine(std::ostream& out, const char* name, const std::string& value) {
-    out << fmt::format("{:<15}{}\n", name, printableText(value));
+    out << fmt::format("{:<15}{}\n", name, values::printableText(value));
 }
 
 void printFile(std::ostream& out, const Inspection& found) {

@@ -8,10 +8,10 @@
 
 #include "cli/ExitCode.h"
 #include "cli/FileReader.h"
-#include "cli/TextEscapes.h"
 #include "cli/inspect/ReadableName.h"
 #include "cli/inspect/SearchPlaces.h"
 #include "cli/inspect/SymbolVersion.h"
+#include "values/TextEscapes.h"
 
 namespace cli {
 namespace {
@@ -30,7 +30,7 @@ std::string descriptionHeaderIn(const std::string& path) {
         bytes = readFile(path, {.bytes = kLargestLibrary});
     } catch (const FileError& error) {
         throw CommandError(ExitCode::Other,
-                           fmt::format("{}: {}", printableText(path), error.what()));
+                           fmt::format("{}: {}", values::printableText(path), error.what()));
     }
     const auto at = bytes.find(kMarker);
     if (at == std::string::npos) return {};
@@ -61,8 +61,9 @@ Surroundings surroundingsOf(const std::string& path, const ElfLibrary& library,
         for (const std::string& name : other.needed)
             if (seen.insert(name).second) waiting.push_back(name);
         if (seen.size() > kMostLibraries) {
-            throw CommandError(ExitCode::Other, fmt::format("{}: needs more than {} libraries",
-                                                            printableText(path), kMostLibraries));
+            throw CommandError(ExitCode::Other,
+                               fmt::format("{}: needs more than {} libraries",
+                                           values::printableText(path), kMostLibraries));
         }
     }
     return around;

@@ -8,9 +8,9 @@
 
 namespace {
 
-using cli::Bytes;
 using cli::TraceStyle;
 using runtime::TraceDirection;
+using values::Bytes;
 
 Bytes bytesOf(std::string_view text) {
     return {text.begin(), text.end()};

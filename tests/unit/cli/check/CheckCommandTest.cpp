@@ -9,11 +9,13 @@
 #include <utility>
 #include <vector>
 
-#include "cli/JsonValues.h"
 #include "tests/unit/cli/InProcess.h"
+#include "values/JsonValues.h"
 
 namespace cli {
 namespace {
+
+using values::Json;
 
 namespace fs = std::filesystem;
 

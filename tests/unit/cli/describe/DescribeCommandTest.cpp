@@ -7,11 +7,13 @@
 #include <utility>
 #include <vector>
 
-#include "cli/JsonValues.h"
 #include "tests/unit/cli/InProcess.h"
+#include "values/JsonValues.h"
 
 namespace cli {
 namespace {
+
+using values::Json;
 
 Outcome describe(std::vector<std::string> words) {
     words.insert(words.begin(), "describe");

@@ -10,6 +10,8 @@
 namespace cli {
 namespace {
 
+using values::Json;
+
 const std::string kDocument = R"(<?xml version="1.0" encoding="utf-8"?>
 <protocol_cfg>
     <name>DEMO</name>

@@ -8,15 +8,17 @@
 #include <functional>
 #include <random>
 
-#include "cli/JsonValues.h"
 #include "cli/inspect/Inspection.h"
 #include "cli/inspect/ReadableName.h"
 #include "tests/unit/cli/InProcess.h"
 #include "tests/unit/cli/inspect/MutableFile.h"
 #include "tests/unit/cli/inspect/SampleFiles.h"
+#include "values/JsonValues.h"
 
 namespace cli {
 namespace {
+
+using values::Json;
 
 template <class Struct>
 Struct structAt(const std::vector<char>& bytes, std::size_t at) {

@@ -4,12 +4,14 @@
 #include <utility>
 #include <vector>
 
-#include "cli/JsonValues.h"
 #include "tests/unit/cli/InProcess.h"
 #include "tests/unit/cli/inspect/SampleFiles.h"
+#include "values/JsonValues.h"
 
 namespace cli {
 namespace {
+
+using values::Json;
 
 Outcome inspect(std::vector<std::string> words) {
     words.insert(words.begin(), "inspect");

@@ -1,22 +1,22 @@
-#include "cli/Numbers.h"
+#include "values/Numbers.h"
 
 #include <fmt/format.h>
 
 #include <charconv>
 #include <limits>
 
-#include "cli/ExitCode.h"
+#include "values/ValueError.h"
 
-namespace cli {
+namespace values {
 namespace {
 
 [[noreturn]] void refuse(std::string_view text, std::string_view what, std::string_view type) {
-    throw CommandError(ExitCode::Usage, fmt::format("'{}' is {} ({})", text, what, type));
+    throw ValueError(fmt::format("'{}' is {} ({})", text, what, type));
 }
 
 [[noreturn]] void refuseRange(std::string_view text, const ValueType& type) {
-    throw CommandError(ExitCode::Usage, fmt::format("'{}' is out of range for {} ({})", text,
-                                                    type.name, rangeText(type)));
+    throw ValueError(
+        fmt::format("'{}' is out of range for {} ({})", text, type.name, rangeText(type)));
 }
 
 /// Takes a sign off the front. @return true for minus.
@@ -87,4 +87,4 @@ std::string rangeText(const ValueType& type) {
     return fmt::format("{}{}..{}", low == 0 ? "" : "-", low, largestMagnitude(type, false));
 }
 
-}  // namespace cli
+}  // namespace values

@@ -4,9 +4,9 @@
 #include <string>
 #include <string_view>
 
-#include "cli/Bytes.h"
+#include "values/LittleEndian.h"
 
-namespace cli {
+namespace values {
 
 /// @return the bytes as printable text without quotes: quotes, backslashes, line ends and tabs as
 /// \" \\ \n \r \t, zero as \0, and every other byte that is neither printable ASCII nor part of a
@@ -19,11 +19,11 @@ std::string printableText(std::string_view text);
 
 /// Undoes escapeText(). A text in double quotes loses them; characters that need no escape may
 /// stand for themselves.
-/// Errors: CommandError (Usage) on an unknown or cut escape or a quote without its partner.
+/// Errors: ValueError on an unknown or cut escape or a quote without its partner.
 Bytes unescapeText(std::string_view text);
 
 /// @return the length of the UTF-8 character that `bytes` begins with; 0 when there is none.
 /// Overlong forms, surrogates and numbers above U+10FFFF are none.
 std::size_t utf8Length(ByteView bytes);
 
-}  // namespace cli
+}  // namespace values

@@ -1,4 +1,4 @@
-// What the command knows of the data types: enough to turn values into text and back.
+// What is known of the data types: enough to turn values into text and back.
 #pragma once
 
 #include <array>
@@ -9,7 +9,7 @@
 
 #include "platform/ITag.h"
 
-namespace cli {
+namespace values {
 
 enum class ValueKind : std::uint8_t {
     Boolean,  ///< One byte, 0 or 1.
@@ -89,4 +89,4 @@ std::string typeName(ValueShape shape);
 /// @return the items of an array, text or binary; 1 for everything else.
 std::size_t itemCount(ValueShape shape);
 
-}  // namespace cli
+}  // namespace values

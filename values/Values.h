@@ -11,13 +11,13 @@
 #include <string>
 #include <string_view>
 
-#include "cli/Bytes.h"
-#include "cli/ValueTypes.h"
+#include "values/LittleEndian.h"
+#include "values/ValueTypes.h"
 
-namespace cli {
+namespace values {
 
 /// @return the value in run-time form, exactly shape.bytes bytes.
-/// Errors: CommandError (Usage) when the text is no value of that type: wrong form, out of range,
+/// Errors: ValueError when the text is no value of that type: wrong form, out of range,
 /// wrong item count, text too long, or a type that has no text form (time, object).
 Bytes parseValue(ValueShape shape, std::string_view text);
 
@@ -32,4 +32,4 @@ std::string formatItem(const ValueType& type, ByteView value);
 /// @return the text without the zeroes that fill it up.
 ByteView withoutPadding(ByteView text);
 
-}  // namespace cli
+}  // namespace values

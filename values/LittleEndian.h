@@ -3,13 +3,13 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <span>
-#include <vector>
 
-namespace cli {
+#include "wire/Bytes.h"
 
-using Bytes = std::vector<std::uint8_t>;
-using ByteView = std::span<const std::uint8_t>;
+namespace values {
+
+using wire::Bytes;
+using wire::ByteView;
 
 /// Appends the low `count` bytes of `bits`, least significant first.
 inline void appendLittleEndian(Bytes& out, std::uint64_t bits, std::size_t count) {
@@ -25,4 +25,4 @@ inline std::uint64_t fromLittleEndian(ByteView bytes) {
     return bits;
 }
 
-}  // namespace cli
+}  // namespace values

@@ -3,10 +3,10 @@
 
 #include <nlohmann/json.hpp>
 
-#include "cli/Bytes.h"
-#include "cli/ValueTypes.h"
+#include "values/LittleEndian.h"
+#include "values/ValueTypes.h"
 
-namespace cli {
+namespace values {
 
 /// The order of the members is the order of their creation.
 using Json = nlohmann::ordered_json;
@@ -16,4 +16,4 @@ using Json = nlohmann::ordered_json;
 /// binary values ("0x..."); a string that is not UTF-8 is the array of its bytes.
 Json jsonValue(ValueShape shape, ByteView value);
 
-}  // namespace cli
+}  // namespace values

@@ -11,7 +11,7 @@
 #include <string>
 #include <string_view>
 
-namespace cli {
+namespace values {
 
 /// One order of a number of 2, 4 or 8 bytes in 16-bit registers.
 struct ByteOrder {
@@ -26,8 +26,8 @@ std::span<const ByteOrder> byteOrders();
 /// count as equal; other conversions may stand in front of the order or behind it and keep their
 /// places: "int(neg)@ABCD". In the areas of 32-bit registers (LONG) the conversions are others.
 /// @return the URI that a driver takes; a URI without an order as it is.
-/// Errors: CommandError (Usage) when the order is unknown, does not fit the type's length, or
+/// Errors: ValueError when the order is unknown, does not fit the type's length, or
 /// stands beside swap2, swap4 or swap8. The text does not repeat the URI.
 std::string withoutByteOrder(const std::string& uri);
 
-}  // namespace cli
+}  // namespace values

@@ -1,12 +1,12 @@
 // Texts that are no value, and what is said about them.
 #include <gtest/gtest.h>
 
-#include "tests/unit/cli/ValueSupport.h"
+#include "tests/unit/values/ValueSupport.h"
 
 namespace {
 
-using cli::ValueShape;
-using cli_test::refusal;
+using values::ValueShape;
+using values_test::refusal;
 using enum ICU_Type;
 
 struct Refused {
@@ -97,14 +97,14 @@ const Refused kRefused[] = {
 TEST(RefusedValues, AreNamedTogetherWithWhatWouldDo) {
     for (const Refused& row : kRefused) {
         EXPECT_EQ(refusal(row.shape, row.text), row.complaint)
-            << cli::typeName(row.shape) << ": " << row.text;
+            << values::typeName(row.shape) << ": " << row.text;
     }
 }
 
 TEST(RefusedValues, OneTooManyIsRefusedForEveryWholeNumber) {
-    for (const cli::ValueType& row : cli::kValueTypes) {
-        const bool isSigned = row.kind == cli::ValueKind::Signed;
-        if (!isSigned && row.kind != cli::ValueKind::Unsigned) continue;
+    for (const values::ValueType& row : values::kValueTypes) {
+        const bool isSigned = row.kind == values::ValueKind::Signed;
+        if (!isSigned && row.kind != values::ValueKind::Unsigned) continue;
         // 2^(bits - 1) or 2^bits, as hexadecimal text.
         const unsigned bits = 8U * row.bytes - (isSigned ? 1 : 0);
         const std::string limit =

@@ -5,7 +5,7 @@
 #include <string_view>
 #include <vector>
 
-namespace cli {
+namespace values {
 
 /// @return the edits that lead from one word to the other: characters inserted, left out, replaced,
 /// or two neighbours exchanged. Upper and lower case count as equal.
@@ -15,4 +15,4 @@ std::size_t editDistance(std::string_view a, std::string_view b);
 /// word's characters, and at least two, would have to change.
 std::string nearestName(std::string_view word, const std::vector<std::string>& names);
 
-}  // namespace cli
+}  // namespace values

@@ -1,13 +1,13 @@
-#include "cli/JsonValues.h"
+#include "values/JsonValues.h"
 
 #include <charconv>
 #include <cmath>
 
-#include "cli/Numbers.h"
-#include "cli/TextEscapes.h"
-#include "cli/Values.h"
+#include "values/Numbers.h"
+#include "values/TextEscapes.h"
+#include "values/Values.h"
 
-namespace cli {
+namespace values {
 namespace {
 
 /// JSON knows one kind of number; the shortest text of a float, read as a double, is what prints
@@ -65,4 +65,4 @@ Json jsonValue(ValueShape shape, ByteView value) {
     return items;
 }
 
-}  // namespace cli
+}  // namespace values

@@ -1,8 +1,8 @@
-#include "cli/ValueTypes.h"
+#include "values/ValueTypes.h"
 
 #include <algorithm>
 
-namespace cli {
+namespace values {
 
 ValueShape shapeOf(const ITag& tag) {
     return {tag.GetVarType(), static_cast<std::size_t>(std::max(0, tag.GetVarLength()))};
@@ -24,4 +24,4 @@ std::size_t itemCount(ValueShape shape) {
     return row.name.ends_with('-') ? shape.bytes / row.bytes : 1;
 }
 
-}  // namespace cli
+}  // namespace values

@@ -1,8 +1,8 @@
-#include "cli/NearestName.h"
+#include "values/NearestName.h"
 
 #include <algorithm>
 
-namespace cli {
+namespace values {
 namespace {
 
 char lower(char c) {
@@ -52,4 +52,4 @@ std::string nearestName(std::string_view word, const std::vector<std::string>& n
     return nearest;
 }
 
-}  // namespace cli
+}  // namespace values

@@ -1,15 +1,15 @@
 // Texts of devices on a terminal.
-#include "cli/TextEscapes.h"
+#include "values/TextEscapes.h"
 
 #include <gtest/gtest.h>
 
-#include "tests/unit/cli/ValueSupport.h"
+#include "tests/unit/values/ValueSupport.h"
 
 namespace {
 
-using cli::escapeText;
-using cli::unescapeText;
-using cli_test::bytesOf;
+using values::escapeText;
+using values::unescapeText;
+using values_test::bytesOf;
 
 struct Row {
     std::string_view bytes;
@@ -50,10 +50,10 @@ TEST(TextEscapes, AreUndone) {
 }
 
 TEST(TextEscapes, PrintableTextKeepsQuotesAndBackslashes) {
-    EXPECT_EQ("a \"b\" c:\\d", cli::printableText("a \"b\" c:\\d"));
+    EXPECT_EQ("a \"b\" c:\\d", values::printableText("a \"b\" c:\\d"));
     EXPECT_EQ("\\x1b[2J\\x0a\\x00\\xff\\x7f\\xc2\\x9b",
-              cli::printableText("\x1b[2J\n\0\xff\x7f\xc2\x9b"sv));
-    EXPECT_EQ("K\xc3\xbchler", cli::printableText("K\xc3\xbchler"));
+              values::printableText("\x1b[2J\n\0\xff\x7f\xc2\x9b"sv));
+    EXPECT_EQ("K\xc3\xbchler", values::printableText("K\xc3\xbchler"));
 }
 
 TEST(TextEscapes, QuotesInsideAnUnquotedTextStandForThemselves) {

@@ -7,10 +7,10 @@
 #include <cmath>
 #include <limits>
 
-#include "cli/ExitCode.h"
-#include "cli/Numbers.h"
+#include "values/Numbers.h"
+#include "values/ValueError.h"
 
-namespace cli {
+namespace values {
 namespace {
 
 template <typename Real>
@@ -25,7 +25,7 @@ struct Pattern<double> {
 };
 
 [[noreturn]] void refuse(std::string_view text, std::string_view what, std::string_view type) {
-    throw CommandError(ExitCode::Usage, fmt::format("'{}' is {} {}", text, what, type));
+    throw ValueError(fmt::format("'{}' is {} {}", text, what, type));
 }
 
 template <typename Real>
@@ -105,4 +105,4 @@ std::string formatReal(const ValueType& type, std::uint64_t bits) {
                            : formatPattern<double>(bits);
 }
 
-}  // namespace cli
+}  // namespace values

@@ -1,13 +1,13 @@
-#include "cli/TextEscapes.h"
+#include "values/TextEscapes.h"
 
 #include <fmt/format.h>
 
 #include <array>
 #include <charconv>
 
-#include "cli/ExitCode.h"
+#include "values/ValueError.h"
 
-namespace cli {
+namespace values {
 namespace {
 
 struct Escape {
@@ -40,7 +40,7 @@ const Escape* escapeOf(std::uint8_t byte) {
 }
 
 [[noreturn]] void refuse(std::string_view text, std::string_view why) {
-    throw CommandError(ExitCode::Usage, fmt::format("text '{}': {}", text, why));
+    throw ValueError(fmt::format("text '{}': {}", text, why));
 }
 
 /// Reads what follows a backslash at `at` and moves `at` behind it.
@@ -133,4 +133,4 @@ Bytes unescapeText(std::string_view text) {
     return bytes;
 }
 
-}  // namespace cli
+}  // namespace values

@@ -1,4 +1,4 @@
-#include "cli/ByteOrder.h"
+#include "values/ByteOrder.h"
 
 #include <fmt/format.h>
 #include <fmt/ranges.h>
@@ -9,11 +9,11 @@
 #include <cstdlib>
 #include <vector>
 
-#include "cli/ExitCode.h"
-#include "cli/Numbers.h"
-#include "cli/ValueTypes.h"
+#include "values/Numbers.h"
+#include "values/ValueError.h"
+#include "values/ValueTypes.h"
 
-namespace cli {
+namespace values {
 namespace {
 
 // The driver swaps the two bytes of each register, and takes the first register for the low one.
@@ -55,7 +55,7 @@ constexpr std::size_t kAreaField = 1;
 constexpr std::size_t kTypeField = 3;
 
 [[noreturn]] void refuse(const std::string& text) {
-    throw CommandError(ExitCode::Usage, text);
+    throw ValueError(text);
 }
 
 std::vector<std::string> split(std::string_view text, char separator) {
@@ -188,4 +188,4 @@ std::string withoutByteOrder(const std::string& uri) {
     return fmt::format("{}", fmt::join(fields, "?"));
 }
 
-}  // namespace cli
+}  // namespace values

@@ -1,8 +1,8 @@
-#include "cli/NearestName.h"
+#include "values/NearestName.h"
 
 #include <gtest/gtest.h>
 
-namespace cli {
+namespace values {
 namespace {
 
 TEST(NearestName, DistanceCountsEdits) {
@@ -39,4 +39,4 @@ TEST(NearestName, IsEmptyWhereNothingIsNear) {
 }
 
 }  // namespace
-}  // namespace cli
+}  // namespace values

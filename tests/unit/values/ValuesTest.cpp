@@ -1,5 +1,5 @@
 // Values that are accepted, and the way back.
-#include "cli/Values.h"
+#include "values/Values.h"
 
 #include <gtest/gtest.h>
 
@@ -8,15 +8,15 @@
 #include <limits>
 #include <random>
 
-#include "cli/Numbers.h"
-#include "tests/unit/cli/ValueSupport.h"
+#include "tests/unit/values/ValueSupport.h"
+#include "values/Numbers.h"
 
 namespace {
 
-using cli::Bytes;
-using cli::formatValue;
-using cli::parseValue;
-using cli::ValueShape;
+using values::Bytes;
+using values::formatValue;
+using values::parseValue;
+using values::ValueShape;
 using enum ICU_Type;
 
 struct Accepted {
@@ -101,7 +101,7 @@ const Accepted kAccepted[] = {
 
 TEST(Values, AreReadByTheTagsType) {
     for (const Accepted& row : kAccepted) {
-        SCOPED_TRACE(cli::typeName(row.shape) + ": " + std::string(row.text));
+        SCOPED_TRACE(values::typeName(row.shape) + ": " + std::string(row.text));
         EXPECT_EQ(parseValue(row.shape, row.text), row.bytes);
     }
 }
@@ -109,15 +109,15 @@ TEST(Values, AreReadByTheTagsType) {
 TEST(Values, ArePrintedInOneForm) {
     for (const Accepted& row : kAccepted) {
         const std::string_view expected = row.printed.empty() ? row.text : row.printed;
-        EXPECT_EQ(formatValue(row.shape, row.bytes), expected) << cli::typeName(row.shape);
+        EXPECT_EQ(formatValue(row.shape, row.bytes), expected) << values::typeName(row.shape);
     }
 }
 
 /// Every type that has a text form, with room for a few items.
 std::vector<ValueShape> writableShapes() {
     std::vector<ValueShape> shapes;
-    for (const cli::ValueType& row : cli::kValueTypes) {
-        if (row.kind == cli::ValueKind::Opaque) continue;
+    for (const values::ValueType& row : values::kValueTypes) {
+        if (row.kind == values::ValueKind::Opaque) continue;
         shapes.push_back({row.type, row.name.ends_with('-') ? row.bytes * std::size_t{5}
                                                             : std::size_t{row.bytes}});
     }
@@ -138,7 +138,7 @@ TEST(Values, ReadBackExactlyWhateverTheirBits) {
                 b = static_cast<std::uint8_t>(random() & (countsBits(shape.type) ? 1 : 255));
             }
             const std::string text = formatValue(shape, bytes);
-            ASSERT_EQ(parseValue(shape, text), bytes) << cli::typeName(shape) << ": " << text;
+            ASSERT_EQ(parseValue(shape, text), bytes) << values::typeName(shape) << ": " << text;
         }
     }
 }
@@ -148,7 +148,7 @@ TEST(Values, EveryKindOfFloatReadsBackExactly) {
     for (std::uint32_t top = 0; top < 512; ++top) {
         for (const std::uint32_t low : {0U, 1U, 0x2AAAAAU, 0x400000U, 0x7FFFFFU}) {
             Bytes bytes;
-            cli::appendLittleEndian(bytes, top << 23 | low, 4);
+            values::appendLittleEndian(bytes, top << 23 | low, 4);
             const std::string text = formatValue({float_, 4}, bytes);
             ASSERT_EQ(parseValue({float_, 4}, text), bytes) << text;
         }
@@ -156,7 +156,7 @@ TEST(Values, EveryKindOfFloatReadsBackExactly) {
 }
 
 TEST(Values, WholeNumberRangesEndWhereTheTypesEnd) {
-    const auto range = [](ICU_Type type) { return cli::rangeText(cli::rowOf(type)); };
+    const auto range = [](ICU_Type type) { return values::rangeText(values::rowOf(type)); };
     EXPECT_EQ(range(byte), "-128..127");
     EXPECT_EQ(range(short_), "-32768..32767");
     EXPECT_EQ(range(int_), "-2147483648..2147483647");
@@ -174,11 +174,11 @@ TEST(Values, TypesWithoutATextFormAreShownAsBytes) {
 }
 
 TEST(Values, TypesAreNamedAsUrisNameThem) {
-    EXPECT_EQ(cli::typeName({int_, 4}), "int");
-    EXPECT_EQ(cli::typeName({intArray, 40}), "int-10");
-    EXPECT_EQ(cli::typeName({string, 20}), "string-20");
-    EXPECT_EQ(cli::typeName({booleanArray, 16}), "boolean-16");
-    EXPECT_EQ(cli::typeName({int64Array, 16}), "int64-2");
+    EXPECT_EQ(values::typeName({int_, 4}), "int");
+    EXPECT_EQ(values::typeName({intArray, 40}), "int-10");
+    EXPECT_EQ(values::typeName({string, 20}), "string-20");
+    EXPECT_EQ(values::typeName({booleanArray, 16}), "boolean-16");
+    EXPECT_EQ(values::typeName({int64Array, 16}), "int64-2");
 }
 
 }  // namespace

@@ -1,19 +1,19 @@
-#include "cli/Values.h"
+#include "values/Values.h"
 
 #include <fmt/format.h>
 
 #include <algorithm>
 #include <charconv>
 
-#include "cli/ExitCode.h"
-#include "cli/Numbers.h"
-#include "cli/TextEscapes.h"
+#include "values/Numbers.h"
+#include "values/TextEscapes.h"
+#include "values/ValueError.h"
 
-namespace cli {
+namespace values {
 namespace {
 
 [[noreturn]] void refuse(const std::string& why) {
-    throw CommandError(ExitCode::Usage, why);
+    throw ValueError(why);
 }
 
 void appendItem(Bytes& out, const ValueType& type, std::string_view text) {
@@ -144,4 +144,4 @@ ByteView withoutPadding(ByteView text) {
     return text.first(static_cast<std::size_t>(text.rend() - last));
 }
 
-}  // namespace cli
+}  // namespace values

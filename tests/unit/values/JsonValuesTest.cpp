@@ -1,15 +1,15 @@
 // Values in JSON.
-#include "cli/JsonValues.h"
+#include "values/JsonValues.h"
 
 #include <gtest/gtest.h>
 
-#include "cli/Values.h"
-#include "tests/unit/cli/ValueSupport.h"
+#include "tests/unit/values/ValueSupport.h"
+#include "values/Values.h"
 
 namespace {
 
-using cli::Bytes;
-using cli::ValueShape;
+using values::Bytes;
+using values::ValueShape;
 using enum ICU_Type;
 
 struct Row {
@@ -38,13 +38,13 @@ const Row kRows[] = {
 
 TEST(JsonValues, HaveTheTagsType) {
     for (const Row& row : kRows) {
-        const Bytes bytes = cli::parseValue(row.shape, row.value);
-        EXPECT_EQ(cli::jsonValue(row.shape, bytes).dump(), row.json) << row.value;
+        const Bytes bytes = values::parseValue(row.shape, row.value);
+        EXPECT_EQ(values::jsonValue(row.shape, bytes).dump(), row.json) << row.value;
     }
 }
 
 TEST(JsonValues, TextInUtf8StaysText) {
-    const auto json = cli::jsonValue({string, 8}, cli_test::bytesOf("K\xc3\xbch\0\0\0\0"));
+    const auto json = values::jsonValue({string, 8}, values_test::bytesOf("K\xc3\xbch\0\0\0\0"));
     EXPECT_EQ(json.get<std::string>(), "K\xc3\xbch");
 }
 

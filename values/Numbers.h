@@ -1,16 +1,16 @@
 // Numbers as text. Pure; blanks and tabs around a number are ignored.
 //
 // Every function that reads text answers with the number's bits in the low `bytes` bytes, and
-// fails with CommandError (Usage), whose text names the offending text and the accepted range.
+// fails with ValueError, whose text names the offending text and the accepted range.
 #pragma once
 
 #include <cstdint>
 #include <string>
 #include <string_view>
 
-#include "cli/ValueTypes.h"
+#include "values/ValueTypes.h"
 
-namespace cli {
+namespace values {
 
 /// @return the text without blanks and tabs at both ends.
 std::string_view trimmed(std::string_view text);
@@ -34,4 +34,4 @@ std::string formatReal(const ValueType& type, std::uint64_t bits);
 /// @return the range of a whole-number type, e.g. "-128..127".
 std::string rangeText(const ValueType& type);
 
-}  // namespace cli
+}  // namespace values

@@ -1,14 +1,14 @@
-#include "cli/ByteOrder.h"
+#include "values/ByteOrder.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
 
-#include "cli/ExitCode.h"
+#include "values/ValueError.h"
 
 namespace {
 
-using cli::withoutByteOrder;
+using values::withoutByteOrder;
 
 TEST(ByteOrder, ANameBecomesConversions) {
     const struct {
@@ -62,8 +62,7 @@ TEST(ByteOrder, AnUnknownTypeIsLeftToTheDriver) {
 std::string refusalOf(const std::string& uri) {
     try {
         return "accepted: " + withoutByteOrder(uri);
-    } catch (const cli::CommandError& error) {
-        EXPECT_EQ(cli::ExitCode::Usage, error.code()) << uri;
+    } catch (const values::ValueError& error) {
         return error.what();
     }
 }
@@ -94,13 +93,14 @@ TEST(ByteOrder, OneThatDoesNotFitIsRefusedWithTheChoices) {
 }
 
 TEST(ByteOrder, EachNameOfTheTableIsAPermutationAndStandsOnce) {
-    const auto orders = cli::byteOrders();
+    const auto orders = values::byteOrders();
     EXPECT_EQ(14U, orders.size());
-    for (const cli::ByteOrder& order : orders) {
+    for (const values::ByteOrder& order : orders) {
         std::string letters(order.name);
         std::sort(letters.begin(), letters.end());
         EXPECT_EQ(std::string("ABCDEFGH").substr(0, order.name.size()), letters);
-        EXPECT_EQ(1, std::count_if(orders.begin(), orders.end(), [&](const cli::ByteOrder& each) {
+        EXPECT_EQ(1,
+                  std::count_if(orders.begin(), orders.end(), [&](const values::ByteOrder& each) {
                       return each.name == order.name;
                   }));
     }
