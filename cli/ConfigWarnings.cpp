@@ -6,15 +6,16 @@
 #include <set>
 
 #include "cli/check/LintConfig.h"
-#include "cli/describe/DescriptionBlock.h"
+#include "settings/DescriptionBlock.h"
+#include "settings/TextError.h"
 
 namespace cli {
 namespace {
 
-std::optional<Description> descriptionOf(const IProtocol& protocol) {
+std::optional<settings::Description> descriptionOf(const IProtocol& protocol) {
     try {
-        return parseDescription(inflateDescription(protocol.GetXml()));
-    } catch (const CommandError&) {
+        return settings::parseDescription(settings::inflateDescription(protocol.GetXml()));
+    } catch (const settings::DescriptionError&) {
         return std::nullopt;
     }
 }
@@ -26,7 +27,7 @@ void warnOfUnknownKeys(CommandContext& context, const IProtocol& protocol,
     const auto description = descriptionOf(protocol);
     if (!description) return;
     std::set<std::string> said;
-    for (const Finding& finding : lintConfig(scanConfig("", configText), *description)) {
+    for (const Finding& finding : lintConfig(settings::scanConfig("", configText), *description)) {
         if (finding.rule != "unknown-key" || !said.insert(finding.message).second) continue;
         complain(context,
                  fmt::format("configuration: {}; {}", finding.message, finding.suggestion));

@@ -4,13 +4,16 @@
 
 #include <CLI/CLI.hpp>
 
-#include "cli/ConfigText.h"
-#include "cli/FileReader.h"
 #include "cli/OverrideWords.h"
+#include "cli/UsageErrors.h"
 #include "cli/Validators.h"
+#include "settings/ConfigText.h"
+#include "settings/FileReader.h"
 
 namespace cli {
 namespace {
+
+using settings::ConfigItem;
 
 std::vector<std::string> baudRates() {
     std::vector<std::string> rates;
@@ -52,9 +55,9 @@ void addShortForms(CLI::App& command, LineOptions& options) {
 std::vector<ConfigItem> itemsOf(const LineOptions& options) {
     std::vector<ConfigItem> items;
     for (const std::string& setting : options.settings)
-        items.push_back(parseConfigItem(setting));
+        items.push_back(settings::parseConfigItem(setting));
     const auto add = [&items](const std::string& key, const std::string& value) {
-        if (!value.empty()) items.push_back(parseConfigItem(key + '=' + value));
+        if (!value.empty()) items.push_back(settings::parseConfigItem(key + '=' + value));
     };
     add("baudrate", options.baud);
     add("parity", options.parity);
@@ -130,15 +133,23 @@ void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& con
     addPluginOption(command, context);
 }
 
-std::string configTextOf(const LineOptions& options) {
-    const std::string base =
-        options.configFile.empty()
-            ? defaultConfig(options.sim ? "3" : "1")
-            : readText("configuration", options.configFile, {.bytes = kConfigBytes});
+namespace {
+
+std::string configTextFrom(const LineOptions& options) {
+    const std::string base = options.configFile.empty()
+                                 ? settings::defaultConfig(options.sim ? "3" : "1")
+                                 : settings::readText("configuration", options.configFile,
+                                                      {.bytes = settings::kConfigBytes});
     std::vector<ConfigItem> items = itemsOf(options);
-    const bool bitsMissing = !itemOf(withItems(base, items), "bits");
+    const bool bitsMissing = !settings::itemOf(settings::withItems(base, items), "bits");
     if (options.ascii && bitsMissing) items.push_back({"bits", "8"});
-    return withItems(base, items);
+    return settings::withItems(base, items);
+}
+
+}  // namespace
+
+std::string configTextOf(const LineOptions& options) {
+    return withUsageErrors([&] { return configTextFrom(options); });
 }
 
 std::vector<PortMapping> portsOf(const LineOptions& options, const std::string& configText) {
@@ -148,7 +159,7 @@ std::vector<PortMapping> portsOf(const LineOptions& options, const std::string& 
             const std::size_t equals = port.find('=');
             mappings.push_back({port.substr(0, equals), port.substr(equals + 1)});
         } else {
-            mappings.push_back({itemOf(configText, "uart").value_or("com1"), port});
+            mappings.push_back({settings::itemOf(configText, "uart").value_or("com1"), port});
         }
         if (mappings.back().device.empty()) {
             throw CommandError(ExitCode::Usage, fmt::format("--port {}: no device", port));

@@ -8,11 +8,11 @@
 #include <optional>
 
 #include "cli/Choices.h"
-#include "cli/ConfigText.h"
 #include "cli/OverrideKeys.h"
 #include "cli/OverrideWords.h"
 #include "runtime/StoragePath.h"
 #include "runtime/StoredValue.h"
+#include "settings/ConfigText.h"
 
 namespace cli {
 namespace {
@@ -33,14 +33,14 @@ bool isOneBased(const std::string& model) {
 
 /// A node counts from 1 only where its own model and that of all nodes do.
 bool configuredModicon(std::string_view configText, int node) {
-    return isOneBased(modelOf(configText, node)) &&
-           isOneBased(itemOf(configText, "model").value_or("1"));
+    return isOneBased(settings::modelOf(configText, node)) &&
+           isOneBased(settings::itemOf(configText, "model").value_or("1"));
 }
 
 std::optional<ActiveOverride> serialOverride(const SerialSetting& setting,
                                              const runtime::StoredEntry& entry,
                                              std::string_view configText) {
-    const std::string configured = itemOf(configText, configKeyOf(setting)).value_or("");
+    const std::string configured = settings::itemOf(configText, configKeyOf(setting)).value_or("");
     const std::string stored =
         wordOf(setting, static_cast<std::uint32_t>(runtime::storedInt(entry.value)));
     if (sameWord(stored, configured)) return std::nullopt;

@@ -4,8 +4,8 @@
 
 #include <sstream>
 
-#include "cli/ConfigText.h"
 #include "cli/OverrideKeys.h"
+#include "settings/ConfigText.h"
 #include "values/LittleEndian.h"
 #include "values/ValueTypes.h"
 
@@ -87,7 +87,7 @@ void Overrides::setSerial(const std::vector<SerialChange>& changes) {
 
 std::set<int> Overrides::nodes() {
     std::set<int> nodes;
-    for (const int node : nodesOf(session_.configText()))
+    for (const int node : settings::nodesOf(session_.configText()))
         nodes.insert(node);
     addConfiguredNodes(session_.channel().command("getid").value_or(""), nodes);
     if (session_.storage() == nullptr) return nodes;

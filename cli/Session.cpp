@@ -5,7 +5,6 @@
 #include <ostream>
 #include <system_error>
 
-#include "cli/ConfigText.h"
 #include "cli/ConfigWarnings.h"
 #include "cli/SimNodes.h"
 #include "cli/TraceText.h"
@@ -13,6 +12,7 @@
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
 #include "runtime/TracingSerialFactory.h"
+#include "settings/ConfigText.h"
 
 namespace cli {
 namespace {
@@ -27,7 +27,7 @@ Value valueOr(runtime::Result<Value, Error> result, ExitCode code) {
 }
 
 bool isAscii(const std::string& configText) {
-    return itemOf(configText, "txMode") == "ASCII";
+    return settings::itemOf(configText, "txMode") == "ASCII";
 }
 
 std::unique_ptr<sim::Simulator> makeSimulator(const LineOptions& options,
@@ -126,8 +126,8 @@ void Session::start() {
         } catch (const std::system_error& error) {
             throw CommandError(ExitCode::Port, fmt::format("simulated line: {}", error.what()));
         }
-        parts_->mapPort(
-            {itemOf(parts_->configText, "uart").value_or("com1"), parts_->simulator->path()});
+        parts_->mapPort({settings::itemOf(parts_->configText, "uart").value_or("com1"),
+                         parts_->simulator->path()});
     }
     if (parts_->storage) {
         reportUnused(parts_->context, *parts_->storage, parts_->channel.protocol().GetIdent());

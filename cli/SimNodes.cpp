@@ -2,7 +2,7 @@
 
 #include <set>
 
-#include "cli/ConfigText.h"
+#include "settings/ConfigText.h"
 
 namespace cli {
 namespace {
@@ -36,13 +36,13 @@ std::vector<sim::NodeOptions> simNodesFor(std::string_view configText) {
     std::set<int> addresses;
     for (int address = 1; address <= kDefaultNodes; ++address)
         addresses.insert(address);
-    for (const int address : nodesOf(configText)) {
+    for (const int address : settings::nodesOf(configText)) {
         if (address >= 1 && address <= kHighestNode) addresses.insert(address);
     }
     std::vector<sim::NodeOptions> nodes;
     nodes.reserve(addresses.size());
     for (const int address : addresses) {
-        nodes.push_back(node(address, hasLongs(modelOf(configText, address))));
+        nodes.push_back(node(address, hasLongs(settings::modelOf(configText, address))));
     }
     return nodes;
 }

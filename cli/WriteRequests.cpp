@@ -1,9 +1,9 @@
 #include "cli/WriteRequests.h"
 
 #include <algorithm>
-#include <cstdlib>
 
-#include "cli/ConfigText.h"
+#include "settings/ConfigText.h"
+#include "settings/NumberText.h"
 #include "values/ValueTypes.h"
 
 namespace cli {
@@ -16,11 +16,11 @@ constexpr long kRegisterBytes = 2;
 constexpr std::size_t kLongRegisterBytes = 4;
 
 std::string itemFor(const Session& session, const ITag& tag, const char* key, const char* preset) {
-    return nodeItemOf(session.configText(), session.nodeOf(tag), key).value_or(preset);
+    return settings::nodeItemOf(session.configText(), session.nodeOf(tag), key).value_or(preset);
 }
 
 long lengthFor(const Session& session, const ITag& tag, const char* key, const char* preset) {
-    return std::strtol(itemFor(session, tag, key, preset).c_str(), nullptr, 0);
+    return settings::readNumber(itemFor(session, tag, key, preset)).value;
 }
 
 // The driver takes anything but "15" for 5, and anything but "16" for 6.

@@ -44,7 +44,7 @@ if(MRTU_TOOLS)
     target_link_libraries(mrtu_${room} PUBLIC $<INSTALL_INTERFACE:mrtu_platform>)
   endforeach()
   list(APPEND packaged mrtu_wire mrtu_sim mrtu_runtime)
-  list(APPEND packaged_headers wire sim runtime)
+  list(APPEND packaged_headers posix wire sim runtime)
 endif()
 
 install(TARGETS ${packaged} EXPORT mrtu

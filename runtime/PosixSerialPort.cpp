@@ -14,6 +14,8 @@
 namespace runtime {
 namespace {
 
+using posix::FileDescriptor;
+
 constexpr const char* kInUse = "in use";
 
 FileDescriptor openTerminal(const std::string& device) {

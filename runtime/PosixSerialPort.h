@@ -10,7 +10,7 @@
 #include <string>
 
 #include "platform/ISerialFactory.h"
-#include "runtime/FileDescriptor.h"
+#include "posix/FileDescriptor.h"
 #include "runtime/LastAct.h"
 #include "runtime/LineTransfer.h"
 #include "runtime/PosixLine.h"
@@ -72,7 +72,7 @@ class PosixSerialPort final : public ISerialPort {
 
   private:
     PosixSerialPort(const PortRequest& request, std::shared_ptr<SerialErrors> errors,
-                    FileDescriptor fd, const termios& found);
+                    posix::FileDescriptor fd, const termios& found);
     std::string applyFormat();
     std::string applyDirection();
     bool changeDirection(serial_rs485 wanted);
@@ -81,7 +81,7 @@ class PosixSerialPort final : public ISerialPort {
     std::string label_;
     int gapFloorMs_;
     std::shared_ptr<SerialErrors> errors_;
-    FileDescriptor fd_;
+    posix::FileDescriptor fd_;
     PosixLine line_;
     const FoundTerminal found_;
     LastAct putBackAtTheEnd_;

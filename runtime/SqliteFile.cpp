@@ -10,11 +10,13 @@
 #include <cstring>
 #include <string_view>
 
-#include "runtime/FileDescriptor.h"
+#include "posix/FileDescriptor.h"
 #include "runtime/StoragePath.h"
 
 namespace runtime {
 namespace {
+
+using posix::FileDescriptor;
 
 using Fault = std::optional<StorageError>;
 using namespace std::string_view_literals;

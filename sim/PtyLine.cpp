@@ -13,12 +13,14 @@
 namespace sim {
 namespace {
 
+using posix::FileDescriptor;
+
 [[noreturn]] void fail(const std::string& what) {
     throw std::system_error(errno, std::generic_category(), what);
 }
 
-Descriptor openMaster() {
-    Descriptor master(::posix_openpt(O_RDWR | O_NOCTTY | O_CLOEXEC));
+FileDescriptor openMaster() {
+    FileDescriptor master(::posix_openpt(O_RDWR | O_NOCTTY | O_CLOEXEC));
     if (!master) fail("no pseudo terminal");
     if (::grantpt(master.get()) != 0 || ::unlockpt(master.get()) != 0) fail("pseudo terminal");
     const int flags = ::fcntl(master.get(), F_GETFL);
@@ -28,7 +30,7 @@ Descriptor openMaster() {
     return master;
 }
 
-std::string deviceOf(const Descriptor& master) {
+std::string deviceOf(const FileDescriptor& master) {
     std::array<char, 128> name{};
     const int error = ::ptsname_r(master.get(), name.data(), name.size());
     if (error != 0) throw std::system_error(error, std::generic_category(), "pseudo terminal");
@@ -36,15 +38,15 @@ std::string deviceOf(const Descriptor& master) {
 }
 
 /// Every byte passes as it is: no echo, no line ends, no signals.
-void makeRaw(const Descriptor& terminal, const std::string& device) {
+void makeRaw(const FileDescriptor& terminal, const std::string& device) {
     termios settings{};
     if (::tcgetattr(terminal.get(), &settings) != 0) fail(device);
     ::cfmakeraw(&settings);
     if (::tcsetattr(terminal.get(), TCSANOW, &settings) != 0) fail(device);
 }
 
-Descriptor openDevice(const std::string& device) {
-    Descriptor terminal(::open(device.c_str(), O_RDWR | O_NOCTTY | O_CLOEXEC));
+FileDescriptor openDevice(const std::string& device) {
+    FileDescriptor terminal(::open(device.c_str(), O_RDWR | O_NOCTTY | O_CLOEXEC));
     if (!terminal) fail(device);
     makeRaw(terminal, device);
     return terminal;
@@ -57,21 +59,6 @@ bool pointsTo(const std::string& link, const std::string& target) {
 }
 
 }  // namespace
-
-Descriptor::Descriptor(Descriptor&& other) noexcept : fd_(std::exchange(other.fd_, -1)) {}
-
-Descriptor& Descriptor::operator=(Descriptor&& other) noexcept {
-    if (this != &other) {
-        reset();
-        fd_ = std::exchange(other.fd_, -1);
-    }
-    return *this;
-}
-
-void Descriptor::reset() {
-    if (fd_ >= 0) ::close(fd_);
-    fd_ = -1;
-}
 
 PtyLine::PtyLine(std::string link)
     : master_(openMaster()), device_(deviceOf(master_)), link_(std::move(link)) {
@@ -106,8 +93,8 @@ void PtyLine::hangUp() {
     if (!master_) return;
     // Another simulator may have taken the link over in the meantime.
     if (!link_.empty() && pointsTo(link_, device_)) ::unlink(link_.c_str());
-    master_.reset();
-    keeper_.reset();
+    master_ = FileDescriptor();
+    keeper_ = FileDescriptor();
 }
 
 }  // namespace sim

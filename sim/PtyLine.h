@@ -3,26 +3,10 @@
 
 #include <string>
 
+#include "posix/FileDescriptor.h"
 #include "wire/Bytes.h"
 
 namespace sim {
-
-/// Owns a file descriptor.
-class Descriptor {
-  public:
-    Descriptor() = default;
-    explicit Descriptor(int fd) : fd_(fd) {}
-    Descriptor(Descriptor&& other) noexcept;
-    Descriptor& operator=(Descriptor&& other) noexcept;
-    ~Descriptor() { reset(); }
-
-    void reset();
-    int get() const { return fd_; }
-    explicit operator bool() const { return fd_ >= 0; }
-
-  private:
-    int fd_ = -1;
-};
 
 /// The pair of ends: this side is the simulator's, the device is the masters'. The line holds the
 /// device open itself, so that masters may come and go without ending it, and is raw, without echo.
@@ -59,8 +43,8 @@ class PtyLine {
   private:
     void makeLink();
 
-    Descriptor master_;
-    Descriptor keeper_;  // The device end that keeps the line alive between masters.
+    posix::FileDescriptor master_;
+    posix::FileDescriptor keeper_;  // The device end that keeps the line alive between masters.
     std::string device_;
     std::string link_;
 };

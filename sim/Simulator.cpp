@@ -24,8 +24,8 @@ using wire::Received;
 
 constexpr auto kForever = std::chrono::steady_clock::time_point::max();
 
-Descriptor openEvent() {
-    Descriptor event(::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK));
+posix::FileDescriptor openEvent() {
+    posix::FileDescriptor event(::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK));
     if (!event) throw std::system_error(errno, std::generic_category(), "eventfd");
     return event;
 }

@@ -106,7 +106,7 @@ class Simulator {
     SimulatorOptions options_;
     Slave slave_;
     FaultQueue faults_;
-    Descriptor stopEvent_;
+    posix::FileDescriptor stopEvent_;
     std::unique_ptr<PtyLine> line_;
     std::thread thread_;
     std::atomic<bool> ended_ = false;  // The serving thread has met a stop or a hang-up.

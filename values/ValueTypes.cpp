@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include <algorithm>
+
 namespace values {
 
 ValueShape shapeOf(const ITag& tag) {
@@ -10,6 +12,13 @@ ValueShape shapeOf(const ITag& tag) {
 
 const ValueType& rowOf(ICU_Type type) {
     return kValueTypes.at(static_cast<std::size_t>(type) - 1);
+}
+
+const ValueType* typeNamed(std::string_view name) {
+    const auto* const row =
+        std::find_if(kValueTypes.begin(), kValueTypes.end(),
+                     [name](const ValueType& each) { return each.name == name; });
+    return row != kValueTypes.end() ? row : nullptr;
 }
 
 std::string typeName(ValueShape shape) {

@@ -83,6 +83,9 @@ ValueShape shapeOf(const ITag& tag);
 /// @return the type's row. REQUIRES: `type` is one of the 27 codes.
 const ValueType& rowOf(ICU_Type type);
 
+/// @return the row of that name, with the "-" of an array; null for a name of no type.
+const ValueType* typeNamed(std::string_view name);
+
 /// @return the type as a tag URI writes it, with the item count, e.g. "int-10".
 std::string typeName(ValueShape shape);
 

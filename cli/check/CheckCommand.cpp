@@ -6,11 +6,11 @@
 #include <ostream>
 
 #include "cli/Commands.h"
-#include "cli/FileReader.h"
 #include "cli/check/DriverFacts.h"
 #include "cli/check/LintConfig.h"
 #include "cli/check/LintTags.h"
 #include "cli/describe/OfflineDriver.h"
+#include "settings/FileReader.h"
 
 namespace cli {
 namespace {
@@ -35,8 +35,8 @@ struct Report {
 
 std::vector<TagLine> tagsOf(const Options& options) {
     if (!options.tagsFile.empty()) {
-        return tagLines(options.tagsFile,
-                        readText("tags", options.tagsFile, {.bytes = kTagListBytes}));
+        return tagLines(options.tagsFile, settings::readText("tags", options.tagsFile,
+                                                             {.bytes = settings::kTagListBytes}));
     }
     std::vector<TagLine> tags;
     for (const std::string& uri : options.uris) {
@@ -61,11 +61,12 @@ void checkTags(IProtocol& protocol, const TagSurroundings& surroundings, std::ve
 }
 
 Report check(const Options& options, const std::string& plugin) {
-    const std::string text = readText("configuration", options.configFile, {.bytes = kConfigBytes});
+    const std::string text =
+        settings::readText("configuration", options.configFile, {.bytes = settings::kConfigBytes});
     std::vector<TagLine> tags = tagsOf(options);
     const OfflineDriver driver(plugin, options.protocol);
-    const Description description = parseDescription(driver.description());
-    const ScannedConfig config = scanConfig(options.configFile, text);
+    const settings::Description description = settings::parseDescription(driver.description());
+    const settings::ScannedConfig config = settings::scanConfig(options.configFile, text);
 
     Report report;
     report.tags = tags.size();

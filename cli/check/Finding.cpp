@@ -20,7 +20,7 @@ const char* word(Severity severity) {
 
 }  // namespace
 
-void warn(Findings& out, const char* rule, const Place& place, std::string message,
+void warn(Findings& out, const char* rule, const settings::Place& place, std::string message,
           std::string suggestion) {
     out.push_back({Severity::Warning, rule, place, std::move(message), std::move(suggestion)});
 }

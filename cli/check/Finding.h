@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "cli/ExitCode.h"
+#include "settings/Place.h"
 #include "values/JsonValues.h"
 
 namespace cli {
@@ -15,26 +16,17 @@ enum class Severity : std::uint8_t {
     Error,    ///< The driver refuses it, or every access to it.
 };
 
-/// Where something stands. Lines and columns count from 1, columns in bytes.
-struct Place {
-    std::string source;  ///< A file's name, or "argument" for tags of the command line.
-    int line;
-    int column;
-
-    bool operator==(const Place&) const = default;
-};
-
 struct Finding {
     Severity severity;
     std::string rule;  ///< A name that does not change, e.g. "unknown-key".
-    Place place;
+    settings::Place place;
     std::string message;
     std::string suggestion;  ///< What to write instead; may be empty.
 };
 
 using Findings = std::vector<Finding>;
 
-void warn(Findings& out, const char* rule, const Place& place, std::string message,
+void warn(Findings& out, const char* rule, const settings::Place& place, std::string message,
           std::string suggestion);
 
 int countOf(const Findings& findings, Severity severity);

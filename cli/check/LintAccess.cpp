@@ -6,12 +6,15 @@
 
 #include "cli/check/LintTags.h"
 #include "cli/check/NodeNumber.h"
-#include "cli/check/NumberText.h"
 #include "cli/check/TagSpan.h"
+#include "settings/NumberText.h"
 #include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
+
+using settings::AreaInfo;
+using settings::AreaOffer;
 
 constexpr std::size_t kNodeField = 0;
 constexpr std::size_t kAddressField = 2;
@@ -36,14 +39,14 @@ void emptyTag(const TagLine& tag, const TagSurroundings& /*around*/, Findings& o
 
 void negativeSubIndex(const TagLine& tag, const TagSurroundings& /*around*/, Findings& out) {
     const auto subIndex = tag.subIndex();
-    if (!subIndex || !isOfBits(*tag.facts) || readNumber(*subIndex).value >= 0) return;
+    if (!subIndex || !isOfBits(*tag.facts) || settings::readNumber(*subIndex).value >= 0) return;
     out.push_back({Severity::Error, "negative-subindex", tag.placeOf(kAddressField),
                    fmt::format("the sub-index '{}' is negative: every access will fail", *subIndex),
                    "bits count from 0, the least significant one of the first item"});
 }
 
 /// The addresses that a model gives an area; the area's own ones where the model does not offer it.
-AreaOffer offerOf(const AreaInfo& area, const ModelInfo* model) {
+AreaOffer offerOf(const AreaInfo& area, const settings::ModelInfo* model) {
     if (model != nullptr) {
         for (const AreaOffer& offer : model->offers) {
             if (offer.area == area.name) return offer;
@@ -69,7 +72,7 @@ void outsideArea(const TagLine& tag, const TagSurroundings& around, Findings& ou
 void unusableNode(const TagLine& tag, const TagSurroundings& around, Findings& out) {
     const AreaInfo* area = around.description.area(tag.area());
     if (area != nullptr && isOfDriver(*area)) return;
-    const std::string fault = nodeFault(readNumber(tag.node()).value);
+    const std::string fault = nodeFault(settings::readNumber(tag.node()).value);
     if (fault.empty()) return;
     warn(out, "unusable-node", tag.placeOf(kNodeField), fault, kUsableNodes);
 }

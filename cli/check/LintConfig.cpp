@@ -8,11 +8,16 @@
 #include <set>
 
 #include "cli/check/NodeNumber.h"
-#include "cli/check/NumberText.h"
+#include "settings/NumberText.h"
 #include "values/NearestName.h"
 
 namespace cli {
 namespace {
+
+using settings::Description;
+using settings::ParameterInfo;
+using settings::ScannedConfig;
+using settings::ScannedItem;
 
 /// What a rule looks at.
 struct Item {
@@ -35,7 +40,7 @@ std::vector<std::string> keysOf(const Description& description) {
 
 std::vector<std::string> modelsOf(const Description& description) {
     std::vector<std::string> names;
-    for (const ModelInfo& model : description.models)
+    for (const settings::ModelInfo& model : description.models)
         names.push_back(model.name);
     return names;
 }
@@ -115,12 +120,13 @@ void ignoredKey(const Item& item, Findings& out) {
 
 void oddNumber(const Item& item, Findings& out) {
     if (item.parameter == nullptr || !item.parameter->isNumber() || !item.word.value) return;
-    const NumberReading number = readNumber(*item.word.value);
+    const settings::NumberReading number = settings::readNumber(*item.word.value);
     if (number.octal) {
         warn(out, "octal-number", item.word.valuePlace,
              fmt::format("'{}' begins with a zero and is read as octal: {}", *item.word.value,
                          number.value),
-             fmt::format("write {}={}", item.word.key, withoutLeadingZeroes(*item.word.value)));
+             fmt::format("write {}={}", item.word.key,
+                         settings::withoutLeadingZeroes(*item.word.value)));
     } else if (number.partial) {
         warn(
             out, "not-a-number", item.word.valuePlace,
@@ -131,7 +137,7 @@ void oddNumber(const Item& item, Findings& out) {
 
 void outOfRange(const Item& item, Findings& out) {
     if (item.parameter == nullptr || !item.parameter->max || !item.word.value) return;
-    const long value = readNumber(*item.word.value).value;
+    const long value = settings::readNumber(*item.word.value).value;
     if (value <= *item.parameter->max) return;
     warn(out, "out-of-range", item.word.valuePlace,
          fmt::format("{} is lowered to {}", value, *item.parameter->max),
@@ -144,7 +150,7 @@ bool isListed(const ParameterInfo& parameter, const std::string& value) {
                parameter.choices.end();
     }
     return std::any_of(parameter.choices.begin(), parameter.choices.end(), [&](const auto& choice) {
-        return readNumber(choice).value == readNumber(value).value;
+        return settings::readNumber(choice).value == settings::readNumber(value).value;
     });
 }
 
@@ -201,7 +207,7 @@ void unusableNodes(const ScannedConfig& config, Findings& out) {
         if (!item.node || !item.value || !seen.insert(*item.node).second) continue;
         const auto spelled = spelledNode(*item.node);
         if (spelled != item.node) continue;
-        const std::string fault = nodeFault(readNumber(*spelled).value);
+        const std::string fault = nodeFault(settings::readNumber(*spelled).value);
         if (!fault.empty()) warn(out, "unusable-node", item.place, fault, kUsableNodes);
     }
 }

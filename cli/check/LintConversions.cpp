@@ -5,21 +5,17 @@
 
 #include "cli/check/LintTags.h"
 #include "values/NearestName.h"
+#include "values/TypeMask.h"
 #include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
 
+using settings::ConversionInfo;
+
 constexpr std::size_t kTypeField = 3;
 
-std::uint32_t flagOf(const std::string& name) {
-    for (std::size_t row = 0; row < values::kValueTypes.size(); ++row) {
-        if (values::kValueTypes[row].name == name) return std::uint32_t{1} << row;
-    }
-    return 0;
-}
-
-Finding unknownConversion(const TagLine& tag, const Description& description,
+Finding unknownConversion(const TagLine& tag, const settings::Description& description,
                           const std::string& name) {
     std::vector<std::string> names;
     for (const ConversionInfo& each : description.conversions)
@@ -59,7 +55,7 @@ bool partialConversion(const TagLine& tag, const ConversionFacts& facts, Finding
 
 bool unsuitableConversion(const TagLine& tag, const ConversionInfo& conversion,
                           const std::string& type, Findings& out) {
-    if ((conversion.types & flagOf(type)) != 0) return false;
+    if ((conversion.types & values::typeMask(type)) != 0) return false;
     warn(out, "unsuitable-conversion", tag.placeOf(kTypeField),
          fmt::format("conversion '{}' is not meant for the data type {}", conversion.name, type),
          "'mrtu describe conversions' lists the data types");

@@ -13,6 +13,9 @@
 namespace cli {
 namespace {
 
+using settings::AreaInfo;
+using settings::Description;
+
 /// What a tag stands for, and the tag.
 struct Span : TagSpan {
     const TagLine* tag;

@@ -3,11 +3,13 @@
 #include <fmt/ranges.h>
 
 #include "cli/check/LintTags.h"
-#include "cli/check/NumberText.h"
 #include "cli/check/TagSpan.h"
+#include "settings/NumberText.h"
 
 namespace cli {
 namespace {
+
+using settings::AreaInfo;
 
 constexpr std::size_t kNodeField = 0;
 constexpr std::size_t kAddressField = 2;
@@ -17,7 +19,7 @@ constexpr long kDecade = 100000;
 constexpr long kShortDecade = 10000;
 
 void unnamedNode(const TagLine& tag, const TagSurroundings& around, Findings& out) {
-    const int node = static_cast<int>(readNumber(tag.node()).value);
+    const int node = static_cast<int>(settings::readNumber(tag.node()).value);
     if (around.nodes.contains(node)) return;
     std::vector<std::string> names;
     for (const int each : around.nodes)
@@ -32,12 +34,12 @@ void unnamedNode(const TagLine& tag, const TagSurroundings& around, Findings& ou
 
 void oddNumber(const TagLine& tag, std::size_t field, const char* what, const std::string& text,
                Findings& out) {
-    const NumberReading number = readNumber(text);
+    const settings::NumberReading number = settings::readNumber(text);
     if (number.octal) {
         warn(out, "octal-number", tag.placeOf(field),
              fmt::format("{} '{}' begins with a zero and is read as octal: {}", what, text,
                          number.value),
-             fmt::format("write {} for the decimal number", withoutLeadingZeroes(text)));
+             fmt::format("write {} for the decimal number", settings::withoutLeadingZeroes(text)));
     } else if (number.partial) {
         warn(out, "not-a-number", tag.placeOf(field),
              fmt::format("{} '{}' is no number and is read as {}", what, text, number.value),
@@ -60,7 +62,7 @@ bool hasFiveDigits(long address) {
 /// Five digits in an area whose addresses have six: the short form of the first ten thousand items.
 void shortAddress(const TagLine& tag, const TagSurroundings& around, Findings& out) {
     const AreaInfo* area = around.description.area(tag.area());
-    const long address = readNumber(tag.address()).value;
+    const long address = settings::readNumber(tag.address()).value;
     if (area == nullptr || area->min < kDecade || !hasFiveDigits(address)) return;
     const long base = area->min / kDecade * kDecade;
     const long item = address - base / kDecade * kShortDecade;
@@ -73,7 +75,7 @@ void shortAddress(const TagLine& tag, const TagSurroundings& around, Findings& o
 /// Five digits in an area that begins at 0 or 1, as another area's short form would begin.
 void foreignAddress(const TagLine& tag, const TagSurroundings& around, Findings& out) {
     const AreaInfo* area = around.description.area(tag.area());
-    const long address = readNumber(tag.address()).value;
+    const long address = settings::readNumber(tag.address()).value;
     const bool low = area != nullptr && area->min < kShortDecade && area->max >= kShortDecade;
     if (!low || !area->bitRead || !hasFiveDigits(address)) return;
     for (const AreaInfo& other : around.description.areas) {
@@ -96,7 +98,7 @@ bool isBitType(ICU_Type type) {
 void ignoredSubIndex(const TagLine& tag, const TagSurroundings& around, Findings& out) {
     const auto subIndex = tag.subIndex();
     if (!tag.facts || !subIndex) return;
-    const long bit = readNumber(*subIndex).value;
+    const long bit = settings::readNumber(*subIndex).value;
     const AreaInfo* area = around.description.area(tag.area());
     const bool bitArea = area != nullptr && isBitArea(*area);
     // Nothing but a bit of a register has a number, and zero is what all others have anyway. A

@@ -8,13 +8,13 @@
 
 #include "cli/check/Finding.h"
 #include "cli/check/TagLines.h"
-#include "cli/describe/Description.h"
+#include "settings/DriverDescription.h"
 
 namespace cli {
 
 /// What the tags of a configuration stand on.
 struct TagSurroundings {
-    const Description& description;
+    const settings::Description& description;
     std::set<int> nodes;                       ///< The nodes that the configuration names.
     std::map<int, std::string> models;         ///< Of the named nodes.
     std::string model;                         ///< Of all other nodes.
@@ -23,13 +23,14 @@ struct TagSurroundings {
 
     /// @return the node's model; the first of all for an unknown model name, as drivers do. Null
     /// when the description has no models.
-    [[nodiscard]] const ModelInfo* modelOf(int node) const;
+    [[nodiscard]] const settings::ModelInfo* modelOf(int node) const;
     /// @return the function that writes the node's coils, as the configuration has it.
     [[nodiscard]] const std::string& coilFunctionOf(int node) const;
 };
 
 /// @return the surroundings that a configuration text makes.
-TagSurroundings surroundingsOf(const std::string& configText, const Description& description);
+TagSurroundings surroundingsOf(const std::string& configText,
+                               const settings::Description& description);
 
 /// One tag on its own. Rules: unnamed-node, octal-number, not-a-number, short-address,
 /// foreign-address, ignored-subindex, and those of lintAccess() and lintConversions().
@@ -45,7 +46,7 @@ void lintConversions(const TagLine& tag, const TagSurroundings& surroundings, Fi
 
 /// Tags against each other. Rules: overlap, shared-register. Each tag is reported once at most,
 /// against the first tag in the text that it meets.
-Findings lintOverlaps(const std::vector<TagLine>& tags, const Description& description);
+Findings lintOverlaps(const std::vector<TagLine>& tags, const settings::Description& description);
 
 /// Makes the driver's refusal of a tag an error, at the field that is to blame.
 Finding tagRefusal(const TagLine& tag, const TagSurroundings& surroundings,

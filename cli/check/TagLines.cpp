@@ -8,6 +8,8 @@
 namespace cli {
 namespace {
 
+using settings::Place;
+
 constexpr std::string_view kBlanks = " \t";
 
 /// @return the text without blanks at both ends; `skipped` receives how many were in front.

@@ -40,7 +40,7 @@ struct UriField {
 
 struct TagLine {
     std::string uri;  ///< As written.
-    Place place;
+    settings::Place place;
     std::vector<UriField> fields;   ///< Four in a well-formed URI: node, area, address, data type;
                                     ///< the data type with conversions for a byte order by name.
     std::optional<TagFacts> facts;  ///< Nothing when the driver refused the tag.
@@ -55,7 +55,7 @@ struct TagLine {
     [[nodiscard]] std::string address() const;
     [[nodiscard]] std::optional<std::string> subIndex() const;
     /// @return the place of a field, of the URI where there is none.
-    [[nodiscard]] Place placeOf(std::size_t field) const;
+    [[nodiscard]] settings::Place placeOf(std::size_t field) const;
 };
 
 /// @param column  Of the URI's first character.

@@ -6,13 +6,17 @@
 #include <optional>
 
 #include "cli/check/LintTags.h"
-#include "cli/check/NumberText.h"
-#include "cli/describe/DescriptionTables.h"
+#include "settings/NumberText.h"
 #include "values/NearestName.h"
+#include "values/TypeMask.h"
 #include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
+
+using settings::AreaOffer;
+using settings::Description;
+using settings::ModelInfo;
 
 using values::ValueType;
 
@@ -49,15 +53,9 @@ Verdict wrongArea(const TagLine& tag, const ModelInfo* model, const Description&
     return Blame{1, fmt::format("model {} offers {}", model->name, fmt::join(names, ", "))};
 }
 
-const ValueType* typeNamed(const std::string& name) {
-    const auto row = std::find_if(values::kValueTypes.begin(), values::kValueTypes.end(),
-                                  [&](const ValueType& each) { return each.name == name; });
-    return row != values::kValueTypes.end() ? &*row : nullptr;
-}
-
 Verdict unknownType(const TagLine& tag) {
     const std::string name = dataTypeText(tag.dataType()).name;
-    if (typeNamed(name) != nullptr) return std::nullopt;
+    if (values::typeNamed(name) != nullptr) return std::nullopt;
     std::vector<std::string> names;
     names.reserve(values::kValueTypes.size());
     for (const ValueType& row : values::kValueTypes)
@@ -69,7 +67,7 @@ Verdict unknownType(const TagLine& tag) {
 
 Verdict outOfRange(const TagLine& tag, const ModelInfo* model) {
     if (model == nullptr) return std::nullopt;
-    const long address = readNumber(tag.address()).value;
+    const long address = settings::readNumber(tag.address()).value;
     for (const AreaOffer& offer : model->offers) {
         if (offer.area != tag.area() || (address >= offer.min && address <= offer.max)) continue;
         return Blame{2, fmt::format("model {} has {} {}..{}", model->name, offer.area, offer.min,
@@ -79,23 +77,24 @@ Verdict outOfRange(const TagLine& tag, const ModelInfo* model) {
 }
 
 Verdict unsuitableType(const TagLine& tag, const Description& description) {
-    const AreaInfo* area = description.area(tag.area());
-    const ValueType* type = typeNamed(dataTypeText(tag.dataType()).name);
+    const settings::AreaInfo* area = description.area(tag.area());
+    const ValueType* type = values::typeNamed(dataTypeText(tag.dataType()).name);
     if (area == nullptr || type == nullptr) return std::nullopt;
     const auto row = static_cast<std::uint32_t>(type->type) - 1;
     if ((area->types >> row & 1U) != 0) return std::nullopt;
-    return Blame{3, fmt::format("{} takes {}", area->name, typesText(area->types))};
+    return Blame{3, fmt::format("{} takes {}", area->name, values::typesText(area->types))};
 }
 
 Verdict blameOf(const TagLine& tag, const TagSurroundings& around) {
     if (!tag.wellFormed()) {
         std::vector<std::string> names;
-        for (const TagFieldInfo& field : around.description.tagFields)
+        for (const settings::TagFieldInfo& field : around.description.tagFields)
             names.push_back(field.name);
         return Blame{0, fmt::format("write {}", fmt::join(names, "?"))};
     }
     if (auto blame = emptyField(tag, around.description)) return blame;
-    const ModelInfo* model = around.modelOf(static_cast<int>(readNumber(tag.node()).value));
+    const ModelInfo* model =
+        around.modelOf(static_cast<int>(settings::readNumber(tag.node()).value));
     // First what names something that does not exist, then what does not fit together.
     if (around.description.area(tag.area()) == nullptr) {
         return wrongArea(tag, model, around.description);

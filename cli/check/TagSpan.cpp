@@ -7,25 +7,20 @@
 namespace cli {
 namespace {
 
-using values::ValueType;
+using settings::AreaInfo;
 
-const ValueType* typeNamed(const std::string& name) {
-    for (const ValueType& row : values::kValueTypes) {
-        if (row.name == name) return &row;
-    }
-    return nullptr;
-}
+using values::ValueType;
 
 }  // namespace
 
 bool isBitArea(const AreaInfo& area) {
-    const ValueType* natural = typeNamed(area.naturalType);
+    const ValueType* natural = values::typeNamed(area.naturalType);
     return natural != nullptr && natural->type == ICU_Type::boolean;
 }
 
 TagSpan tagSpan(const TagFacts& facts, const AreaInfo& area) {
     const ICU_Type item = facts.itemType == ICU_Type::none ? facts.type : facts.itemType;
-    const ValueType* natural = typeNamed(area.naturalType);
+    const ValueType* natural = values::typeNamed(area.naturalType);
     const bool bitArea = isBitArea(area);
     const long long itemBits = bitArea || natural == nullptr ? 1 : natural->bytes * 8LL;
     const bool bits = item == ICU_Type::boolean;

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "cli/check/TagLines.h"
-#include "cli/describe/Description.h"
+#include "settings/DriverDescription.h"
 
 namespace cli {
 
@@ -19,9 +19,9 @@ struct TagSpan {
 };
 
 /// REQUIRES: the driver has accepted the tag.
-TagSpan tagSpan(const TagFacts& facts, const AreaInfo& area);
+TagSpan tagSpan(const TagFacts& facts, const settings::AreaInfo& area);
 
 /// @return true when an item of the area is a bit.
-bool isBitArea(const AreaInfo& area);
+bool isBitArea(const settings::AreaInfo& area);
 
 }  // namespace cli

@@ -1,9 +1,11 @@
 // What the configuration means for its tags.
-#include "cli/ConfigText.h"
-#include "cli/check/ConfigScan.h"
 #include "cli/check/LintTags.h"
+#include "settings/ConfigScan.h"
+#include "settings/ConfigText.h"
 
 namespace cli {
+
+using settings::ModelInfo;
 
 const ModelInfo* TagSurroundings::modelOf(int node) const {
     if (description.models.empty()) return nullptr;
@@ -17,20 +19,20 @@ const std::string& TagSurroundings::coilFunctionOf(int node) const {
     return own != coilFunctions.end() ? own->second : coilFunction;
 }
 
-TagSurroundings surroundingsOf(const std::string& configText, const Description& description) {
-    const ScannedConfig config = scanConfig({}, configText);
+TagSurroundings surroundingsOf(const std::string& configText,
+                               const settings::Description& description) {
+    const settings::ScannedConfig config = settings::scanConfig({}, configText);
     const auto valueOf = [&config](const std::string& name) {
-        const ScannedItem* item = config.item(name);
-        return item != nullptr ? item->value : std::nullopt;
+        return settings::itemOf(config, name);
     };
     const auto presetOf = [&description](const char* key) {
-        const ParameterInfo* parameter = description.parameter(key);
+        const settings::ParameterInfo* parameter = description.parameter(key);
         return parameter != nullptr ? parameter->preset : std::string();
     };
     TagSurroundings around{description, {}, {}, valueOf("model").value_or(""), {}, {}};
     if (around.model.empty()) around.model = presetOf("model");
     around.coilFunction = valueOf("forceFunction").value_or(presetOf("forceFunction"));
-    for (const int node : nodesOf(configText)) {
+    for (const int node : settings::nodesOf(config)) {
         const std::string prefix = "Node" + std::to_string(node) + "::";
         around.nodes.insert(node);
         around.models[node] = valueOf(prefix + "model").value_or(around.model);

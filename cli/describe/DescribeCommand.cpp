@@ -12,6 +12,8 @@
 namespace cli {
 namespace {
 
+using settings::Description;
+
 constexpr const char* kFooter = R"(Examples:
   mrtu describe
   mrtu describe parameters
@@ -46,7 +48,7 @@ void describe(const Options& options, const CommandContext& context) {
         context.out << document;
         return;
     }
-    const Description description = parseDescription(document);
+    const Description description = settings::parseDescription(document);
     for (const Section& section : kSections) {
         if (section.name != options.section) continue;
         if (options.json) {

@@ -1,17 +1,20 @@
 #include "cli/describe/DescriptionJson.h"
 
-#include "values/ValueTypes.h"
+#include "values/TypeMask.h"
 
 namespace cli {
 namespace {
+
+using settings::AreaInfo;
+using settings::Description;
+using settings::ParameterInfo;
 
 using values::Json;
 
 Json typesJson(std::uint32_t mask) {
     Json names = Json::array();
-    for (std::size_t row = 0; row < values::kValueTypes.size(); ++row) {
-        if ((mask >> row & 1U) != 0) names.push_back(std::string(values::kValueTypes[row].name));
-    }
+    for (const std::string_view name : values::typeNames(mask))
+        names.push_back(std::string(name));
     return names;
 }
 
@@ -57,9 +60,9 @@ Json parametersJson(const Description& description) {
 
 Json modelsJson(const Description& description) {
     Json json = Json::array();
-    for (const ModelInfo& model : description.models) {
+    for (const settings::ModelInfo& model : description.models) {
         Json offers = Json::array();
-        for (const AreaOffer& offer : model.offers) {
+        for (const settings::AreaOffer& offer : model.offers) {
             offers.push_back({{"area", offer.area}, {"min", offer.min}, {"max", offer.max}});
         }
         json.push_back({{"name", model.name}, {"display", model.display}, {"offers", offers}});
@@ -76,7 +79,7 @@ Json memoryJson(const Description& description) {
 
 Json conversionsJson(const Description& description) {
     Json json = Json::array();
-    for (const ConversionInfo& conversion : description.conversions) {
+    for (const settings::ConversionInfo& conversion : description.conversions) {
         json.push_back({{"name", conversion.name},
                         {"display", conversion.display},
                         {"types", typesJson(conversion.types)}});
@@ -89,7 +92,7 @@ Json descriptionJson(const Description& description) {
     for (const auto& [name, value] : description.facts)
         facts[name] = value;
     Json fields = Json::array();
-    for (const TagFieldInfo& field : description.tagFields) {
+    for (const settings::TagFieldInfo& field : description.tagFields) {
         fields.push_back(
             {{"name", field.name}, {"display", field.display}, {"suggested", field.preset}});
     }

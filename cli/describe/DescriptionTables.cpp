@@ -3,25 +3,18 @@
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 
-#include <bit>
-
 #include "cli/describe/TextTable.h"
-#include "values/ValueTypes.h"
+#include "values/TypeMask.h"
 
 namespace cli {
 namespace {
 
+using settings::AreaInfo;
+using settings::Description;
+using settings::ModelInfo;
+using settings::ParameterInfo;
+
 using Rows = std::vector<std::vector<std::string>>;
-
-constexpr std::uint32_t kAllTypes = (std::uint32_t{1} << values::kValueTypes.size()) - 1;
-
-std::string namesOf(std::uint32_t mask) {
-    std::vector<std::string_view> names;
-    for (std::size_t row = 0; row < values::kValueTypes.size(); ++row) {
-        if ((mask >> row & 1U) != 0) names.push_back(values::kValueTypes[row].name);
-    }
-    return fmt::format("{}", fmt::join(names, ", "));
-}
 
 std::string presetText(const ParameterInfo& parameter) {
     if (parameter.mandatory) return "required";
@@ -69,13 +62,6 @@ std::string displayOf(const Description& description, const std::string& area) {
 
 }  // namespace
 
-std::string typesText(std::uint32_t mask) {
-    const std::uint32_t missing = kAllTypes & ~mask;
-    if (missing == 0) return "all";
-    if (std::popcount(missing) < std::popcount(mask)) return "all but " + namesOf(missing);
-    return namesOf(mask);
-}
-
 std::string parametersText(const Description& description) {
     Rows rows{{"KEY", "MEANING", "GIVEN FOR", "DEFAULT", "SUGGESTED", "VALUES"}};
     for (const ParameterInfo& parameter : description.parameters) {
@@ -92,7 +78,7 @@ std::string modelsText(const Description& description) {
         if (!text.empty()) text += '\n';
         text += fmt::format("model {}: {}\n", model.name, model.display);
         Rows rows{{"  AREA", "ADDRESSES", "MEANING"}};
-        for (const AreaOffer& offer : model.offers) {
+        for (const settings::AreaOffer& offer : model.offers) {
             rows.push_back({"  " + offer.area, rangeText(offer.min, offer.max),
                             displayOf(description, offer.area)});
         }
@@ -106,22 +92,22 @@ std::string memoryText(const Description& description) {
     for (const AreaInfo& area : description.areas) {
         rows.push_back({area.name, area.display, area.naturalType, accessText(area),
                         std::to_string(area.readCount), std::to_string(area.writeCount),
-                        typesText(area.types)});
+                        values::typesText(area.types)});
     }
     return textTable(rows);
 }
 
 std::string conversionsText(const Description& description) {
     Rows rows{{"NAME", "EFFECT", "DATA TYPES"}};
-    for (const ConversionInfo& conversion : description.conversions) {
-        rows.push_back({conversion.name, conversion.display, typesText(conversion.types)});
+    for (const settings::ConversionInfo& conversion : description.conversions) {
+        rows.push_back({conversion.name, conversion.display, values::typesText(conversion.types)});
     }
     return textTable(rows);
 }
 
 std::string descriptionText(const Description& description) {
     std::vector<std::string_view> fields;
-    for (const TagFieldInfo& field : description.tagFields)
+    for (const settings::TagFieldInfo& field : description.tagFields)
         fields.push_back(field.name);
     return fmt::format(
         "{} ({}), protocol code {}\n"

@@ -1,11 +1,11 @@
 #include "cli/describe/OfflineDriver.h"
 
 #include "cli/ExitCode.h"
-#include "cli/describe/DescriptionBlock.h"
 #include "runtime/HostServices.h"
 #include "runtime/Module.h"
 #include "runtime/PluginLibrary.h"
 #include "runtime/PosixMultiTask.h"
+#include "settings/DescriptionBlock.h"
 
 namespace cli {
 namespace {
@@ -55,7 +55,7 @@ IProtocol& OfflineDriver::protocol() const {
 }
 
 std::string OfflineDriver::description() const {
-    return inflateDescription(protocol().GetXml());
+    return settings::inflateDescription(protocol().GetXml());
 }
 
 }  // namespace cli

@@ -10,8 +10,8 @@
 #include <cstring>
 
 #include "cli/ExitCode.h"
-#include "cli/FileReader.h"
 #include "cli/inspect/ElfLibrary.h"
+#include "settings/FileReader.h"
 #include "values/TextEscapes.h"
 
 namespace cli {
@@ -20,10 +20,10 @@ namespace {
 /// Compilers cut names off long before.
 constexpr std::size_t kLongestText = 65536;
 
-runtime::FileDescriptor opened(const std::string& path) {
+posix::FileDescriptor opened(const std::string& path) {
     try {
-        return openRegularFile(path);
-    } catch (const FileError& error) {
+        return settings::openRegularFile(path);
+    } catch (const settings::FileError& error) {
         throw CommandError(ExitCode::Other,
                            fmt::format("{}: {}", values::printableText(path), error.what()));
     }

@@ -10,7 +10,7 @@
 
 #include "cli/inspect/Architecture.h"
 #include "cli/inspect/ReadingBudget.h"
-#include "runtime/FileDescriptor.h"
+#include "posix/FileDescriptor.h"
 
 namespace cli {
 
@@ -50,7 +50,7 @@ class ElfFile {
 
     std::string path_;
     ReadingBudget& budget_;
-    runtime::FileDescriptor file_;
+    posix::FileDescriptor file_;
     Elf* elf_ = nullptr;
     Architecture architecture_;
     std::map<std::size_t, const Elf_Data*> strings_;

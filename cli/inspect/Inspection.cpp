@@ -7,10 +7,10 @@
 #include <set>
 
 #include "cli/ExitCode.h"
-#include "cli/FileReader.h"
 #include "cli/inspect/ReadableName.h"
 #include "cli/inspect/SearchPlaces.h"
 #include "cli/inspect/SymbolVersion.h"
+#include "settings/FileReader.h"
 #include "values/TextEscapes.h"
 
 namespace cli {
@@ -27,8 +27,8 @@ constexpr std::size_t kMostLibraries = 256;
 std::string descriptionHeaderIn(const std::string& path) {
     std::string bytes;
     try {
-        bytes = readFile(path, {.bytes = kLargestLibrary});
-    } catch (const FileError& error) {
+        bytes = settings::readFile(path, {.bytes = kLargestLibrary});
+    } catch (const settings::FileError& error) {
         throw CommandError(ExitCode::Other,
                            fmt::format("{}: {}", values::printableText(path), error.what()));
     }

@@ -12,7 +12,7 @@
 #include <string>
 #include <vector>
 
-#include "runtime/FileDescriptor.h"
+#include "posix/FileDescriptor.h"
 #include "runtime/PosixSerialFactory.h"
 
 class PseudoTerminal {
@@ -24,14 +24,14 @@ class PseudoTerminal {
         if (!made) throw std::runtime_error("no pseudo terminal to be had");
         path_ = name;
         // Without an open near end the kernel would forget its settings at every release.
-        watch_ = runtime::FileDescriptor(::open(name, O_RDWR | O_NOCTTY | O_CLOEXEC));
+        watch_ = posix::FileDescriptor(::open(name, O_RDWR | O_NOCTTY | O_CLOEXEC));
     }
 
     const std::string& path() const { return path_; }
     int far() const { return far_.get(); }
     /// A descriptor of the near end that the code under test knows nothing of.
     int watch() const { return watch_.get(); }
-    void hangUp() { far_ = runtime::FileDescriptor(); }
+    void hangUp() { far_ = posix::FileDescriptor(); }
 
     void put(const std::vector<std::uint8_t>& bytes) const {
         ASSERT_EQ(static_cast<ssize_t>(bytes.size()),
@@ -55,8 +55,8 @@ class PseudoTerminal {
     }
 
   private:
-    runtime::FileDescriptor far_;
-    runtime::FileDescriptor watch_;
+    posix::FileDescriptor far_;
+    posix::FileDescriptor watch_;
     std::string path_;
 };
 

@@ -9,12 +9,12 @@
 #include <random>
 #include <thread>
 
-#include "runtime/FileDescriptor.h"
+#include "posix/FileDescriptor.h"
 #include "tests/line/StorageFile.h"
 
 namespace {
 
-using runtime::FileDescriptor;
+using posix::FileDescriptor;
 using runtime::SqliteStorage;
 
 constexpr int kRounds = 200;

@@ -7,7 +7,7 @@
 #include <fstream>
 #include <sstream>
 
-#include "cli/ConfigText.h"
+#include "settings/ConfigText.h"
 
 namespace {
 
@@ -48,36 +48,36 @@ class ConfigFile {
 };
 
 TEST(LineOptionsTest, WithoutAFileTheDefaultConfigurationServes) {
-    EXPECT_EQ(configOf({}), cli::defaultConfig("1"));
-    EXPECT_EQ(configOf({"--sim"}), cli::defaultConfig("3"));
+    EXPECT_EQ(configOf({}), settings::defaultConfig("1"));
+    EXPECT_EQ(configOf({"--sim"}), settings::defaultConfig("3"));
 }
 
 TEST(LineOptionsTest, ShortFormsSetTheirItems) {
     const std::string text =
         configOf({"--baud", "9600", "--parity", "even", "--stopbits", "2", "--node", "5", "--model",
                   "2", "--timeout", "100", "--ascii", "--set", "repeat=0"});
-    EXPECT_EQ("9600", cli::itemOf(text, "baudrate"));
-    EXPECT_EQ("even", cli::itemOf(text, "parity"));
-    EXPECT_EQ("2", cli::itemOf(text, "stopbits"));
-    EXPECT_EQ("5", cli::itemOf(text, "defNodeId"));
-    EXPECT_EQ("2", cli::itemOf(text, "model"));
-    EXPECT_EQ("100", cli::itemOf(text, "timeout"));
-    EXPECT_EQ("ASCII", cli::itemOf(text, "txMode"));
-    EXPECT_EQ("0", cli::itemOf(text, "repeat"));
+    EXPECT_EQ("9600", settings::itemOf(text, "baudrate"));
+    EXPECT_EQ("even", settings::itemOf(text, "parity"));
+    EXPECT_EQ("2", settings::itemOf(text, "stopbits"));
+    EXPECT_EQ("5", settings::itemOf(text, "defNodeId"));
+    EXPECT_EQ("2", settings::itemOf(text, "model"));
+    EXPECT_EQ("100", settings::itemOf(text, "timeout"));
+    EXPECT_EQ("ASCII", settings::itemOf(text, "txMode"));
+    EXPECT_EQ("0", settings::itemOf(text, "repeat"));
 }
 
 TEST(LineOptionsTest, OptionsWinOverTheFile) {
     const ConfigFile file("CfgVer=1\ntimeout=1\nbits=7\nuart=com3\n");
     const std::string text = configOf({"--config", file.path(), "--set", "timeout=2", "--ascii"});
-    EXPECT_EQ("2", cli::itemOf(text, "timeout"));
-    EXPECT_EQ("7", cli::itemOf(text, "bits"));
-    EXPECT_EQ("com3", cli::itemOf(text, "uart"));
+    EXPECT_EQ("2", settings::itemOf(text, "timeout"));
+    EXPECT_EQ("7", settings::itemOf(text, "bits"));
+    EXPECT_EQ("com3", settings::itemOf(text, "uart"));
 }
 
 TEST(LineOptionsTest, AsciiNeedsDataBitsAndGetsThem) {
     const ConfigFile file("CfgVer=1 uart=com1");
-    EXPECT_EQ("8", cli::itemOf(configOf({"--config", file.path(), "--ascii"}), "bits"));
-    EXPECT_EQ(std::nullopt, cli::itemOf(configOf({"--config", file.path()}), "bits"));
+    EXPECT_EQ("8", settings::itemOf(configOf({"--config", file.path(), "--ascii"}), "bits"));
+    EXPECT_EQ(std::nullopt, settings::itemOf(configOf({"--config", file.path()}), "bits"));
 }
 
 TEST(LineOptionsTest, AFileThatCannotBeTakenIsAUsageError) {

@@ -9,8 +9,11 @@
 namespace cli {
 namespace {
 
+using settings::Place;
+using settings::ScannedConfig;
+
 Findings lint(const std::string& text) {
-    return lintConfig(scanConfig("cfg", text), sampleDescription());
+    return lintConfig(settings::scanConfig("cfg", text), sampleDescription());
 }
 
 TEST(LintConfig, FindsWhatTheDriverPassesOver) {
@@ -96,7 +99,7 @@ TEST(LintConfig, DuplicateNamesTheValueThatCounts) {
 }
 
 TEST(ConfigRefusal, StandsAtTheItemThatTheMessageNames) {
-    const ScannedConfig config = scanConfig("cfg", "CfgVer=1\nparity=evn");
+    const ScannedConfig config = settings::scanConfig("cfg", "CfgVer=1\nparity=evn");
     const Finding finding =
         configRefusal(config, sampleDescription(), "Parser: parameter 'parity' has invalid value");
     EXPECT_EQ(finding.severity, Severity::Error);
@@ -105,7 +108,7 @@ TEST(ConfigRefusal, StandsAtTheItemThatTheMessageNames) {
 }
 
 TEST(ConfigRefusal, MissingKeyIsToBeAddedAtTheEnd) {
-    const ScannedConfig config = scanConfig("cfg", "CfgVer=1 timeout=5");
+    const ScannedConfig config = settings::scanConfig("cfg", "CfgVer=1 timeout=5");
     const Finding finding =
         configRefusal(config, sampleDescription(), "Parser: parameter 'uart' is not found");
     EXPECT_EQ(finding.place, (Place{"cfg", 1, 19}));
@@ -113,8 +116,8 @@ TEST(ConfigRefusal, MissingKeyIsToBeAddedAtTheEnd) {
 }
 
 TEST(ConfigRefusal, MissingMarkerIsToBeAddedAtTheStart) {
-    const Finding finding = configRefusal(scanConfig("cfg", "\n\ntimeout=5"), sampleDescription(),
-                                          "Parser: unknown format");
+    const Finding finding = configRefusal(settings::scanConfig("cfg", "\n\ntimeout=5"),
+                                          sampleDescription(), "Parser: unknown format");
     EXPECT_EQ(finding.place, (Place{"cfg", 1, 1}));
     EXPECT_EQ(finding.suggestion, "begin with CfgVer=1");
 }

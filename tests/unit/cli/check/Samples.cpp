@@ -3,6 +3,10 @@
 namespace cli {
 namespace {
 
+using settings::AreaInfo;
+using settings::Description;
+using settings::ParameterInfo;
+
 ParameterInfo number(const std::string& key, const std::string& preset, bool ofNode) {
     ParameterInfo info{};
     info.key = key;

@@ -5,12 +5,12 @@
 
 #include "cli/check/Finding.h"
 #include "cli/check/TagLines.h"
-#include "cli/describe/Description.h"
+#include "settings/DriverDescription.h"
 
 namespace cli {
 
 /// Keys, two models, coils, holding registers, read-only registers and 32-bit registers.
-const Description& sampleDescription();
+const settings::Description& sampleDescription();
 
 /// A tag that the driver accepted on node 1.
 /// @param byteOffset, bitIndex  As ITag reports them.

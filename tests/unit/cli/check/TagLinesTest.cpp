@@ -5,6 +5,8 @@
 namespace cli {
 namespace {
 
+using settings::Place;
+
 TEST(TagLines, CommentsAndBlanksDoNotCount) {
     const auto tags = tagLines("t", "# all\n\n  1?A?2?int  # one\r\n\t#\n1?B?3?int");
     ASSERT_EQ(tags.size(), 2U);

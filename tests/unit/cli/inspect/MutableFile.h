@@ -11,7 +11,7 @@
 #include <string>
 #include <vector>
 
-#include "runtime/FileDescriptor.h"
+#include "posix/FileDescriptor.h"
 
 namespace cli {
 
@@ -67,7 +67,7 @@ class MutableFile {
 
     std::vector<char> bytes_;
     std::vector<std::size_t> changed_;
-    runtime::FileDescriptor file_;
+    posix::FileDescriptor file_;
 };
 
 }  // namespace cli

@@ -1,4 +1,4 @@
-#include "cli/check/NumberText.h"
+#include "settings/NumberText.h"
 
 #include <algorithm>
 #include <cctype>
@@ -6,11 +6,21 @@
 #include <cstdlib>
 #include <limits>
 
-namespace cli {
+namespace settings {
 namespace {
+
+constexpr std::string_view kWhite = " \t\n\v\f\r";
 
 bool isDigit(char c) {
     return std::isdigit(static_cast<unsigned char>(c)) != 0;
+}
+
+/// Chosen here, since newer libraries read "0b1" as a binary number when strtoll() chooses.
+int baseOf(std::string_view text) {
+    std::string_view digits = text.substr(std::min(text.find_first_not_of(kWhite), text.size()));
+    if (digits.starts_with('-') || digits.starts_with('+')) digits.remove_prefix(1);
+    if (!digits.starts_with('0')) return 10;
+    return digits.starts_with("0x") || digits.starts_with("0X") ? 16 : 8;
 }
 
 }  // namespace
@@ -18,7 +28,7 @@ bool isDigit(char c) {
 NumberReading readNumber(std::string_view text) {
     const std::string copy(text);
     char* end = nullptr;
-    const long long number = std::strtoll(copy.c_str(), &end, 0);
+    const long long number = std::strtoll(copy.c_str(), &end, baseOf(text));
     using Limits = std::numeric_limits<std::int32_t>;
     const long long value = std::clamp<long long>(number, Limits::min(), Limits::max());
 
@@ -36,4 +46,4 @@ std::string withoutLeadingZeroes(std::string_view text) {
     return std::string(rest);
 }
 
-}  // namespace cli
+}  // namespace settings

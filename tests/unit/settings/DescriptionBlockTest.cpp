@@ -4,10 +4,10 @@
 
 #include <string>
 
-#include "cli/ExitCode.h"
-#include "cli/describe/DescriptionBlock.h"
+#include "settings/DescriptionBlock.h"
+#include "settings/TextError.h"
 
-namespace cli {
+namespace settings {
 namespace {
 
 const std::string kZero(1, '\0');
@@ -35,8 +35,7 @@ std::string inflate(const std::string& bytes) {
 std::string refusal(const std::string& bytes) {
     try {
         inflate(bytes);
-    } catch (const CommandError& error) {
-        EXPECT_EQ(error.code(), ExitCode::Other);
+    } catch (const DescriptionError& error) {
         return error.what();
     }
     return "accepted";
@@ -51,7 +50,7 @@ TEST(DescriptionBlock, DocumentsOfAnySizeAreInflated) {
 }
 
 TEST(DescriptionBlock, ADriverWithoutABlockIsSaidToHaveNone) {
-    EXPECT_THROW(inflateDescription(nullptr), CommandError);
+    EXPECT_THROW(inflateDescription(nullptr), DescriptionError);
 }
 
 TEST(DescriptionBlock, DamagedBlocksAreRefusedWithTheReason) {
@@ -87,4 +86,4 @@ TEST(DescriptionBlock, DamagedBlocksAreRefusedWithTheReason) {
 }
 
 }  // namespace
-}  // namespace cli
+}  // namespace settings

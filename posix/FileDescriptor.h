@@ -5,7 +5,7 @@
 
 #include <utility>
 
-namespace runtime {
+namespace posix {
 
 class FileDescriptor {
   public:
@@ -28,4 +28,4 @@ class FileDescriptor {
     int fd_ = -1;
 };
 
-}  // namespace runtime
+}  // namespace posix

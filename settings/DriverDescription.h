@@ -10,7 +10,7 @@
 #include <utility>
 #include <vector>
 
-namespace cli {
+namespace settings {
 
 /// One key that a configuration may hold.
 struct ParameterInfo {
@@ -91,7 +91,7 @@ struct Description {
 };
 
 /// @param document  The inflated document, with or without a byte order mark.
-/// Errors: CommandError (Other) when it is not well-formed or its root is another one.
+/// Errors: DescriptionError when it is not well-formed or its root is another one.
 Description parseDescription(const std::string& document);
 
-}  // namespace cli
+}  // namespace settings

@@ -1,4 +1,4 @@
-// The one place where the command reads files that a user names.
+// The one place where files that a user names are read.
 //
 // Whatever the name stands for, reading ends: a file without an end is cut off by its length, a
 // pipe that stays silent by time.
@@ -9,9 +9,9 @@
 #include <stdexcept>
 #include <string>
 
-#include "runtime/FileDescriptor.h"
+#include "posix/FileDescriptor.h"
 
-namespace cli {
+namespace settings {
 
 /// Why a file was not read: what() is the reason alone, without the file's name.
 class FileError : public std::runtime_error {
@@ -26,7 +26,7 @@ struct FileLimits {
 
 /// Opens a file to look into, here and there. Devices, pipes and folders are not even opened.
 /// Errors: FileError.
-runtime::FileDescriptor openRegularFile(const std::string& path);
+posix::FileDescriptor openRegularFile(const std::string& path);
 
 /// @return all bytes of a file, a pipe or a device.
 /// Errors: FileError when it can't be opened or read, is longer than the limit, or stays silent.
@@ -40,7 +40,7 @@ inline constexpr std::size_t kTagListBytes = std::size_t{64} * 1024 * 1024;
 /// Reads a text for the driver, which takes C strings: what stands behind a zero byte would be
 /// lost without a word, so such a text is refused.
 /// @param what  What the text is, for the complaint: "configuration".
-/// Errors: CommandError (Usage) with what, path and reason.
+/// Errors: TextError with what, path and reason.
 std::string readText(const std::string& what, const std::string& path, const FileLimits& limits);
 
-}  // namespace cli
+}  // namespace settings

@@ -1,4 +1,4 @@
-#include "cli/FileReader.h"
+#include "settings/FileReader.h"
 
 #include <fcntl.h>
 #include <fmt/format.h>
@@ -10,9 +10,9 @@
 #include <cerrno>
 #include <cstring>
 
-#include "cli/ExitCode.h"
+#include "settings/TextError.h"
 
-namespace cli {
+namespace settings {
 namespace {
 
 constexpr std::size_t kMebibyte = std::size_t{1024} * 1024;
@@ -27,9 +27,8 @@ std::string sizeText(std::size_t bytes) {
 }
 
 /// Opening neither waits for the other end of a pipe nor makes a terminal this process's own.
-runtime::FileDescriptor openForReading(const std::string& path) {
-    runtime::FileDescriptor file(
-        ::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY));
+posix::FileDescriptor openForReading(const std::string& path) {
+    posix::FileDescriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY));
     if (!file) refuseByErrno();
     return file;
 }
@@ -60,7 +59,7 @@ std::size_t readSome(int fd, char* buffer, std::size_t size, std::chrono::millis
 
 }  // namespace
 
-runtime::FileDescriptor openRegularFile(const std::string& path) {
+posix::FileDescriptor openRegularFile(const std::string& path) {
     struct stat status {};
     if (::stat(path.c_str(), &status) != 0) refuseByErrno();
     if (!S_ISREG(status.st_mode)) throw FileError("not a regular file");
@@ -68,7 +67,7 @@ runtime::FileDescriptor openRegularFile(const std::string& path) {
 }
 
 std::string readFile(const std::string& path, const FileLimits& limits) {
-    const runtime::FileDescriptor file = openForReading(path);
+    const posix::FileDescriptor file = openForReading(path);
     std::array<char, 65536> buffer{};
     std::string bytes;
     while (const std::size_t count =
@@ -83,7 +82,7 @@ std::string readFile(const std::string& path, const FileLimits& limits) {
 
 std::string readText(const std::string& what, const std::string& path, const FileLimits& limits) {
     const auto refuse = [&](const char* why) {
-        throw CommandError(ExitCode::Usage, fmt::format("{} {}: {}", what, path, why));
+        throw TextError(fmt::format("{} {}: {}", what, path, why));
     };
     std::string text;
     try {
@@ -95,4 +94,4 @@ std::string readText(const std::string& what, const std::string& path, const Fil
     return text;
 }
 
-}  // namespace cli
+}  // namespace settings

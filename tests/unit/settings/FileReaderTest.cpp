@@ -1,5 +1,5 @@
 // Files of every kind: reading ends, whatever a name stands for.
-#include "cli/FileReader.h"
+#include "settings/FileReader.h"
 
 #include <fcntl.h>
 #include <gtest/gtest.h>
@@ -10,10 +10,10 @@
 #include <filesystem>
 #include <fstream>
 
-#include "cli/ExitCode.h"
-#include "runtime/FileDescriptor.h"
+#include "posix/FileDescriptor.h"
+#include "settings/TextError.h"
 
-namespace cli {
+namespace settings {
 namespace {
 
 constexpr FileLimits kSmall{.bytes = 8, .silence = std::chrono::milliseconds(1)};
@@ -54,8 +54,7 @@ std::string reasonOf(const std::string& path, const FileLimits& limits) {
 std::string refusalOf(const std::string& path, const FileLimits& limits) {
     try {
         readText("configuration", path, limits);
-    } catch (const CommandError& error) {
-        EXPECT_EQ(ExitCode::Usage, error.code());
+    } catch (const TextError& error) {
         return error.what();
     }
     return "read";
@@ -86,7 +85,7 @@ TEST_F(FileReader, PipeWithoutWriterIsGivenUp) {
 
 TEST_F(FileReader, PipeThatIsNeverClosedIsGivenUp) {
     const std::string path = pipe();
-    const runtime::FileDescriptor both(open(path.c_str(), O_RDWR | O_CLOEXEC));
+    const posix::FileDescriptor both(open(path.c_str(), O_RDWR | O_CLOEXEC));
     ASSERT_EQ(3, write(both.get(), "abc", 3));
     EXPECT_EQ("nothing came for 0.001 s", reasonOf(path, kSmall));
 }
@@ -95,9 +94,9 @@ TEST_F(FileReader, PipeIsReadToItsEnd) {
     // As a shell's <(command) hands it over.
     int ends[2];
     ASSERT_EQ(0, ::pipe2(ends, O_CLOEXEC));
-    const runtime::FileDescriptor out(ends[0]);
+    const posix::FileDescriptor out(ends[0]);
     {
-        const runtime::FileDescriptor in(ends[1]);
+        const posix::FileDescriptor in(ends[1]);
         ASSERT_EQ(3, write(in.get(), "abc", 3));
     }
     EXPECT_EQ("abc", readFile("/dev/fd/" + std::to_string(out.get()), kPatient));
@@ -127,4 +126,4 @@ TEST_F(FileReader, TextForTheDriverHoldsNoZero) {
 }
 
 }  // namespace
-}  // namespace cli
+}  // namespace settings

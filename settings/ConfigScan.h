@@ -9,9 +9,9 @@
 #include <string_view>
 #include <vector>
 
-#include "cli/check/Finding.h"
+#include "settings/Place.h"
 
-namespace cli {
+namespace settings {
 
 /// One word of the body: "name=value" or "Node<n>::name=value".
 struct ScannedItem {
@@ -43,4 +43,4 @@ ScannedConfig scanConfig(const std::string& source, std::string_view text);
 /// @return the place of text[index].
 Place placeIn(const std::string& source, std::string_view text, std::size_t index);
 
-}  // namespace cli
+}  // namespace settings

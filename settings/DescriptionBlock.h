@@ -3,12 +3,12 @@
 
 #include <string>
 
-namespace cli {
+namespace settings {
 
 /// Inflates the document of a block.
 /// @param block  What IProtocol::GetXml() returns: "compressedXML=" and a decimal length, a zero
 /// byte, that many bytes of a zlib stream, "<<ICOM_XML_END>>" and a zero byte. Null is refused.
-/// Errors: CommandError (Other) when the block is anything else. At most 16 MiB are inflated.
+/// Errors: DescriptionError when the block is anything else. At most 16 MiB are inflated.
 std::string inflateDescription(const unsigned char* block);
 
-}  // namespace cli
+}  // namespace settings

@@ -1,4 +1,4 @@
-#include "cli/describe/DescriptionBlock.h"
+#include "settings/DescriptionBlock.h"
 
 #include <fmt/format.h>
 #include <zlib.h>
@@ -7,9 +7,9 @@
 #include <cstring>
 #include <string_view>
 
-#include "cli/ExitCode.h"
+#include "settings/TextError.h"
 
-namespace cli {
+namespace settings {
 namespace {
 
 constexpr std::string_view kLengthKey = "compressedXML=";
@@ -18,7 +18,7 @@ constexpr std::size_t kMaxDigits = 8;
 constexpr std::size_t kMaxDocument = std::size_t{16} << 20;
 
 [[noreturn]] void refuse(const std::string& why) {
-    throw CommandError(ExitCode::Other, "the driver's description can't be read: " + why);
+    throw DescriptionError("the driver's description can't be read: " + why);
 }
 
 struct Stream {
@@ -78,4 +78,4 @@ std::string inflateDescription(const unsigned char* block) {
     return document;
 }
 
-}  // namespace cli
+}  // namespace settings

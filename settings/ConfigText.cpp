@@ -1,36 +1,18 @@
-#include "cli/ConfigText.h"
+#include "settings/ConfigText.h"
 
 #include <fmt/format.h>
 
 #include <charconv>
-#include <cstdlib>
 #include <set>
 
-#include "cli/ExitCode.h"
+#include "settings/NumberText.h"
+#include "settings/TextError.h"
 
-namespace cli {
+namespace settings {
 namespace {
 
 constexpr std::string_view kMarker = "CfgVer=1";
 constexpr std::string_view kWhite = " \t\n\v\f\r";
-
-std::string_view bodyOf(std::string_view text) {
-    const std::size_t marker = text.find(kMarker);
-    if (marker == std::string_view::npos) return {};
-    const std::string_view body = text.substr(marker + kMarker.size());
-    return body.substr(0, body.find("CfgVer="));
-}
-
-std::vector<std::string_view> wordsOf(std::string_view body) {
-    std::vector<std::string_view> words;
-    for (std::size_t at = body.find_first_not_of(kWhite); at != std::string_view::npos;
-         at = body.find_first_not_of(kWhite, at)) {
-        const std::size_t end = std::min(body.find_first_of(kWhite, at), body.size());
-        words.push_back(body.substr(at, end - at));
-        at = end;
-    }
-    return words;
-}
 
 /// A blank inside a value is spelled "&nbsp;".
 std::string encoded(std::string_view value) {
@@ -45,13 +27,12 @@ std::string encoded(std::string_view value) {
     return text;
 }
 
-std::optional<int> nodeOf(std::string_view word) {
-    constexpr std::string_view kNode = "Node";
-    const std::size_t colons = word.find("::");
-    if (!word.starts_with(kNode) || colons == std::string_view::npos) return std::nullopt;
-    const char* const end = word.data() + colons;
+/// @return the number between "Node" and "::"; nothing where another text stands there.
+std::optional<int> nodeOf(const ScannedItem& item) {
+    if (!item.node) return std::nullopt;
+    const char* const end = item.node->data() + item.node->size();
     int node = 0;
-    const auto [stop, error] = std::from_chars(word.data() + kNode.size(), end, node);
+    const auto [stop, error] = std::from_chars(item.node->data(), end, node);
     if (error != std::errc{} || stop != end) return std::nullopt;
     return node;
 }
@@ -67,7 +48,7 @@ std::string defaultConfig(std::string_view model) {
 
 ConfigItem parseConfigItem(std::string_view text) {
     const auto refuse = [text](std::string_view why) {
-        throw CommandError(ExitCode::Usage, fmt::format("'{}' is no KEY=VALUE: {}", text, why));
+        throw TextError(fmt::format("'{}' is no KEY=VALUE: {}", text, why));
     };
     const std::size_t equals = text.find('=');
     if (equals == std::string_view::npos) refuse("there is no '='");
@@ -92,32 +73,37 @@ std::string withItems(const std::string& text, const std::vector<ConfigItem>& it
 }
 
 std::optional<std::string> itemOf(std::string_view text, std::string_view key) {
-    for (const std::string_view word : wordsOf(bodyOf(text))) {
-        if (word.starts_with(key) && word.substr(key.size()).starts_with('=')) {
-            return std::string(word.substr(key.size() + 1));
-        }
-    }
-    return std::nullopt;
+    return itemOf(scanConfig({}, text), key);
+}
+
+std::optional<std::string> itemOf(const ScannedConfig& config, std::string_view key) {
+    const ScannedItem* const item = config.item(key);
+    return item != nullptr ? item->value : std::nullopt;
 }
 
 std::vector<int> nodesOf(std::string_view text) {
+    return nodesOf(scanConfig({}, text));
+}
+
+std::vector<int> nodesOf(const ScannedConfig& config) {
     std::set<int> nodes;
-    if (const auto node = itemOf(text, "defNodeId")) {
-        nodes.insert(static_cast<int>(std::strtol(node->c_str(), nullptr, 0)));
+    if (const auto node = itemOf(config, "defNodeId")) {
+        nodes.insert(static_cast<int>(readNumber(*node).value));
     }
-    for (const std::string_view word : wordsOf(bodyOf(text))) {
-        if (const auto node = nodeOf(word)) nodes.insert(*node);
+    for (const ScannedItem& item : config.items) {
+        if (const auto node = nodeOf(item)) nodes.insert(*node);
     }
     return {nodes.begin(), nodes.end()};
 }
 
 std::optional<std::string> nodeItemOf(std::string_view text, int node, std::string_view key) {
-    const auto own = itemOf(text, fmt::format("Node{}::{}", node, key));
-    return own ? own : itemOf(text, key);
+    const ScannedConfig config = scanConfig({}, text);
+    const auto own = itemOf(config, fmt::format("Node{}::{}", node, key));
+    return own ? own : itemOf(config, key);
 }
 
 std::string modelOf(std::string_view text, int node) {
     return nodeItemOf(text, node, "model").value_or("1");
 }
 
-}  // namespace cli
+}  // namespace settings

@@ -1,16 +1,16 @@
-#include "cli/ConfigText.h"
+#include "settings/ConfigText.h"
 
 #include <gtest/gtest.h>
 
-#include "cli/ExitCode.h"
+#include "settings/TextError.h"
 
 namespace {
 
-using cli::itemOf;
-using cli::withItems;
+using settings::itemOf;
+using settings::withItems;
 
 TEST(ConfigText, TheDefaultIsWhole) {
-    const std::string text = cli::defaultConfig("3");
+    const std::string text = settings::defaultConfig("3");
     EXPECT_TRUE(text.starts_with("CfgVer=1 "));
     EXPECT_EQ(itemOf(text, "defNodeId"), "1");
     EXPECT_EQ(itemOf(text, "model"), "3");
@@ -48,28 +48,29 @@ TEST(ConfigText, ItemsAreWholeWordsBehindTheMarkerAndBeforeTheNext) {
 }
 
 TEST(ConfigText, NamesItsNodes) {
-    EXPECT_EQ(cli::nodesOf("CfgVer=1 Node7::timeout=1 defNodeId=0x10 Node7::repeat=2 Node3::x=1 "
-                           "NodeA::x=1 Node9=1"),
-              (std::vector<int>{3, 7, 16}));
-    EXPECT_EQ(cli::nodesOf("nothing"), std::vector<int>{});
+    EXPECT_EQ(
+        settings::nodesOf("CfgVer=1 Node7::timeout=1 defNodeId=0x10 Node7::repeat=2 Node3::x=1 "
+                          "NodeA::x=1 Node9=1"),
+        (std::vector<int>{3, 7, 16}));
+    EXPECT_EQ(settings::nodesOf("nothing"), std::vector<int>{});
 }
 
 TEST(ConfigText, ANodesModelIsItsOwnOrThatOfAll) {
     const std::string_view text = "CfgVer=1 model=2 Node4::model=3";
-    EXPECT_EQ(cli::modelOf(text, 4), "3");
-    EXPECT_EQ(cli::modelOf(text, 5), "2");
-    EXPECT_EQ(cli::modelOf("CfgVer=1", 5), "1");
+    EXPECT_EQ(settings::modelOf(text, 4), "3");
+    EXPECT_EQ(settings::modelOf(text, 5), "2");
+    EXPECT_EQ(settings::modelOf("CfgVer=1", 5), "1");
 }
 
 TEST(ConfigItem, IsSplitAtTheFirstEqualsSign) {
-    const cli::ConfigItem item = cli::parseConfigItem("Node5::prefix=a =b");
+    const settings::ConfigItem item = settings::parseConfigItem("Node5::prefix=a =b");
     EXPECT_EQ(item.key, "Node5::prefix");
     EXPECT_EQ(item.value, "a =b");
 }
 
 TEST(ConfigItem, IsRefusedWhenItWouldNotSurviveTheText) {
     for (const char* const text : {"timeout", "=5", "time out=5", "a=b\nc=d", "a=b\tc", ""}) {
-        EXPECT_THROW(cli::parseConfigItem(text), cli::CommandError) << text;
+        EXPECT_THROW(settings::parseConfigItem(text), settings::TextError) << text;
     }
 }
 

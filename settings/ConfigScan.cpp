@@ -1,8 +1,8 @@
-#include "cli/check/ConfigScan.h"
+#include "settings/ConfigScan.h"
 
 #include <algorithm>
 
-namespace cli {
+namespace settings {
 namespace {
 
 constexpr std::string_view kMarker = "CfgVer=1";
@@ -92,4 +92,4 @@ ScannedConfig scanConfig(const std::string& source, std::string_view text) {
     return config;
 }
 
-}  // namespace cli
+}  // namespace settings

@@ -1,4 +1,4 @@
-// The driver's configuration text as the command builds and looks into it. Pure.
+// The driver's configuration text as it is built and looked into. Pure.
 //
 // The text is "CfgVer=1" and items "key=value" or "Node<n>::key=value" between white space; of
 // several items with one key the first counts.
@@ -9,7 +9,9 @@
 #include <string_view>
 #include <vector>
 
-namespace cli {
+#include "settings/ConfigScan.h"
+
+namespace settings {
 
 struct ConfigItem {
     std::string key;
@@ -22,7 +24,7 @@ struct ConfigItem {
 std::string defaultConfig(std::string_view model);
 
 /// Splits "key=value" at the first "=".
-/// Errors: CommandError (Usage) without "=", for an empty key and for white space in the key or,
+/// Errors: TextError without "=", for an empty key and for white space in the key or,
 /// blanks excepted, in the value.
 ConfigItem parseConfigItem(std::string_view text);
 
@@ -32,9 +34,11 @@ std::string withItems(const std::string& text, const std::vector<ConfigItem>& it
 
 /// @return the value of the item called `key`, e.g. "uart" or "Node2::model".
 std::optional<std::string> itemOf(std::string_view text, std::string_view key);
+std::optional<std::string> itemOf(const ScannedConfig& config, std::string_view key);
 
 /// @return the node numbers that the text names, "defNodeId" included, ascending, each once.
 std::vector<int> nodesOf(std::string_view text);
+std::vector<int> nodesOf(const ScannedConfig& config);
 
 /// @return the value of an item that a node may have of its own, else that of all nodes.
 std::optional<std::string> nodeItemOf(std::string_view text, int node, std::string_view key);
@@ -42,4 +46,4 @@ std::optional<std::string> nodeItemOf(std::string_view text, int node, std::stri
 /// @return the model of a node, which may be its own or that of all nodes.
 std::string modelOf(std::string_view text, int node);
 
-}  // namespace cli
+}  // namespace settings

@@ -4,7 +4,7 @@
 #include <string>
 #include <string_view>
 
-namespace cli {
+namespace settings {
 
 /// An integer read with automatic base: "0x" hexadecimal, a leading zero octal, else decimal.
 struct NumberReading {
@@ -18,4 +18,4 @@ NumberReading readNumber(std::string_view text);
 /// @return the text without sign-less leading zeroes, e.g. "100" for "0100", "0" for "00".
 std::string withoutLeadingZeroes(std::string_view text);
 
-}  // namespace cli
+}  // namespace settings

@@ -1,8 +1,8 @@
-#include "cli/check/NumberText.h"
+#include "settings/NumberText.h"
 
 #include <gtest/gtest.h>
 
-namespace cli {
+namespace settings {
 namespace {
 
 TEST(NumberText, IsReadWithTheBaseOfItsPrefix) {
@@ -20,6 +20,9 @@ TEST(NumberText, IsReadWithTheBaseOfItsPrefix) {
         {"010", 8, true, false},
         {"-010", -8, true, false},
         {"08", 0, true, true},
+        {"0b1", 0, false, true},
+        {"0x", 0, false, true},
+        {" 010", 8, false, false},
         {"12abc", 12, false, true},
         {"abc", 0, false, true},
         {"", 0, false, true},
@@ -43,4 +46,4 @@ TEST(NumberText, LosesItsLeadingZeroes) {
 }
 
 }  // namespace
-}  // namespace cli
+}  // namespace settings

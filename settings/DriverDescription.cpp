@@ -1,11 +1,11 @@
-#include "cli/describe/Description.h"
+#include "settings/DriverDescription.h"
 
 #include <algorithm>
 #include <pugixml.hpp>
 
-#include "cli/ExitCode.h"
+#include "settings/TextError.h"
 
-namespace cli {
+namespace settings {
 namespace {
 
 constexpr const char* kWhite = " \t\r\n";
@@ -150,13 +150,12 @@ Description parseDescription(const std::string& document) {
     pugi::xml_document xml;
     const pugi::xml_parse_result parsed = xml.load_buffer(document.data(), document.size());
     if (!parsed) {
-        throw CommandError(ExitCode::Other, "the driver's description is malformed at byte " +
-                                                std::to_string(parsed.offset) + ": " +
-                                                parsed.description());
+        throw DescriptionError("the driver's description is malformed at byte " +
+                               std::to_string(parsed.offset) + ": " + parsed.description());
     }
     const pugi::xml_node root = xml.child("protocol_cfg");
     if (root.empty()) {
-        throw CommandError(ExitCode::Other, "the driver's description has no <protocol_cfg>");
+        throw DescriptionError("the driver's description has no <protocol_cfg>");
     }
 
     Description description;
@@ -179,4 +178,4 @@ Description parseDescription(const std::string& document) {
     return description;
 }
 
-}  // namespace cli
+}  // namespace settings
