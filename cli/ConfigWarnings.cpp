@@ -5,7 +5,7 @@
 #include <optional>
 #include <set>
 
-#include "cli/check/LintConfig.h"
+#include "lint/LintConfig.h"
 #include "settings/DescriptionBlock.h"
 #include "settings/TextError.h"
 
@@ -27,7 +27,8 @@ void warnOfUnknownKeys(CommandContext& context, const IProtocol& protocol,
     const auto description = descriptionOf(protocol);
     if (!description) return;
     std::set<std::string> said;
-    for (const Finding& finding : lintConfig(settings::scanConfig("", configText), *description)) {
+    for (const lint::Finding& finding :
+         lint::lintConfig(settings::scanConfig("", configText), *description)) {
         if (finding.rule != "unknown-key" || !said.insert(finding.message).second) continue;
         complain(context,
                  fmt::format("configuration: {}; {}", finding.message, finding.suggestion));

@@ -7,13 +7,18 @@
 
 #include "cli/Commands.h"
 #include "cli/check/DriverFacts.h"
-#include "cli/check/LintConfig.h"
-#include "cli/check/LintTags.h"
+#include "cli/check/FindingText.h"
 #include "cli/describe/OfflineDriver.h"
+#include "lint/LintConfig.h"
+#include "lint/LintTags.h"
 #include "settings/FileReader.h"
 
 namespace cli {
 namespace {
+
+using lint::Findings;
+using lint::Severity;
+using lint::TagLine;
 
 using values::Json;
 
@@ -35,12 +40,13 @@ struct Report {
 
 std::vector<TagLine> tagsOf(const Options& options) {
     if (!options.tagsFile.empty()) {
-        return tagLines(options.tagsFile, settings::readText("tags", options.tagsFile,
-                                                             {.bytes = settings::kTagListBytes}));
+        return lint::tagLines(
+            options.tagsFile,
+            settings::readText("tags", options.tagsFile, {.bytes = settings::kTagListBytes}));
     }
     std::vector<TagLine> tags;
     for (const std::string& uri : options.uris) {
-        tags.push_back(tagLine(uri, "argument", static_cast<int>(tags.size()) + 1, 1));
+        tags.push_back(lint::tagLine(uri, "argument", static_cast<int>(tags.size()) + 1, 1));
     }
     return tags;
 }
@@ -49,15 +55,15 @@ void append(Findings& all, const Findings& more) {
     all.insert(all.end(), more.begin(), more.end());
 }
 
-void checkTags(IProtocol& protocol, const TagSurroundings& surroundings, std::vector<TagLine>& tags,
-               Findings& out) {
+void checkTags(IProtocol& protocol, const lint::TagSurroundings& surroundings,
+               std::vector<TagLine>& tags, Findings& out) {
     for (TagLine& tag : tags) {
         std::string refusal = tag.orderRefusal;
         if (refusal.empty()) tag.facts = factsOf(protocol, tag.driverUri, refusal);
-        if (!tag.facts) out.push_back(tagRefusal(tag, surroundings, refusal));
-        append(out, lintTag(tag, surroundings));
+        if (!tag.facts) out.push_back(lint::tagRefusal(tag, surroundings, refusal));
+        append(out, lint::lintTag(tag, surroundings));
     }
-    append(out, lintOverlaps(tags, surroundings.description));
+    append(out, lint::lintOverlaps(tags, surroundings.description));
 }
 
 Report check(const Options& options, const std::string& plugin) {
@@ -71,14 +77,15 @@ Report check(const Options& options, const std::string& plugin) {
     Report report;
     report.tags = tags.size();
     report.configAccepted = driver.protocol().Config(text.c_str()) != 0;
-    append(report.findings, lintConfig(config, description));
+    append(report.findings, lint::lintConfig(config, description));
     if (report.configAccepted) {
-        checkTags(driver.protocol(), surroundingsOf(text, description), tags, report.findings);
+        checkTags(driver.protocol(), lint::surroundingsOf(text, description), tags,
+                  report.findings);
     } else {
         report.findings.push_back(
-            configRefusal(config, description, driver.protocol().GetLastErrorString()));
+            lint::configRefusal(config, description, driver.protocol().GetLastErrorString()));
     }
-    sortByPlace(report.findings);
+    lint::sortByPlace(report.findings);
     return report;
 }
 
@@ -87,8 +94,8 @@ std::string counted(int count, const char* word) {
 }
 
 std::string summary(const Report& report) {
-    std::string text = counted(countOf(report.findings, Severity::Error), "error") + ", " +
-                       counted(countOf(report.findings, Severity::Warning), "warning");
+    std::string text = counted(lint::countOf(report.findings, Severity::Error), "error") + ", " +
+                       counted(lint::countOf(report.findings, Severity::Warning), "warning");
     if (report.tags == 0) return text;
     const std::string tags = counted(static_cast<int>(report.tags), "tag");
     return text + (report.configAccepted
@@ -101,8 +108,8 @@ void print(const Report& report, bool json, std::ostream& out) {
         out << findingsText(report.findings) << summary(report) << '\n';
         return;
     }
-    const Json object{{"errors", countOf(report.findings, Severity::Error)},
-                      {"warnings", countOf(report.findings, Severity::Warning)},
+    const Json object{{"errors", lint::countOf(report.findings, Severity::Error)},
+                      {"warnings", lint::countOf(report.findings, Severity::Warning)},
                       {"tagsChecked", report.configAccepted ? report.tags : 0},
                       {"findings", findingsJson(report.findings)}};
     // File names and texts may be anything; what is not UTF-8 is shown as such.

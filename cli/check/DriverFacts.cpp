@@ -8,6 +8,9 @@
 namespace cli {
 namespace {
 
+using lint::ConversionFacts;
+using lint::TagFacts;
+
 /// Longer values are beyond every area; nothing is tried on them.
 constexpr int kLongestTrial = 1024 * 1024;
 /// A one in every byte: true for bits, and valid digits for whatever takes bytes apart.
@@ -44,10 +47,10 @@ ConversionFacts tryConversion(const ITag& tag, const TagFacts& facts, const std:
 
 std::vector<ConversionFacts> conversionsOf(const ITag& tag, const TagFacts& facts,
                                            const std::string& uri) {
-    const TagLine line = tagLine(uri, {}, 1, 1);
+    const lint::TagLine line = lint::tagLine(uri, {}, 1, 1);
     std::vector<ConversionFacts> conversions;
     if (!line.wellFormed() || facts.length <= 0 || facts.length > kLongestTrial) return conversions;
-    const DataTypeText type = dataTypeText(line.dataType());
+    const lint::DataTypeText type = lint::dataTypeText(line.dataType());
     for (const std::string& name : type.conversions)
         conversions.push_back(tryConversion(tag, facts, name));
     return conversions;

@@ -1,0 +1,51 @@
+#include "cli/check/FindingText.h"
+
+#include <gtest/gtest.h>
+
+namespace cli {
+namespace {
+
+using lint::Finding;
+using lint::Findings;
+using lint::Severity;
+
+Finding finding(Severity severity, const char* source, int line, int column) {
+    return {severity, "rule", {source, line, column}, "message", "advice"};
+}
+
+TEST(FindingText, TextNamesPlaceSeverityAndRule) {
+    EXPECT_EQ(findingsText({finding(Severity::Warning, "a.cfg", 2, 5)}),
+              "a.cfg:2:5: warning: message [rule]\n    advice\n");
+    Finding without = finding(Severity::Error, "a.cfg", 1, 1);
+    without.suggestion.clear();
+    EXPECT_EQ(findingsText({without}), "a.cfg:1:1: error: message [rule]\n");
+    EXPECT_EQ(findingsText({}), "");
+}
+
+TEST(FindingText, JsonHasEveryMember) {
+    EXPECT_EQ(findingsJson({finding(Severity::Error, "a", 2, 5)}).dump(),
+              R"([{"severity":"error","rule":"rule","source":"a","line":2,"column":5,)"
+              R"("message":"message","suggestion":"advice"}])");
+    EXPECT_EQ(findingsJson({}).dump(), "[]");
+}
+
+TEST(FindingText, VerdictFollowsErrorsAndStrictness) {
+    const Findings warning{finding(Severity::Warning, "a", 1, 1)};
+    const Findings error{finding(Severity::Warning, "a", 1, 1),
+                         finding(Severity::Error, "a", 1, 1)};
+    struct Case {
+        const Findings& findings;
+        bool strict;
+        int code;
+    };
+    const Findings none;
+    const Case cases[] = {{none, false, 0},   {none, true, 0},   {warning, false, 0},
+                          {warning, true, 1}, {error, false, 2}, {error, true, 2}};
+    for (const Case& each : cases) {
+        EXPECT_EQ(static_cast<int>(verdictOf(each.findings, each.strict)), each.code)
+            << each.findings.size() << " findings, strict " << each.strict;
+    }
+}
+
+}  // namespace
+}  // namespace cli
