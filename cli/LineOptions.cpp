@@ -4,9 +4,9 @@
 
 #include <CLI/CLI.hpp>
 
-#include "cli/OverrideWords.h"
 #include "cli/UsageErrors.h"
 #include "cli/Validators.h"
+#include "cli/override/OverrideWords.h"
 #include "settings/ConfigText.h"
 #include "settings/FileReader.h"
 

@@ -3,9 +3,9 @@
 #include <memory>
 
 #include "cli/Commands.h"
-#include "cli/OverrideNotice.h"
 #include "cli/Results.h"
 #include "cli/Session.h"
+#include "cli/override/OverrideNotice.h"
 
 namespace cli {
 namespace {

@@ -5,7 +5,7 @@
 #include <string>
 
 #include "cli/LineOptions.h"
-#include "cli/OverrideStorage.h"
+#include "cli/override/OverrideStorage.h"
 #include "runtime/Channel.h"
 #include "runtime/Storage.h"
 #include "values/LittleEndian.h"

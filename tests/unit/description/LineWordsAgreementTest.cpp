@@ -8,7 +8,7 @@
 #include <string>
 #include <vector>
 
-#include "cli/OverrideWords.h"
+#include "cli/override/OverrideWords.h"
 #include "mrtu/LineSettings.h"
 #include "runtime/SerialSettings.h"
 #include "tests/unit/description/Document.h"

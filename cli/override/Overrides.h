@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-#include "cli/OverrideWords.h"
 #include "cli/Session.h"
+#include "cli/override/OverrideWords.h"
 
 namespace cli {
 

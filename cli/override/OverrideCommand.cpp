@@ -5,7 +5,7 @@
 #include <ostream>
 
 #include "cli/Commands.h"
-#include "cli/Overrides.h"
+#include "cli/override/Overrides.h"
 
 namespace cli {
 namespace {

@@ -1,4 +1,4 @@
-#include "cli/WriteRequests.h"
+#include "cli/write/WriteRequests.h"
 
 #include <algorithm>
 

@@ -1,8 +1,8 @@
-#include "cli/OverrideNotice.h"
+#include "cli/override/OverrideNotice.h"
 
 #include <gtest/gtest.h>
 
-#include "cli/OverrideKeys.h"
+#include "cli/override/OverrideKeys.h"
 
 namespace {
 

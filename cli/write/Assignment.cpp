@@ -1,4 +1,4 @@
-#include "cli/Assignment.h"
+#include "cli/write/Assignment.h"
 
 #include <fmt/format.h>
 

@@ -8,10 +8,10 @@
 
 #include "cli/Choices.h"
 #include "cli/Commands.h"
-#include "cli/LineEditor.h"
-#include "cli/OverrideNotice.h"
 #include "cli/Session.h"
 #include "cli/UsageErrors.h"
+#include "cli/console/LineEditor.h"
+#include "cli/override/OverrideNotice.h"
 #include "values/ByteOrder.h"
 
 namespace cli {

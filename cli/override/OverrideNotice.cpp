@@ -1,4 +1,4 @@
-#include "cli/OverrideNotice.h"
+#include "cli/override/OverrideNotice.h"
 
 #include <fmt/format.h>
 #include <fmt/ranges.h>
@@ -8,8 +8,8 @@
 #include <optional>
 
 #include "cli/Choices.h"
-#include "cli/OverrideKeys.h"
-#include "cli/OverrideWords.h"
+#include "cli/override/OverrideKeys.h"
+#include "cli/override/OverrideWords.h"
 #include "runtime/StoragePath.h"
 #include "runtime/StoredValue.h"
 #include "settings/ConfigText.h"

@@ -1,4 +1,4 @@
-#include "cli/OverrideKeys.h"
+#include "cli/override/OverrideKeys.h"
 
 #include <fmt/format.h>
 

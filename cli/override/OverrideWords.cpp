@@ -1,4 +1,4 @@
-#include "cli/OverrideWords.h"
+#include "cli/override/OverrideWords.h"
 
 #include <fmt/format.h>
 #include <fmt/ranges.h>

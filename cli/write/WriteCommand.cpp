@@ -3,14 +3,14 @@
 #include <CLI/CLI.hpp>
 #include <memory>
 
-#include "cli/Assignment.h"
 #include "cli/Commands.h"
-#include "cli/OverrideNotice.h"
-#include "cli/Overrides.h"
 #include "cli/Results.h"
 #include "cli/Session.h"
 #include "cli/UsageErrors.h"
-#include "cli/WriteRequests.h"
+#include "cli/override/OverrideNotice.h"
+#include "cli/override/Overrides.h"
+#include "cli/write/Assignment.h"
+#include "cli/write/WriteRequests.h"
 #include "values/Values.h"
 
 namespace cli {

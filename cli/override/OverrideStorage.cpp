@@ -1,4 +1,4 @@
-#include "cli/OverrideStorage.h"
+#include "cli/override/OverrideStorage.h"
 
 #include <fmt/format.h>
 
@@ -7,8 +7,8 @@
 #include <cstdlib>
 #include <optional>
 
-#include "cli/OverrideKeys.h"
-#include "cli/OverrideWords.h"
+#include "cli/override/OverrideKeys.h"
+#include "cli/override/OverrideWords.h"
 #include "runtime/SqliteStorage.h"
 
 namespace cli {

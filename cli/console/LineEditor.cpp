@@ -1,4 +1,4 @@
-#include "cli/LineEditor.h"
+#include "cli/console/LineEditor.h"
 
 #include <histedit.h>
 #include <termios.h>

@@ -1,10 +1,10 @@
-#include "cli/Overrides.h"
+#include "cli/override/Overrides.h"
 
 #include <fmt/format.h>
 
 #include <sstream>
 
-#include "cli/OverrideKeys.h"
+#include "cli/override/OverrideKeys.h"
 #include "settings/ConfigText.h"
 #include "values/LittleEndian.h"
 #include "values/ValueTypes.h"

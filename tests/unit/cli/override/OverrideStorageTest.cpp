@@ -1,4 +1,4 @@
-#include "cli/OverrideStorage.h"
+#include "cli/override/OverrideStorage.h"
 
 #include <gtest/gtest.h>
 
