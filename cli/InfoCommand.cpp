@@ -7,10 +7,10 @@
 
 #include "cli/Commands.h"
 #include "cli/Validators.h"
-#include "runtime/HostServices.h"
 #include "runtime/Module.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
+#include "runtime/ServiceFactory.h"
 
 namespace cli {
 namespace {
@@ -63,7 +63,7 @@ void info(CommandContext& context, const InfoOptions& options) {
     const std::string plugin = pluginFile(context);
     runtime::PosixMultiTask multiTask;
     runtime::PosixSerialFactory serial;
-    runtime::HostServices host(multiTask, serial);
+    runtime::ServiceFactory host(multiTask, serial);
     const auto library = runtime::PluginLibrary::load(plugin);
     if (!library) throw CommandError(ExitCode::Other, library.error().text);
     const auto module = runtime::Module::bind(library.value(), host);

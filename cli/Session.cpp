@@ -8,9 +8,9 @@
 #include "cli/ConfigWarnings.h"
 #include "cli/SimNodes.h"
 #include "cli/TraceText.h"
-#include "runtime/HostServices.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
+#include "runtime/ServiceFactory.h"
 #include "runtime/TracingSerialFactory.h"
 #include "settings/ConfigText.h"
 
@@ -93,7 +93,7 @@ struct Session::Parts {
     runtime::PosixSerialFactory serial;
     bool portGone = false;
     runtime::TracingSerialFactory tracing;
-    runtime::HostServices host;
+    runtime::ServiceFactory host;
     runtime::Channel channel;
 };
 

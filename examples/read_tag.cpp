@@ -6,11 +6,11 @@
 #include <cstdio>
 
 #include "runtime/Channel.h"
-#include "runtime/HostServices.h"
 #include "runtime/Module.h"
 #include "runtime/PluginLibrary.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
+#include "runtime/ServiceFactory.h"
 #include "sim/Simulator.h"
 
 namespace {
@@ -36,7 +36,7 @@ int main(int count, char** arguments) {
     runtime::PosixMultiTask multiTask;
     runtime::PosixSerialFactory serial;
     serial.mapPort("com1", simulator.path());
-    runtime::HostServices services(multiTask, serial);
+    runtime::ServiceFactory services(multiTask, serial);
 
     // The driver: load, bind, create, configure, start.
     auto library = runtime::PluginLibrary::load(arguments[1]);

@@ -1,10 +1,10 @@
 #include "cli/describe/OfflineDriver.h"
 
 #include "cli/ExitCode.h"
-#include "runtime/HostServices.h"
 #include "runtime/Module.h"
 #include "runtime/PluginLibrary.h"
 #include "runtime/PosixMultiTask.h"
+#include "runtime/ServiceFactory.h"
 #include "settings/DescriptionBlock.h"
 
 namespace cli {
@@ -34,7 +34,7 @@ Value valueOf(runtime::Result<Value, runtime::PluginError> result) {
 struct OfflineDriver::Parts {
     runtime::PosixMultiTask multiTask{};
     NoSerialPorts serial{};
-    runtime::HostServices host{multiTask, serial};
+    runtime::ServiceFactory host{multiTask, serial};
     runtime::PluginLibrary library;
     runtime::Module module;
     runtime::ProtocolObject protocol;

@@ -7,11 +7,11 @@
 #include <vector>
 
 #include "runtime/Channel.h"
-#include "runtime/HostServices.h"
 #include "runtime/Module.h"
 #include "runtime/PluginLibrary.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
+#include "runtime/ServiceFactory.h"
 
 namespace {
 
@@ -43,7 +43,7 @@ int main(int count, char** arguments) {
 
     runtime::PosixMultiTask multiTask;
     runtime::PosixSerialFactory serial;
-    runtime::HostServices services(multiTask, serial);
+    runtime::ServiceFactory services(multiTask, serial);
     auto library = runtime::PluginLibrary::load(arguments[1]);
     if (!library) return complain(library.error().text);
     auto module = runtime::Module::bind(library.value(), services);

@@ -9,7 +9,7 @@
 #include <utility>
 
 #include "runtime/Channel.h"
-#include "runtime/HostServices.h"
+#include "runtime/ServiceFactory.h"
 #include "runtime/MemoryStorage.h"
 #include "runtime/Module.h"
 #include "runtime/PluginLibrary.h"
@@ -58,7 +58,7 @@ class DriverLine {
     runtime::PosixMultiTask multiTask_;
     runtime::PosixSerialFactory serial_;
     runtime::MemoryStorage storage_;
-    runtime::HostServices services_{multiTask_, serial_, &storage_};
+    runtime::ServiceFactory services_{multiTask_, serial_, &storage_};
     Library library_ = runtime::PluginLibrary::load(PLUGIN_FILE);
     decltype(runtime::Module::bind(library_.value(), services_)) module_ =
         runtime::Module::bind(need(library_).value(), services_);

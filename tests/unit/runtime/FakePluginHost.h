@@ -5,14 +5,14 @@
 
 #include <string>
 
-#include "runtime/HostServices.h"
+#include "runtime/ServiceFactory.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
 
 struct FakeHost {
     runtime::PosixMultiTask multiTask;
     runtime::PosixSerialFactory serial;
-    runtime::HostServices services{multiTask, serial};
+    runtime::ServiceFactory services{multiTask, serial};
 };
 
 /// A fake plug-in's file; tests/unit/runtime/CMakeLists.txt builds them.

@@ -18,14 +18,14 @@ namespace runtime {
 /// caller and must outlive this object; the socket factory and the data buffer, which drivers only
 /// hold, are its own.
 /// Threads: any.
-class HostServices final : public IInterfaceFactory {
+class ServiceFactory final : public IInterfaceFactory {
   public:
     /// @param storage  Null for a host without permanent storage.
-    HostServices(IMultiTask2& multiTask, ISerialFactory& serial,
-                 IPermanentStorage* storage = nullptr);
-    ~HostServices() = default;
-    HostServices(const HostServices&) = delete;
-    HostServices& operator=(const HostServices&) = delete;
+    ServiceFactory(IMultiTask2& multiTask, ISerialFactory& serial,
+                   IPermanentStorage* storage = nullptr);
+    ~ServiceFactory() = default;
+    ServiceFactory(const ServiceFactory&) = delete;
+    ServiceFactory& operator=(const ServiceFactory&) = delete;
 
     IInterface* CreateInterface(const char* name) override;
     void ReleaseInterface(IInterface* held) override;

@@ -1,12 +1,12 @@
-#include "runtime/HostServices.h"
+#include "runtime/ServiceFactory.h"
 
 #include <algorithm>
 #include <numeric>
 
 namespace runtime {
 
-HostServices::HostServices(IMultiTask2& multiTask, ISerialFactory& serial,
-                           IPermanentStorage* storage)
+ServiceFactory::ServiceFactory(IMultiTask2& multiTask, ISerialFactory& serial,
+                               IPermanentStorage* storage)
     : services_{{"IMultiTask2", &multiTask, 0},
                 {"ISerialFactory", &serial, 0},
                 {"ISocketFactory", &sockets_, 0},
@@ -14,7 +14,7 @@ HostServices::HostServices(IMultiTask2& multiTask, ISerialFactory& serial,
     if (storage != nullptr) services_.push_back({"IPermanentStorage", storage, 0});
 }
 
-IInterface* HostServices::CreateInterface(const char* name) {
+IInterface* ServiceFactory::CreateInterface(const char* name) {
     const std::lock_guard guard(mutex_);
     for (Service& service : services_) {
         if (!CompareInterface(name, service.name.c_str())) continue;
@@ -24,7 +24,7 @@ IInterface* HostServices::CreateInterface(const char* name) {
     return nullptr;
 }
 
-void HostServices::ReleaseInterface(IInterface* held) {
+void ServiceFactory::ReleaseInterface(IInterface* held) {
     const std::lock_guard guard(mutex_);
     const auto owner = std::find_if(
         services_.begin(), services_.end(),
@@ -36,13 +36,13 @@ void HostServices::ReleaseInterface(IInterface* held) {
     }
 }
 
-int HostServices::outstanding() const {
+int ServiceFactory::outstanding() const {
     const std::lock_guard guard(mutex_);
     return std::accumulate(services_.begin(), services_.end(), 0,
                            [](int sum, const Service& service) { return sum + service.held; });
 }
 
-int HostServices::outstanding(const std::string& name) const {
+int ServiceFactory::outstanding(const std::string& name) const {
     const std::lock_guard guard(mutex_);
     for (const Service& service : services_) {
         if (service.name == name) return service.held;
@@ -50,16 +50,16 @@ int HostServices::outstanding(const std::string& name) const {
     return 0;
 }
 
-int HostServices::strayReleases() const {
+int ServiceFactory::strayReleases() const {
     const std::lock_guard guard(mutex_);
     return strayReleases_;
 }
 
-void* HostServices::Sockets::ConvertTo(const char* name) {
+void* ServiceFactory::Sockets::ConvertTo(const char* name) {
     return CompareInterface(name, "ISocketFactory") ? static_cast<ISocketFactory*>(this) : nullptr;
 }
 
-void* HostServices::DataBuffer::ConvertTo(const char* name) {
+void* ServiceFactory::DataBuffer::ConvertTo(const char* name) {
     return CompareInterface(name, "ICDSBuffer") ? static_cast<ICDSBuffer*>(this) : nullptr;
 }
 

@@ -1,4 +1,4 @@
-#include "runtime/HostServices.h"
+#include "runtime/ServiceFactory.h"
 
 #include <gtest/gtest.h>
 
@@ -11,7 +11,7 @@ namespace {
 
 using namespace runtime;
 
-TEST(HostServicesTest, ServesTheRequiredFourByExactName) {
+TEST(ServiceFactoryTest, ServesTheRequiredFourByExactName) {
     FakeHost host;
     for (const char* name : {"IMultiTask2", "ISerialFactory", "ISocketFactory", "ICDSBuffer"}) {
         IInterface* service = host.services.CreateInterface(name);
@@ -23,7 +23,7 @@ TEST(HostServicesTest, ServesTheRequiredFourByExactName) {
     EXPECT_EQ(4, host.services.outstanding());
 }
 
-TEST(HostServicesTest, OthersAreNull) {
+TEST(ServiceFactoryTest, OthersAreNull) {
     FakeHost host;
     for (const char* name : {"IDiag", "IDriverInterface", "ISmux", "IFastTimer", "imultitask2",
                              "IMultiTask2 ", "", "IPermanentStorage"}) {
@@ -33,17 +33,17 @@ TEST(HostServicesTest, OthersAreNull) {
     EXPECT_EQ(0, host.services.outstanding());
 }
 
-TEST(HostServicesTest, ServesStorageWhenThereIsOne) {
+TEST(ServiceFactoryTest, ServesStorageWhenThereIsOne) {
     PosixMultiTask multiTask;
     PosixSerialFactory serial;
     MemoryStorage storage;
-    HostServices services(multiTask, serial, &storage);
+    ServiceFactory services(multiTask, serial, &storage);
     IInterface* held = services.CreateInterface("IPermanentStorage");
     ASSERT_NE(held, nullptr);
     EXPECT_EQ(static_cast<IPermanentStorage2*>(&storage), held->ConvertTo("IPermanentStorage2"));
 }
 
-TEST(HostServicesTest, CountsWhatIsHeld) {
+TEST(ServiceFactoryTest, CountsWhatIsHeld) {
     FakeHost host;
     IInterface* first = host.services.CreateInterface("IMultiTask2");
     IInterface* second = host.services.CreateInterface("IMultiTask2");
@@ -54,7 +54,7 @@ TEST(HostServicesTest, CountsWhatIsHeld) {
     EXPECT_EQ(0, host.services.strayReleases());
 }
 
-TEST(HostServicesTest, NoticesReleasesOfWhatIsNotHeld) {
+TEST(ServiceFactoryTest, NoticesReleasesOfWhatIsNotHeld) {
     FakeHost host;
     MemoryStorage foreign;
     host.services.ReleaseInterface(&foreign);
@@ -64,7 +64,7 @@ TEST(HostServicesTest, NoticesReleasesOfWhatIsNotHeld) {
     EXPECT_EQ(0, host.services.outstanding());
 }
 
-TEST(HostServicesTest, CountsFromSeveralThreads) {
+TEST(ServiceFactoryTest, CountsFromSeveralThreads) {
     FakeHost host;
     const auto takeAndGiveBack = [&host] {
         for (int round = 0; round < 1000; ++round) {
