@@ -70,8 +70,7 @@ const SqliteStorage::Names& SqliteStorage::namesOf(const char* section) {
 }
 
 bool SqliteStorage::find(const char* section, const char* key, StoredValue& value) {
-    const std::lock_guard guard(mutex_);
-    if (!complete(section, key) || !isThere()) return false;
+    if (!isThere()) return false;
     const SqliteUse take(database_->take);
     take->bind(1, section);
     take->bind(2, key);
@@ -86,53 +85,16 @@ bool SqliteStorage::find(const char* section, const char* key, StoredValue& valu
 }
 
 bool SqliteStorage::findName(const char* section, int index, std::string& name) {
-    const std::lock_guard guard(mutex_);
-    if (!complete(section, "") || index < 0) return false;
+    if (index < 0) return false;
     const Names& names = namesOf(section);
     if (static_cast<std::size_t>(index) >= names.size()) return false;
     name = names[static_cast<std::size_t>(index)];
     return true;
 }
 
-const char* SqliteStorage::readString(const char* section, const char* key) {
-    StoredValue value;
-    return keptForThread(find(section, key, value) ? storedText(value) : std::string());
-}
-
-bool SqliteStorage::readBool(const char* section, const char* key) {
-    StoredValue value;
-    return find(section, key, value) && storedBool(value);
-}
-
-int SqliteStorage::readInt(const char* section, const char* key) {
-    StoredValue value;
-    return find(section, key, value) ? storedInt(value) : 0;
-}
-
-int SqliteStorage::hasKey(const char* section, const char* key) {
-    StoredValue value;
-    return find(section, key, value) ? 1 : 0;
-}
-
 int SqliteStorage::keyCount(const char* section) {
     const std::lock_guard guard(mutex_);
     return complete(section, "") ? static_cast<int>(namesOf(section).size()) : 0;
-}
-
-const char* SqliteStorage::keyName(const char* section, int index) {
-    std::string name;
-    findName(section, index, name);
-    return keptForThread(name);
-}
-
-int SqliteStorage::readStringInto(const char* section, const char* key, char* buffer, int size) {
-    StoredValue value;
-    return find(section, key, value) ? copyInto(storedText(value), buffer, size) : 0;
-}
-
-int SqliteStorage::keyNameInto(const char* section, int index, char* buffer, int size) {
-    std::string name;
-    return findName(section, index, name) ? copyInto(name, buffer, size) : 0;
 }
 
 std::vector<std::string> SqliteStorage::sections() {

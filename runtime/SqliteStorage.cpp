@@ -44,7 +44,7 @@ std::string SqliteStorage::whyReadOnly() const {
 bool SqliteStorage::openNow() {
     auto opened = openStorageDatabase(path_, busyTimeoutMs_);
     if (!opened) {
-        if (failure_.empty()) failure_ = opened.error().text;
+        noteFailure(opened.error().text);
         return false;
     }
     database_ = std::move(opened.value().database);
@@ -61,7 +61,7 @@ bool SqliteStorage::isThere() {
 bool SqliteStorage::isWritable(const std::string& what) {
     if (database_ == nullptr) {
         if (const auto fault = createMissing(path_)) {
-            if (failure_.empty()) failure_ = fault->text;
+            noteFailure(fault->text);
             return false;
         }
         if (!openNow()) return false;
@@ -71,24 +71,20 @@ bool SqliteStorage::isWritable(const std::string& what) {
     return false;
 }
 
-/// Notes the first failure.
+std::string SqliteStorage::failureText(const std::string& what) const {
+    return path_ + ": " + what;
+}
+
 void SqliteStorage::fail(const std::string& what) {
-    if (failure_.empty()) failure_ = path_ + ": " + what;
+    noteFailure(failureText(what));
 }
 
 void SqliteStorage::failStep(const std::string& what) {
     fail(what + ": " + database_->message());
 }
 
-bool SqliteStorage::complete(const char* section, const char* key) {
-    const bool given = section != nullptr && key != nullptr;
-    if (!given) fail("null argument");
-    return given;
-}
-
 void SqliteStorage::write(const char* section, const char* key, const StoredValue& value) {
-    const std::lock_guard guard(mutex_);
-    if (!complete(section, key) || !isWritable("writing " + place(section, key))) return;
+    if (!isWritable("writing " + place(section, key))) return;
     names_.clear();
     const SqliteUse put(database_->put);
     put->bind(1, section);
@@ -102,23 +98,6 @@ void SqliteStorage::write(const char* section, const char* key, const StoredValu
     if (put->step() != SQLITE_DONE) failStep("writing " + place(section, key));
 }
 
-void SqliteStorage::writeString(const char* section, const char* key, const char* value) {
-    if (value == nullptr) {
-        const std::lock_guard guard(mutex_);
-        fail("null argument");
-        return;
-    }
-    write(section, key, std::string(value));
-}
-
-void SqliteStorage::writeBool(const char* section, const char* key, bool value) {
-    write(section, key, value);
-}
-
-void SqliteStorage::writeInt(const char* section, const char* key, int value) {
-    write(section, key, value);
-}
-
 void SqliteStorage::removeKey(const char* section, const char* key) {
     const std::lock_guard guard(mutex_);
     if (!complete(section, key) || !isThere()) return;
@@ -128,29 +107,6 @@ void SqliteStorage::removeKey(const char* section, const char* key) {
     remove->bind(1, section);
     remove->bind(2, key);
     if (remove->step() != SQLITE_DONE) failStep("removing " + place(section, key));
-}
-
-bool SqliteStorage::failed() const {
-    const std::lock_guard guard(mutex_);
-    return !failure_.empty();
-}
-
-std::string SqliteStorage::lastError() const {
-    const std::lock_guard guard(mutex_);
-    return failure_;
-}
-
-void SqliteStorage::clearFailure() {
-    const std::lock_guard guard(mutex_);
-    failure_.clear();
-}
-
-void* SqliteStorage::ConvertTo(const char* name) {
-    if (CompareInterface(name, "IPermanentStorage")) return static_cast<IPermanentStorage*>(this);
-    if (CompareInterface(name, "IPermanentStorage2")) {
-        return static_cast<IPermanentStorage2*>(this);
-    }
-    return nullptr;
 }
 
 }  // namespace runtime

@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "runtime/Result.h"
-#include "runtime/Storage.h"
+#include "runtime/StorageBase.h"
 #include "runtime/StoragePath.h"
 
 namespace runtime {
@@ -33,7 +33,7 @@ struct StorageError {
 
 /// A value whose write has returned without a failure survives the death of the process and of
 /// the system. Several processes may use one file at a time. docs/storage.md shows the layout.
-class SqliteStorage final : public Storage {
+class SqliteStorage final : public StorageBase {
   public:
     /// Opens the file. One that is missing or empty holds nothing; the first write makes it (mode
     /// 0600), with the directories that are missing on the way (mode 0700). A file that is there
@@ -55,27 +55,13 @@ class SqliteStorage final : public Storage {
     std::string whyReadOnly() const;
     const std::string& path() const { return path_; }
 
-    void writeString(const char* section, const char* key, const char* value) override;
-    void writeBool(const char* section, const char* key, bool value) override;
-    void writeInt(const char* section, const char* key, int value) override;
-    const char* readString(const char* section, const char* key) override;
-    bool readBool(const char* section, const char* key) override;
-    int readInt(const char* section, const char* key) override;
-    int hasKey(const char* section, const char* key) override;
     void removeKey(const char* section, const char* key) override;
     int keyCount(const char* section) override;
-    const char* keyName(const char* section, int index) override;
-    int readStringInto(const char* section, const char* key, char* buffer, int size) override;
-    int keyNameInto(const char* section, int index, char* buffer, int size) override;
 
-    bool failed() const override;
-    std::string lastError() const override;
-    void clearFailure() override;
     std::vector<std::string> sections() override;
     std::vector<StoredEntry> entries(const std::string& section) override;
     std::vector<UnusedEntry> unused(const std::string& section) override;
 
-    void* ConvertTo(const char* name) override;
     const char* GetImpName() const override { return "runtime::SqliteStorage"; }
     int GetImpVersion() const override { return 100; }
 
@@ -95,20 +81,18 @@ class SqliteStorage final : public Storage {
     Row rowIn(const SqliteStatement& statement) const;
     std::vector<Row> rowsOf(const std::string& section);
     const Names& namesOf(const char* section);
-    void write(const char* section, const char* key, const StoredValue& value);
-    bool find(const char* section, const char* key, StoredValue& value);
-    bool findName(const char* section, int index, std::string& name);
+    void write(const char* section, const char* key, const StoredValue& value) override;
+    bool find(const char* section, const char* key, StoredValue& value) override;
+    bool findName(const char* section, int index, std::string& name) override;
+    std::string failureText(const std::string& what) const override;
     void fail(const std::string& what);
     void failStep(const std::string& what);
-    bool complete(const char* section, const char* key);
 
-    mutable std::mutex mutex_;
     std::string path_;
     int busyTimeoutMs_;
     StorageJudge judge_;
     std::unique_ptr<SqliteDatabase> database_;  ///< Null while the file is missing.
     std::string whyReadOnly_;
-    std::string failure_;
     std::map<std::string, Names> names_;  ///< By section, as of `namesVersion_`.
     std::int64_t namesVersion_ = 0;
 };
