@@ -1,3 +1,4 @@
+// The texts behind a word that is none of those accepted.
 #include "cli/Choices.h"
 
 #include <fmt/format.h>

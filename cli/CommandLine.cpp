@@ -1,3 +1,4 @@
+// The whole command line: which sub-commands there are, and how a failure becomes an exit code.
 #include <fmt/format.h>
 
 #include <CLI/CLI.hpp>

@@ -1,3 +1,4 @@
+// Keys that the driver skips in a configuration, said before it starts.
 #include "cli/ConfigWarnings.h"
 
 #include <fmt/format.h>

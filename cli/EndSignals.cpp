@@ -1,3 +1,4 @@
+// How SIGINT, SIGTERM and SIGHUP end the command, and what is undone first.
 #include "cli/EndSignals.h"
 
 #include <unistd.h>

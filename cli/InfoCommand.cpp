@@ -1,3 +1,4 @@
+// The sub-command `mrtu info`.
 #include <fmt/format.h>
 
 #include <CLI/CLI.hpp>

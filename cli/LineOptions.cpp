@@ -1,3 +1,4 @@
+// Declares the options of a line and makes the configuration text of them.
 #include "cli/LineOptions.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// Where the plug-in is looked for when the command line does not say.
 #include <fmt/format.h>
 
 #include <CLI/CLI.hpp>

@@ -1,3 +1,4 @@
+// The sub-command `mrtu read`.
 #include <CLI/CLI.hpp>
 #include <algorithm>
 #include <memory>

@@ -1,3 +1,4 @@
+// Prints what became of each tag, as lines or as one JSON array.
 #include "cli/Results.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// How a session is put together: driver, line, storage, trace.
 #include "cli/Session.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// The sub-command `mrtu sim`.
 #include <fmt/format.h>
 #include <signal.h>
 

@@ -1,3 +1,4 @@
+// Which nodes a simulated line has, by a configuration or without one.
 #include "cli/SimNodes.h"
 
 #include <set>

@@ -1,3 +1,4 @@
+// One line of text for each frame.
 #include "cli/TraceText.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// The complaint about a command line, with what was probably meant.
 #include "cli/UsageText.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// What an option's word may be, and the complaint when it is not.
 #include "cli/Validators.h"
 
 #include <fmt/format.h>

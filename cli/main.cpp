@@ -1,3 +1,4 @@
+// The program `mrtu`: the process around the command line.
 #include <fcntl.h>
 #include <unistd.h>
 

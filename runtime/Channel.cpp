@@ -1,3 +1,4 @@
+// Tags, reads, writes and console commands of one protocol object.
 #include "runtime/Channel.h"
 
 #include <algorithm>

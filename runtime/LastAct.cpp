@@ -1,3 +1,4 @@
+// The acts that a signal handler may still do.
 #include "runtime/LastAct.h"
 
 #include <array>

@@ -1,3 +1,4 @@
+// Reception and sending against one deadline.
 #include "runtime/LineTransfer.h"
 
 #include <algorithm>

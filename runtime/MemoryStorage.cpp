@@ -1,3 +1,4 @@
+// A storage in maps.
 #include "runtime/MemoryStorage.h"
 
 #include <iterator>

@@ -1,3 +1,4 @@
+// Opens a plug-in's module and makes its protocol objects.
 #include "runtime/Module.h"
 
 #include <utility>

@@ -1,3 +1,4 @@
+// Loads a plug-in with dlopen() and looks up its one entry.
 #include "runtime/PluginLibrary.h"
 
 #include <dlfcn.h>

@@ -1,3 +1,4 @@
+// Reads, writes and polls a file descriptor, and discards what waits in it.
 #include "runtime/PosixLine.h"
 
 #include <poll.h>

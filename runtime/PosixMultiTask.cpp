@@ -1,3 +1,4 @@
+// Locks and pauses on POSIX threads.
 #include "runtime/PosixMultiTask.h"
 
 #include <cerrno>

@@ -1,3 +1,4 @@
+// Maps the names of ports to devices and opens them.
 #include "runtime/PosixSerialFactory.h"
 
 #include <algorithm>

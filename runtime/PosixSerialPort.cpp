@@ -1,3 +1,4 @@
+// The operations of an open serial port.
 #include "runtime/PosixSerialPort.h"
 
 #include <fcntl.h>

@@ -1,3 +1,4 @@
+// Turns line settings into the kernel's terminal flags and finds what the kernel changed.
 #include "runtime/SerialSettings.h"
 
 #include <algorithm>

@@ -1,3 +1,4 @@
+// Hands services out by name and counts what is held.
 #include "runtime/ServiceFactory.h"
 
 #include <algorithm>

@@ -1,3 +1,4 @@
+// Opens a connection and prepares its statements.
 #include "runtime/SqliteDatabase.h"
 
 #include <string_view>

@@ -1,3 +1,4 @@
+// What can be told of a storage file, and made of it, without SQLite.
 #include "runtime/SqliteFile.h"
 
 #include <fcntl.h>

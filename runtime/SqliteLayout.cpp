@@ -1,3 +1,4 @@
+// Makes the storage's table and moves older files to it.
 #include "runtime/SqliteLayout.h"
 
 #include <zlib.h>

@@ -1,3 +1,4 @@
+// The steps of opening a storage file, each of which may refuse it.
 #include "runtime/SqliteOpen.h"
 
 #include <chrono>

@@ -1,3 +1,4 @@
+// What the storage writes into its file.
 #include "runtime/SqliteStorage.h"
 
 #include <utility>

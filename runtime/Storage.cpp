@@ -1,3 +1,4 @@
+// How storages hand out texts.
 #include "runtime/Storage.h"
 
 #include <cstring>

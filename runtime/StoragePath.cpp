@@ -1,3 +1,4 @@
+// Finds the storage's place by the environment and makes its directories.
 #include "runtime/StoragePath.h"
 
 #include <sys/stat.h>

@@ -1,3 +1,4 @@
+// How a stored value reads as text, number and boolean.
 #include "runtime/StoredValue.h"
 
 #include <algorithm>

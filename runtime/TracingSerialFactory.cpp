@@ -1,3 +1,4 @@
+// Ports that pass everything on and tell of whole frames.
 #include "runtime/TracingSerialFactory.h"
 
 #include <algorithm>

@@ -1,3 +1,4 @@
+// Asks the driver what it makes of a tag and of its conversions.
 #include "cli/check/DriverFacts.h"
 
 #include <algorithm>

@@ -1,3 +1,4 @@
+// Prints findings and turns them into an exit code.
 #include "cli/check/FindingText.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// The sub-command `mrtu console`.
 #include <fmt/format.h>
 #include <unistd.h>
 

@@ -1,3 +1,4 @@
+// Lines from a terminal through libedit, or from a pipe as they come.
 #include "cli/console/LineEditor.h"
 
 #include <histedit.h>

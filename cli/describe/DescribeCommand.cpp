@@ -1,3 +1,4 @@
+// The sub-command `mrtu describe`.
 #include <CLI/CLI.hpp>
 #include <array>
 #include <memory>

@@ -1,3 +1,4 @@
+// Each part of a description as a JSON value.
 #include "cli/describe/DescriptionJson.h"
 
 #include "values/TypeMask.h"

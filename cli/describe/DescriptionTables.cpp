@@ -1,3 +1,4 @@
+// Each part of a description as a table.
 #include "cli/describe/DescriptionTables.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// Loads a driver on services that open no port.
 #include "cli/describe/OfflineDriver.h"
 
 #include "cli/ExitCode.h"

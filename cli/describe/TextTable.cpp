@@ -1,3 +1,4 @@
+// Columns as wide as their widest entry.
 #include "cli/describe/TextTable.h"
 
 #include <algorithm>

@@ -1,3 +1,4 @@
+// Machine, word length, byte order and float convention by name.
 #include "cli/inspect/Architecture.h"
 
 #include <elf.h>

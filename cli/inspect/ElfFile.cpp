@@ -1,3 +1,4 @@
+// Takes sections and strings from an ELF file, every length checked.
 #include "cli/inspect/ElfFile.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// Collects what a library defines, needs and asks for.
 #include "cli/inspect/ElfLibrary.h"
 
 #include <map>

@@ -1,3 +1,4 @@
+// The sub-command `mrtu inspect`.
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 

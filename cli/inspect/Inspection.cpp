@@ -1,3 +1,4 @@
+// Follows what a plug-in needs through all its libraries.
 #include "cli/inspect/Inspection.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// Demangles a C++ name, as far as it is one.
 #include "cli/inspect/ReadableName.h"
 
 #include <cxxabi.h>

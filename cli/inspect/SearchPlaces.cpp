@@ -1,3 +1,4 @@
+// The folders that the loader looks in for what a library needs.
 #include "cli/inspect/SearchPlaces.h"
 
 #include "cli/ExitCode.h"

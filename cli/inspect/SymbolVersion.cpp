@@ -1,3 +1,4 @@
+// Finds the newest of versions like GLIBC_2.34.
 #include "cli/inspect/SymbolVersion.h"
 
 #include <charconv>

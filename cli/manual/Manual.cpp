@@ -1,3 +1,4 @@
+// What pages and completions ask of the command line as data.
 #include "cli/manual/Manual.h"
 
 #include <array>

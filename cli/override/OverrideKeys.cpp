@@ -1,3 +1,4 @@
+// Makes the storage's keys of overrides and takes them apart.
 #include "cli/override/OverrideKeys.h"
 
 #include <fmt/format.h>

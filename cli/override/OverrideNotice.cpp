@@ -1,3 +1,4 @@
+// Tells of overrides in force that neither command line nor configuration shows.
 #include "cli/override/OverrideNotice.h"
 
 #include <fmt/format.h>

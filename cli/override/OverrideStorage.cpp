@@ -1,3 +1,4 @@
+// Opens the storage for a command and judges what stands in it.
 #include "cli/override/OverrideStorage.h"
 
 #include <fmt/format.h>

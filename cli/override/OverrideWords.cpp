@@ -1,3 +1,4 @@
+// Reads the words of an override, and the table of serial settings with their codes.
 #include "cli/override/OverrideWords.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// Reads and writes overrides through the driver's own memory areas.
 #include "cli/override/Overrides.h"
 
 #include <fmt/format.h>

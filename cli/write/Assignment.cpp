@@ -1,3 +1,4 @@
+// Splits "URI=VALUE".
 #include "cli/write/Assignment.h"
 
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+// The sub-command `mrtu write`.
 #include <fmt/format.h>
 
 #include <CLI/CLI.hpp>

@@ -1,3 +1,4 @@
+// Whether a write goes out as one request.
 #include "cli/write/WriteRequests.h"
 
 #include <algorithm>
