@@ -14,7 +14,8 @@ if(MRTU_TOOLS)
 endif()
 
 # The folders as in the source tree, so that the links in the texts lead somewhere.
-install(FILES README.md COMPONENT runtime DESTINATION ${MRTU_DOCUMENT_DIR})
+install(FILES README.md CHANGELOG.md CONTRIBUTING.md COMPONENT runtime
+  DESTINATION ${MRTU_DOCUMENT_DIR})
 install(DIRECTORY docs COMPONENT runtime DESTINATION ${MRTU_DOCUMENT_DIR}
   FILES_MATCHING PATTERN "*.md")
 install(DIRECTORY examples COMPONENT development DESTINATION ${MRTU_DOCUMENT_DIR}
