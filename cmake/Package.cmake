@@ -8,7 +8,7 @@ set(MRTU_HEADER_DIR ${CMAKE_INSTALL_INCLUDEDIR}/mrtu)
 set(MRTU_CMAKE_DIR lib/cmake/mrtu)
 
 install(TARGETS mrtu_plugin COMPONENT runtime LIBRARY DESTINATION ${MRTU_PLUGIN_DIR})
-if(TARGET mrtu)
+if(MRTU_TOOLS)
   install(TARGETS mrtu COMPONENT runtime RUNTIME DESTINATION bin)
 endif()
 
