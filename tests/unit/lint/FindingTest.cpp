@@ -15,8 +15,8 @@ TEST(Finding, OrderIsThatOfSourcesLinesAndColumns) {
     Findings findings{finding(Severity::Warning, "z", 2, 1), finding(Severity::Warning, "a", 1, 1),
                       finding(Severity::Error, "z", 1, 9), finding(Severity::Error, "z", 1, 2)};
     sortByPlace(findings);
-    EXPECT_EQ(placesOf(findings), "rule@1:2 rule@1:9 rule@2:1 rule@1:1");
-    EXPECT_EQ(findings.back().place.source, "a");
+    EXPECT_EQ("rule@1:2 rule@1:9 rule@2:1 rule@1:1", placesOf(findings));
+    EXPECT_EQ("a", findings.back().place.source);
 }
 
 }  // namespace

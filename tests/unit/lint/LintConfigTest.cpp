@@ -57,7 +57,7 @@ TEST(LintConfig, FindsWhatTheDriverPassesOver) {
         {"CfgVer=1 Node4::model=Enron", "unknown-model@1:23"},
     };
     for (const Case& each : cases)
-        EXPECT_EQ(placesOf(lint(each.text)), each.places) << each.text;
+        EXPECT_EQ(each.places, placesOf(lint(each.text))) << each.text;
 }
 
 TEST(LintConfig, DataBitsWithoutEffectAreFound) {
@@ -74,52 +74,52 @@ TEST(LintConfig, DataBitsWithoutEffectAreFound) {
         {"CfgVer=1 bits=7", "ignored-key@1:10"},
     };
     for (const Case& each : cases)
-        EXPECT_EQ(placesOf(lint(each.text)), each.places) << each.text;
+        EXPECT_EQ(each.places, placesOf(lint(each.text))) << each.text;
 }
 
 TEST(LintConfig, NearestKnownKeyIsSuggested) {
-    EXPECT_EQ(lint("CfgVer=1 timout=1").at(0).suggestion, "did you mean 'timeout'?");
-    EXPECT_EQ(lint("CfgVer=1 weather=1").at(0).suggestion,
-              "'mrtu describe parameters' lists the keys");
+    EXPECT_EQ("did you mean 'timeout'?", lint("CfgVer=1 timout=1").at(0).suggestion);
+    EXPECT_EQ("'mrtu describe parameters' lists the keys",
+              lint("CfgVer=1 weather=1").at(0).suggestion);
 }
 
 TEST(LintConfig, EveryWarningHasASuggestion) {
     for (const Finding& finding :
          lint("x CfgVer=1 a b=1 timeout=01 timeout=2 Node01::timeout=1 Node1::uart=a bits=7 "
               "maxOptLen=999 stopbits=3x model=9 CfgVer=2")) {
-        EXPECT_EQ(finding.severity, Severity::Warning);
+        EXPECT_EQ(Severity::Warning, finding.severity);
         EXPECT_FALSE(finding.message.empty()) << finding.rule;
         EXPECT_FALSE(finding.suggestion.empty()) << finding.rule;
     }
 }
 
 TEST(LintConfig, DuplicateNamesTheValueThatCounts) {
-    EXPECT_EQ(lint("CfgVer=1\ntimeout=7 timeout=8").at(0).message,
-              "'timeout' is given twice; the first value, '7' in line 2, counts");
+    EXPECT_EQ("'timeout' is given twice; the first value, '7' in line 2, counts",
+              lint("CfgVer=1\ntimeout=7 timeout=8").at(0).message);
 }
 
 TEST(ConfigRefusal, StandsAtTheItemThatTheMessageNames) {
     const ScannedConfig config = settings::scanConfig("cfg", "CfgVer=1\nparity=evn");
     const Finding finding =
         configRefusal(config, sampleDescription(), "Parser: parameter 'parity' has invalid value");
-    EXPECT_EQ(finding.severity, Severity::Error);
-    EXPECT_EQ(finding.place, (Place{"cfg", 2, 8}));
-    EXPECT_EQ(finding.suggestion, "e.g. parity=even; choices: none, even, odd");
+    EXPECT_EQ(Severity::Error, finding.severity);
+    EXPECT_EQ((Place{"cfg", 2, 8}), finding.place);
+    EXPECT_EQ("e.g. parity=even; choices: none, even, odd", finding.suggestion);
 }
 
 TEST(ConfigRefusal, MissingKeyIsToBeAddedAtTheEnd) {
     const ScannedConfig config = settings::scanConfig("cfg", "CfgVer=1 timeout=5");
     const Finding finding =
         configRefusal(config, sampleDescription(), "Parser: parameter 'uart' is not found");
-    EXPECT_EQ(finding.place, (Place{"cfg", 1, 19}));
-    EXPECT_EQ(finding.suggestion, "add e.g. uart=com1; choices: com1, com2");
+    EXPECT_EQ((Place{"cfg", 1, 19}), finding.place);
+    EXPECT_EQ("add e.g. uart=com1; choices: com1, com2", finding.suggestion);
 }
 
 TEST(ConfigRefusal, MissingMarkerIsToBeAddedAtTheStart) {
     const Finding finding = configRefusal(settings::scanConfig("cfg", "\n\ntimeout=5"),
                                           sampleDescription(), "Parser: unknown format");
-    EXPECT_EQ(finding.place, (Place{"cfg", 1, 1}));
-    EXPECT_EQ(finding.suggestion, "begin with CfgVer=1");
+    EXPECT_EQ((Place{"cfg", 1, 1}), finding.place);
+    EXPECT_EQ("begin with CfgVer=1", finding.suggestion);
 }
 
 TEST(LintConfig, EveryItemOfALongTextIsLookedAtOnce) {

@@ -25,74 +25,69 @@ TagLine bit(int line, const char* area, unsigned offset, int index, int count = 
 }
 
 TEST(LintOverlaps, TagsSideBySideDoNotOverlap) {
-    EXPECT_EQ(lint({reg(1, "HREG", 0, ICU_Type::short_, 2), reg(2, "HREG", 1, ICU_Type::float_, 4),
-                    reg(3, "HREG", 3, ICU_Type::short_, 2)}),
-              "");
+    EXPECT_EQ("",
+              lint({reg(1, "HREG", 0, ICU_Type::short_, 2), reg(2, "HREG", 1, ICU_Type::float_, 4),
+                    reg(3, "HREG", 3, ICU_Type::short_, 2)}));
 }
 
 TEST(LintOverlaps, TheTagFurtherDownIsReported) {
-    EXPECT_EQ(
-        lint({reg(1, "HREG", 0, ICU_Type::float_, 4), reg(2, "HREG", 1, ICU_Type::short_, 2)}),
-        "overlap@2:8");
-    EXPECT_EQ(
-        lint({reg(1, "HREG", 1, ICU_Type::short_, 2), reg(2, "HREG", 0, ICU_Type::float_, 4)}),
-        "overlap@2:8");
+    EXPECT_EQ("overlap@2:8", lint({reg(1, "HREG", 0, ICU_Type::float_, 4),
+                                   reg(2, "HREG", 1, ICU_Type::short_, 2)}));
+    EXPECT_EQ("overlap@2:8", lint({reg(1, "HREG", 1, ICU_Type::short_, 2),
+                                   reg(2, "HREG", 0, ICU_Type::float_, 4)}));
 }
 
 TEST(LintOverlaps, SameStartWithAnotherTypeOverlaps) {
-    EXPECT_EQ(lint({reg(1, "HREG", 5, ICU_Type::short_, 2),
-                    reg(2, "HREG", 5, ICU_Type::unsignedShort, 2)}),
-              "overlap@2:8");
+    EXPECT_EQ("overlap@2:8", lint({reg(1, "HREG", 5, ICU_Type::short_, 2),
+                                   reg(2, "HREG", 5, ICU_Type::unsignedShort, 2)}));
 }
 
 TEST(LintOverlaps, AnArrayAndItsItemsAreOfOneKind) {
     const TagLine array = reg(1, "HREG", 0, ICU_Type::intArray, 16, ICU_Type::int_);
-    EXPECT_EQ(lint({array, reg(2, "HREG", 2, ICU_Type::int_, 4)}), "");
-    EXPECT_EQ(lint({array, reg(2, "HREG", 1, ICU_Type::int_, 4)}), "overlap@2:8")
+    EXPECT_EQ("", lint({array, reg(2, "HREG", 2, ICU_Type::int_, 4)}));
+    EXPECT_EQ("overlap@2:8", lint({array, reg(2, "HREG", 1, ICU_Type::int_, 4)}))
         << "halves of two items";
 }
 
 TEST(LintOverlaps, OtherNodesAndAreasAreOtherMemory) {
     TagLine elsewhere = reg(2, "HREG", 0, ICU_Type::float_, 4);
     elsewhere.facts->node = 2;
-    EXPECT_EQ(lint({reg(1, "HREG", 0, ICU_Type::int_, 4), elsewhere,
-                    reg(3, "IREG", 0, ICU_Type::short_, 2)}),
-              "");
+    EXPECT_EQ("", lint({reg(1, "HREG", 0, ICU_Type::int_, 4), elsewhere,
+                        reg(3, "IREG", 0, ICU_Type::short_, 2)}));
 }
 
 TEST(LintOverlaps, WideRegistersCountByTheirOwnWidth) {
-    EXPECT_EQ(lint({reg(1, "LONG", 0, ICU_Type::int_, 4), reg(2, "LONG", 1, ICU_Type::float_, 4)}),
-              "");
-    EXPECT_EQ(lint({reg(1, "LONG", 0, ICU_Type::intArray, 8, ICU_Type::int_),
-                    reg(2, "LONG", 1, ICU_Type::float_, 4)}),
-              "overlap@2:8");
+    EXPECT_EQ("",
+              lint({reg(1, "LONG", 0, ICU_Type::int_, 4), reg(2, "LONG", 1, ICU_Type::float_, 4)}));
+    EXPECT_EQ("overlap@2:8", lint({reg(1, "LONG", 0, ICU_Type::intArray, 8, ICU_Type::int_),
+                                   reg(2, "LONG", 1, ICU_Type::float_, 4)}));
 }
 
 TEST(LintOverlaps, BitWrittenIntoARegisterOfAnotherTagIsReportedAtTheBit) {
-    EXPECT_EQ(lint({reg(1, "HREG", 4, ICU_Type::short_, 2), bit(2, "HREG", 4, 15)}),
-              "shared-register@2:8");
-    EXPECT_EQ(lint({bit(1, "HREG", 5, 0), reg(2, "HREG", 4, ICU_Type::float_, 4)}),
-              "shared-register@1:8");
-    EXPECT_EQ(lint({bit(1, "HREG", 3, 17), reg(2, "HREG", 4, ICU_Type::short_, 2)}),
-              "shared-register@1:8")
+    EXPECT_EQ("shared-register@2:8",
+              lint({reg(1, "HREG", 4, ICU_Type::short_, 2), bit(2, "HREG", 4, 15)}));
+    EXPECT_EQ("shared-register@1:8",
+              lint({bit(1, "HREG", 5, 0), reg(2, "HREG", 4, ICU_Type::float_, 4)}));
+    EXPECT_EQ("shared-register@1:8",
+              lint({bit(1, "HREG", 3, 17), reg(2, "HREG", 4, ICU_Type::short_, 2)}))
         << "bit 17 is in the next register";
 }
 
 TEST(LintOverlaps, BitSharesTheRegisterWithAByteBesideIt) {
-    EXPECT_EQ(lint({reg(1, "HREG", 4, ICU_Type::unsignedByte, 1), bit(2, "HREG", 4, 12)}),
-              "shared-register@2:8");
+    EXPECT_EQ("shared-register@2:8",
+              lint({reg(1, "HREG", 4, ICU_Type::unsignedByte, 1), bit(2, "HREG", 4, 12)}));
 }
 
 TEST(LintOverlaps, BitsOfOneRegisterAreNoOnesProperty) {
-    EXPECT_EQ(lint({bit(1, "HREG", 4, 0), bit(2, "HREG", 4, 1), bit(3, "HREG", 4, 0, 16)}), "");
+    EXPECT_EQ("", lint({bit(1, "HREG", 4, 0), bit(2, "HREG", 4, 1), bit(3, "HREG", 4, 0, 16)}));
 }
 
 TEST(LintOverlaps, BitsOfAStatusWordMayBeReadBesideIt) {
-    EXPECT_EQ(lint({reg(1, "IREG", 4, ICU_Type::short_, 2), bit(2, "IREG", 4, 3)}), "");
+    EXPECT_EQ("", lint({reg(1, "IREG", 4, ICU_Type::short_, 2), bit(2, "IREG", 4, 3)}));
 }
 
 TEST(LintOverlaps, CoilsAreOfOneKind) {
-    EXPECT_EQ(lint({bit(1, "OUTP", 0, 3), bit(2, "OUTP", 0, 0, 16)}), "");
+    EXPECT_EQ("", lint({bit(1, "OUTP", 0, 3), bit(2, "OUTP", 0, 0, 16)}));
 }
 
 TEST(LintOverlaps, ATagIsReportedOnceAgainstTheFirstThatItMeets) {
@@ -100,7 +95,7 @@ TEST(LintOverlaps, ATagIsReportedOnceAgainstTheFirstThatItMeets) {
         {reg(1, "HREG", 0, ICU_Type::short_, 2), reg(2, "HREG", 1, ICU_Type::short_, 2),
          reg(3, "HREG", 0, ICU_Type::float_, 4)},
         sampleDescription());
-    EXPECT_EQ(placesOf(findings), "overlap@3:8");
+    EXPECT_EQ("overlap@3:8", placesOf(findings));
     EXPECT_NE(findings[0].message.find("tags:1"), std::string::npos) << findings[0].message;
 }
 
@@ -149,17 +144,16 @@ TEST(LintOverlaps, ManyTagsGiveWhatTheirPairsGive) {
             tags.push_back(randomTag(random, line));
         const Findings all = lintOverlaps(tags, sampleDescription());
         const Findings pairs = lintPairs(tags);
-        ASSERT_EQ(placesOf(pairs), placesOf(all)) << round;
+        ASSERT_EQ(placesOf(all), placesOf(pairs)) << round;
         for (std::size_t i = 0; i < all.size(); ++i)
-            ASSERT_EQ(pairs[i].message, all[i].message) << round;
+            ASSERT_EQ(all[i].message, pairs[i].message) << round;
     }
 }
 
 TEST(LintOverlaps, RefusedAndEmptyTagsTakeNoPart) {
-    EXPECT_EQ(lint({tagLine("1?HREG?400001?x", "tags", 1, 1),
-                    reg(2, "HREG", 0, ICU_Type::intArray, 0, ICU_Type::int_),
-                    reg(3, "HREG", 0, ICU_Type::short_, 2)}),
-              "");
+    EXPECT_EQ("", lint({tagLine("1?HREG?400001?x", "tags", 1, 1),
+                        reg(2, "HREG", 0, ICU_Type::intArray, 0, ICU_Type::int_),
+                        reg(3, "HREG", 0, ICU_Type::short_, 2)}));
 }
 
 }  // namespace

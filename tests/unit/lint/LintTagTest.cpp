@@ -60,29 +60,29 @@ TEST(LintTag, FindsWhatTheDriverPassesOver) {
         {"1?HREG?400001.-1?short", "ignored-subindex@1:8"},
     };
     for (const Case& each : cases)
-        EXPECT_EQ(lint(each.uri), each.places) << each.uri;
+        EXPECT_EQ(each.places, lint(each.uri)) << each.uri;
 }
 
 TEST(LintTag, FiveDigitAddressIsExplainedInBothForms) {
     const Findings findings =
         lintTag(acceptedTag("1?HREG?40010?short", 1, 9, 0, ICU_Type::short_, 2), around());
-    ASSERT_EQ(findings.size(), 1U);
-    EXPECT_EQ(findings[0].suggestion, "write 400010 or 440010");
+    ASSERT_EQ(1U, findings.size());
+    EXPECT_EQ("write 400010 or 440010", findings[0].suggestion);
 }
 
 TEST(LintTag, SixDigitFormIsSuggestedForAnotherAreasShortForm) {
     const Findings findings =
         lintTag(acceptedTag("1?OUTP?40010?boolean", 1, 0, 0, ICU_Type::boolean, 1), around());
-    ASSERT_EQ(findings.size(), 1U);
+    ASSERT_EQ(1U, findings.size());
     EXPECT_NE(findings[0].suggestion.find("400010"), std::string::npos) << findings[0].suggestion;
 }
 
 TEST(LintTag, OctalAddressTellsWhatItIsReadAs) {
     const Findings findings =
         lintTag(acceptedTag("1?OUTP?0100?boolean", 1, 0, 0, ICU_Type::boolean, 1), around());
-    ASSERT_EQ(findings.size(), 1U);
-    EXPECT_EQ(findings[0].message, "address '0100' begins with a zero and is read as octal: 64");
-    EXPECT_EQ(findings[0].suggestion, "write 100 for the decimal number");
+    ASSERT_EQ(1U, findings.size());
+    EXPECT_EQ("address '0100' begins with a zero and is read as octal: 64", findings[0].message);
+    EXPECT_EQ("write 100 for the decimal number", findings[0].suggestion);
 }
 
 TEST(LintTag, RefusedTagsAreLeftToTheirRefusal) {
@@ -93,11 +93,11 @@ TEST(LintTag, RefusedTagsAreLeftToTheirRefusal) {
 TEST(TagSurroundings, ModelsFollowTheNodeAndThenTheConfiguration) {
     const TagSurroundings surroundings = surroundingsOf(
         "CfgVer=1 defNodeId=1 model=3 Node2::model=1 Node4::model=x", sampleDescription());
-    EXPECT_EQ(surroundings.nodes, (std::set<int>{1, 2, 4}));
-    EXPECT_EQ(surroundings.modelOf(1)->name, "3");
-    EXPECT_EQ(surroundings.modelOf(2)->name, "1");
-    EXPECT_EQ(surroundings.modelOf(4)->name, "1") << "an unknown model is the first one";
-    EXPECT_EQ(surroundings.modelOf(9)->name, "3");
+    EXPECT_EQ((std::set<int>{1, 2, 4}), surroundings.nodes);
+    EXPECT_EQ("3", surroundings.modelOf(1)->name);
+    EXPECT_EQ("1", surroundings.modelOf(2)->name);
+    EXPECT_EQ("1", surroundings.modelOf(4)->name) << "an unknown model is the first one";
+    EXPECT_EQ("3", surroundings.modelOf(9)->name);
 }
 
 }  // namespace

@@ -9,28 +9,28 @@ using settings::Place;
 
 TEST(TagLines, CommentsAndBlanksDoNotCount) {
     const auto tags = tagLines("t", "# all\n\n  1?A?2?int  # one\r\n\t#\n1?B?3?int");
-    ASSERT_EQ(tags.size(), 2U);
-    EXPECT_EQ(tags[0].uri, "1?A?2?int");
-    EXPECT_EQ(tags[0].place, (Place{"t", 3, 3}));
-    EXPECT_EQ(tags[1].place, (Place{"t", 5, 1}));
+    ASSERT_EQ(2U, tags.size());
+    EXPECT_EQ("1?A?2?int", tags[0].uri);
+    EXPECT_EQ((Place{"t", 3, 3}), tags[0].place);
+    EXPECT_EQ((Place{"t", 5, 1}), tags[1].place);
 }
 
 TEST(TagLines, LinesMayEndInCarriageReturns) {
     const auto tags = tagLines("t", "1?A?2?int\r\n1?A?3?int\r\n");
-    ASSERT_EQ(tags.size(), 2U);
-    EXPECT_EQ(tags[0].uri, "1?A?2?int");
-    EXPECT_EQ(tags[1].dataType(), "int");
+    ASSERT_EQ(2U, tags.size());
+    EXPECT_EQ("1?A?2?int", tags[0].uri);
+    EXPECT_EQ("int", tags[1].dataType());
 }
 
 TEST(TagLines, FieldsAreTrimmedAndKnowTheirColumns) {
     const TagLine tag = tagLine("1? HREG ?400001.3? int (swap2)", "t", 1, 5);
     ASSERT_TRUE(tag.wellFormed());
-    EXPECT_EQ(tag.area(), "HREG");
-    EXPECT_EQ(tag.placeOf(1).column, 8);
-    EXPECT_EQ(tag.address(), "400001");
-    EXPECT_EQ(tag.subIndex(), "3");
-    EXPECT_EQ(tag.dataType(), "int (swap2)");
-    EXPECT_EQ(tag.placeOf(9), tag.place);
+    EXPECT_EQ("HREG", tag.area());
+    EXPECT_EQ(8, tag.placeOf(1).column);
+    EXPECT_EQ("400001", tag.address());
+    EXPECT_EQ("3", tag.subIndex());
+    EXPECT_EQ("int (swap2)", tag.dataType());
+    EXPECT_EQ(tag.place, tag.placeOf(9));
 }
 
 TEST(TagLines, AByteOrderByNameIsItsConversions) {
@@ -41,7 +41,7 @@ TEST(TagLines, AByteOrderByNameIsItsConversions) {
     EXPECT_EQ("", tag.orderRefusal);
     const TagLine wrong = tagLine("1?HREG?400001?float@ABDC", "t", 1, 1);
     EXPECT_EQ("'ABDC' is no byte order of float: ABCD, CDAB, DCBA, BADC", wrong.orderRefusal);
-    EXPECT_EQ(wrong.uri, wrong.driverUri);
+    EXPECT_EQ(wrong.driverUri, wrong.uri);
 }
 
 TEST(TagLines, OtherCountsOfFieldsAreNotWellFormed) {
@@ -52,11 +52,11 @@ TEST(TagLines, OtherCountsOfFieldsAreNotWellFormed) {
 
 TEST(TagLines, DataTypesComeApart) {
     const DataTypeText array = dataTypeText("float-4(swap2, swap4)");
-    EXPECT_EQ(array.name, "float-");
-    EXPECT_EQ(array.conversions, (std::vector<std::string>{"swap2", "swap4"}));
-    EXPECT_EQ(dataTypeText(" short ").name, "short");
+    EXPECT_EQ("float-", array.name);
+    EXPECT_EQ((std::vector<std::string>{"swap2", "swap4"}), array.conversions);
+    EXPECT_EQ("short", dataTypeText(" short ").name);
     EXPECT_TRUE(dataTypeText("short").conversions.empty());
-    EXPECT_EQ(dataTypeText("short()").conversions, (std::vector<std::string>{""}));
+    EXPECT_EQ((std::vector<std::string>{""}), dataTypeText("short()").conversions);
 }
 
 }  // namespace

@@ -30,10 +30,10 @@ TEST(TagRefusal, PointsAtTheFieldWithASuggestion) {
         surroundingsOf("CfgVer=1 defNodeId=1 Node2::model=3", sampleDescription());
     for (const Case& each : cases) {
         const Finding finding = tagRefusal(tagLine(each.uri, "t", 1, 1), around, "no");
-        EXPECT_EQ(finding.severity, Severity::Error) << each.uri;
-        EXPECT_EQ(finding.message, "no") << each.uri;
-        EXPECT_EQ(finding.place.column, each.column) << each.uri;
-        EXPECT_EQ(finding.suggestion, each.suggestion) << each.uri;
+        EXPECT_EQ(Severity::Error, finding.severity) << each.uri;
+        EXPECT_EQ("no", finding.message) << each.uri;
+        EXPECT_EQ(each.column, finding.place.column) << each.uri;
+        EXPECT_EQ(each.suggestion, finding.suggestion) << each.uri;
     }
 }
 
