@@ -13,32 +13,32 @@ using settings_test::kDocument;
 
 TEST(Description, FactsAreTheElementsThatHoldATextAlone) {
     const Description description = parseDescription(kDocument);
-    EXPECT_EQ(description.facts.size(), 3U);
-    EXPECT_EQ(description.fact("display"), "A demonstration");
-    EXPECT_EQ(description.fact("empty"), "");
-    EXPECT_EQ(description.fact("nothing"), "");
+    EXPECT_EQ(3U, description.facts.size());
+    EXPECT_EQ("A demonstration", description.fact("display"));
+    EXPECT_EQ("", description.fact("empty"));
+    EXPECT_EQ("", description.fact("nothing"));
 }
 
 TEST(Description, ParametersHaveWhatTheirElementsSay) {
     const Description description = parseDescription(kDocument);
     const ParameterInfo* pause = description.parameter("pause");
     ASSERT_NE(pause, nullptr);
-    EXPECT_EQ(pause->display, "Pause");
-    EXPECT_EQ(pause->preset, "5");
-    EXPECT_EQ(pause->defaultValue, "6");
+    EXPECT_EQ("Pause", pause->display);
+    EXPECT_EQ("5", pause->preset);
+    EXPECT_EQ("6", pause->defaultValue);
     EXPECT_TRUE(pause->ofNode);
     EXPECT_FALSE(pause->mandatory);
-    EXPECT_EQ(pause->min, 1);
-    EXPECT_EQ(pause->max, 9);
+    EXPECT_EQ(1, pause->min);
+    EXPECT_EQ(9, pause->max);
     EXPECT_TRUE(pause->isNumber());
-    EXPECT_EQ(description.parameter("Pause"), nullptr) << "names are exact";
+    EXPECT_EQ(nullptr, description.parameter("Pause")) << "names are exact";
 }
 
 TEST(Description, KeyOfAListIsFoundInFrontOfItsChoices) {
     const Description description = parseDescription(kDocument);
     const ParameterInfo* frames = description.parameter("frames");
     ASSERT_NE(frames, nullptr);
-    EXPECT_EQ(frames->choices, (std::vector<std::string>{"short", "long"}));
+    EXPECT_EQ((std::vector<std::string>{"short", "long"}), frames->choices);
     EXPECT_FALSE(frames->isNumber());
     EXPECT_FALSE(frames->defaultValue.has_value());
 }
@@ -47,25 +47,25 @@ TEST(Description, DisablingEntryIsResolvedToItsValue) {
     const Description description = parseDescription(kDocument);
     const ParameterInfo* size = description.parameter("size");
     ASSERT_NE(size, nullptr);
-    EXPECT_EQ(size->disabledBy, "frames");
-    EXPECT_EQ(size->disablingValue, "long");
+    EXPECT_EQ("frames", size->disabledBy);
+    EXPECT_EQ("long", size->disablingValue);
 }
 
 TEST(Description, AreasModelsAndConversionsHaveWhatTheirElementsSay) {
     const Description description = parseDescription(kDocument);
     const AreaInfo* area = description.area("W");
     ASSERT_NE(area, nullptr);
-    EXPECT_EQ(area->types, 0x21U);
-    EXPECT_EQ(area->naturalType, "unsignedShort");
+    EXPECT_EQ(0x21U, area->types);
+    EXPECT_EQ("unsignedShort", area->naturalType);
     EXPECT_TRUE(area->bitWrite);
-    EXPECT_EQ(area->readCount, 10);
-    EXPECT_EQ(area->max, 99);
+    EXPECT_EQ(10, area->readCount);
+    EXPECT_EQ(99, area->max);
     const ModelInfo* model = description.model("A");
     ASSERT_NE(model, nullptr);
-    ASSERT_EQ(model->offers.size(), 1U);
-    EXPECT_EQ(model->offers[0].max, 98);
+    ASSERT_EQ(1U, model->offers.size());
+    EXPECT_EQ(98, model->offers[0].max);
     ASSERT_NE(description.conversion("swap"), nullptr);
-    EXPECT_EQ(description.conversion("swap")->display, "AB->BA");
+    EXPECT_EQ("AB->BA", description.conversion("swap")->display);
 }
 
 TEST(Description, MalformedAndForeignDocumentsAreRefused) {

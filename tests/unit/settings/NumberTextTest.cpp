@@ -32,17 +32,17 @@ TEST(NumberText, IsReadWithTheBaseOfItsPrefix) {
     };
     for (const Case& each : cases) {
         const NumberReading number = readNumber(each.text);
-        EXPECT_EQ(number.value, each.value) << each.text;
-        EXPECT_EQ(number.octal, each.octal) << each.text;
-        EXPECT_EQ(number.partial, each.partial) << each.text;
+        EXPECT_EQ(each.value, number.value) << each.text;
+        EXPECT_EQ(each.octal, number.octal) << each.text;
+        EXPECT_EQ(each.partial, number.partial) << each.text;
     }
 }
 
 TEST(NumberText, LosesItsLeadingZeroes) {
-    EXPECT_EQ(withoutLeadingZeroes("0100"), "100");
-    EXPECT_EQ(withoutLeadingZeroes("00"), "0");
-    EXPECT_EQ(withoutLeadingZeroes("7"), "7");
-    EXPECT_EQ(withoutLeadingZeroes("0.5"), "0.5");
+    EXPECT_EQ("100", withoutLeadingZeroes("0100"));
+    EXPECT_EQ("0", withoutLeadingZeroes("00"));
+    EXPECT_EQ("7", withoutLeadingZeroes("7"));
+    EXPECT_EQ("0.5", withoutLeadingZeroes("0.5"));
 }
 
 }  // namespace
