@@ -39,13 +39,13 @@ const Row kRows[] = {
 TEST(JsonValues, HaveTheTagsType) {
     for (const Row& row : kRows) {
         const Bytes bytes = values::parseValue(row.shape, row.value);
-        EXPECT_EQ(values::jsonValue(row.shape, bytes).dump(), row.json) << row.value;
+        EXPECT_EQ(row.json, values::jsonValue(row.shape, bytes).dump()) << row.value;
     }
 }
 
 TEST(JsonValues, TextInUtf8StaysText) {
     const auto json = values::jsonValue({string, 8}, values_test::bytesOf("K\xc3\xbch\0\0\0\0"));
-    EXPECT_EQ(json.get<std::string>(), "K\xc3\xbch");
+    EXPECT_EQ("K\xc3\xbch", json.get<std::string>());
 }
 
 }  // namespace

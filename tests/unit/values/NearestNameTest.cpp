@@ -22,20 +22,20 @@ TEST(NearestName, DistanceCountsEdits) {
         {"kitten", "sitting", 3},
     };
     for (const Case& each : cases) {
-        EXPECT_EQ(editDistance(each.a, each.b), each.distance) << each.a << ' ' << each.b;
-        EXPECT_EQ(editDistance(each.b, each.a), each.distance) << each.b << ' ' << each.a;
+        EXPECT_EQ(each.distance, editDistance(each.a, each.b)) << each.a << ' ' << each.b;
+        EXPECT_EQ(each.distance, editDistance(each.b, each.a)) << each.b << ' ' << each.a;
     }
 }
 
 TEST(NearestName, IsTheFirstOfTheNearest) {
-    EXPECT_EQ(nearestName("timout", {"delay", "timeout", "timeouts"}), "timeout");
-    EXPECT_EQ(nearestName("ab", {"xb", "ax"}), "xb");
+    EXPECT_EQ("timeout", nearestName("timout", {"delay", "timeout", "timeouts"}));
+    EXPECT_EQ("xb", nearestName("ab", {"xb", "ax"}));
 }
 
 TEST(NearestName, IsEmptyWhereNothingIsNear) {
-    EXPECT_EQ(nearestName("weather", {"timeout", "delay"}), "");
-    EXPECT_EQ(nearestName("xy", {"ab", "1"}), "") << "every character would change";
-    EXPECT_EQ(nearestName("x", {}), "");
+    EXPECT_EQ("", nearestName("weather", {"timeout", "delay"}));
+    EXPECT_EQ("", nearestName("xy", {"ab", "1"})) << "every character would change";
+    EXPECT_EQ("", nearestName("x", {}));
 }
 
 }  // namespace

@@ -96,7 +96,7 @@ const Refused kRefused[] = {
 
 TEST(RefusedValues, AreNamedTogetherWithWhatWouldDo) {
     for (const Refused& row : kRefused) {
-        EXPECT_EQ(refusal(row.shape, row.text), row.complaint)
+        EXPECT_EQ(row.complaint, refusal(row.shape, row.text))
             << values::typeName(row.shape) << ": " << row.text;
     }
 }
@@ -111,7 +111,7 @@ TEST(RefusedValues, OneTooManyIsRefusedForEveryWholeNumber) {
             "0x" + std::string(1, "1248"[bits % 4]) + std::string(bits / 4, '0');
         const ValueShape shape{row.type, row.bytes};
         EXPECT_NE(refusal(shape, limit), "accepted") << row.name << ' ' << limit;
-        EXPECT_EQ(refusal(shape, "-" + limit) == "accepted", isSigned) << row.name << " -" << limit;
+        EXPECT_EQ(isSigned, refusal(shape, "-" + limit) == "accepted") << row.name << " -" << limit;
     }
 }
 

@@ -39,13 +39,13 @@ constexpr Row kRows[] = {
 
 TEST(TextEscapes, KeepPrintableTextAndHideTheRest) {
     for (const Row& row : kRows)
-        EXPECT_EQ(escapeText(bytesOf(row.bytes)), row.text);
+        EXPECT_EQ(row.text, escapeText(bytesOf(row.bytes)));
 }
 
 TEST(TextEscapes, AreUndone) {
     for (const Row& row : kRows) {
-        EXPECT_EQ(unescapeText(row.text), bytesOf(row.bytes)) << row.text;
-        EXPECT_EQ(unescapeText('"' + std::string(row.text) + '"'), bytesOf(row.bytes)) << row.text;
+        EXPECT_EQ(bytesOf(row.bytes), unescapeText(row.text)) << row.text;
+        EXPECT_EQ(bytesOf(row.bytes), unescapeText('"' + std::string(row.text) + '"')) << row.text;
     }
 }
 
@@ -57,11 +57,11 @@ TEST(TextEscapes, PrintableTextKeepsQuotesAndBackslashes) {
 }
 
 TEST(TextEscapes, QuotesInsideAnUnquotedTextStandForThemselves) {
-    EXPECT_EQ(unescapeText("a\"b\""), bytesOf("a\"b\""));
+    EXPECT_EQ(bytesOf("a\"b\""), unescapeText("a\"b\""));
 }
 
 TEST(TextEscapes, HexadecimalDigitsMayBeUpperCase) {
-    EXPECT_EQ(unescapeText("\\xAf"), bytesOf("\xaf"));
+    EXPECT_EQ(bytesOf("\xaf"), unescapeText("\\xAf"));
 }
 
 }  // namespace

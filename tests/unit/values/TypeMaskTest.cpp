@@ -6,10 +6,10 @@ namespace values {
 namespace {
 
 TEST(TypeMask, MasksAreSpelledOutOrByWhatTheyLack) {
-    EXPECT_EQ(typesText(0x1001), "boolean, boolean-");
-    EXPECT_EQ(typesText(0x3dff7ff), "all but time, time-, object");
-    EXPECT_EQ(typesText(0x7ffffff), "all");
-    EXPECT_EQ(typesText(0), "");
+    EXPECT_EQ("boolean, boolean-", typesText(0x1001));
+    EXPECT_EQ("all but time, time-, object", typesText(0x3dff7ff));
+    EXPECT_EQ("all", typesText(0x7ffffff));
+    EXPECT_EQ("", typesText(0));
 }
 
 TEST(TypeMask, ANameHasTheBitBelowItsTypesCode) {

@@ -102,14 +102,14 @@ const Accepted kAccepted[] = {
 TEST(Values, AreReadByTheTagsType) {
     for (const Accepted& row : kAccepted) {
         SCOPED_TRACE(values::typeName(row.shape) + ": " + std::string(row.text));
-        EXPECT_EQ(parseValue(row.shape, row.text), row.bytes);
+        EXPECT_EQ(row.bytes, parseValue(row.shape, row.text));
     }
 }
 
 TEST(Values, ArePrintedInOneForm) {
     for (const Accepted& row : kAccepted) {
         const std::string_view expected = row.printed.empty() ? row.text : row.printed;
-        EXPECT_EQ(formatValue(row.shape, row.bytes), expected) << values::typeName(row.shape);
+        EXPECT_EQ(expected, formatValue(row.shape, row.bytes)) << values::typeName(row.shape);
     }
 }
 
@@ -130,7 +130,7 @@ bool countsBits(ICU_Type type) {
 
 TEST(Values, ReadBackExactlyWhateverTheirBits) {
     std::mt19937 random(20240501);
-    ASSERT_EQ(writableShapes().size(), 24U);
+    ASSERT_EQ(24U, writableShapes().size());
     for (const ValueShape shape : writableShapes()) {
         for (int round = 0; round < 2000; ++round) {
             Bytes bytes(shape.bytes);
@@ -138,7 +138,7 @@ TEST(Values, ReadBackExactlyWhateverTheirBits) {
                 b = static_cast<std::uint8_t>(random() & (countsBits(shape.type) ? 1 : 255));
             }
             const std::string text = formatValue(shape, bytes);
-            ASSERT_EQ(parseValue(shape, text), bytes) << values::typeName(shape) << ": " << text;
+            ASSERT_EQ(bytes, parseValue(shape, text)) << values::typeName(shape) << ": " << text;
         }
     }
 }
@@ -150,35 +150,35 @@ TEST(Values, EveryKindOfFloatReadsBackExactly) {
             Bytes bytes;
             values::appendLittleEndian(bytes, top << 23 | low, 4);
             const std::string text = formatValue({float_, 4}, bytes);
-            ASSERT_EQ(parseValue({float_, 4}, text), bytes) << text;
+            ASSERT_EQ(bytes, parseValue({float_, 4}, text)) << text;
         }
     }
 }
 
 TEST(Values, WholeNumberRangesEndWhereTheTypesEnd) {
     const auto range = [](ICU_Type type) { return values::rangeText(values::rowOf(type)); };
-    EXPECT_EQ(range(byte), "-128..127");
-    EXPECT_EQ(range(short_), "-32768..32767");
-    EXPECT_EQ(range(int_), "-2147483648..2147483647");
-    EXPECT_EQ(range(int64), "-9223372036854775808..9223372036854775807");
-    EXPECT_EQ(range(unsignedByte), "0..255");
-    EXPECT_EQ(range(unsignedShort), "0..65535");
-    EXPECT_EQ(range(unsignedInt), "0..4294967295");
-    EXPECT_EQ(range(uint64), "0..18446744073709551615");
+    EXPECT_EQ("-128..127", range(byte));
+    EXPECT_EQ("-32768..32767", range(short_));
+    EXPECT_EQ("-2147483648..2147483647", range(int_));
+    EXPECT_EQ("-9223372036854775808..9223372036854775807", range(int64));
+    EXPECT_EQ("0..255", range(unsignedByte));
+    EXPECT_EQ("0..65535", range(unsignedShort));
+    EXPECT_EQ("0..4294967295", range(unsignedInt));
+    EXPECT_EQ("0..18446744073709551615", range(uint64));
 }
 
 TEST(Values, TypesWithoutATextFormAreShownAsBytes) {
-    EXPECT_EQ(formatValue({time, 10}, Bytes{1, 2, 3, 4, 5, 6, 7, 8, 9, 10}),
-              "0x0102030405060708090a");
-    EXPECT_EQ(formatValue({object, 0}, Bytes{}), "0x");
+    EXPECT_EQ("0x0102030405060708090a",
+              formatValue({time, 10}, Bytes{1, 2, 3, 4, 5, 6, 7, 8, 9, 10}));
+    EXPECT_EQ("0x", formatValue({object, 0}, Bytes{}));
 }
 
 TEST(Values, TypesAreNamedAsUrisNameThem) {
-    EXPECT_EQ(values::typeName({int_, 4}), "int");
-    EXPECT_EQ(values::typeName({intArray, 40}), "int-10");
-    EXPECT_EQ(values::typeName({string, 20}), "string-20");
-    EXPECT_EQ(values::typeName({booleanArray, 16}), "boolean-16");
-    EXPECT_EQ(values::typeName({int64Array, 16}), "int64-2");
+    EXPECT_EQ("int", values::typeName({int_, 4}));
+    EXPECT_EQ("int-10", values::typeName({intArray, 40}));
+    EXPECT_EQ("string-20", values::typeName({string, 20}));
+    EXPECT_EQ("boolean-16", values::typeName({booleanArray, 16}));
+    EXPECT_EQ("int64-2", values::typeName({int64Array, 16}));
 }
 
 }  // namespace
