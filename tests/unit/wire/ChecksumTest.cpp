@@ -13,15 +13,15 @@ Bytes bytesOf(std::string_view text) {
 }
 
 TEST(CrcTest, CheckValueIsTheCataloguedOne) {
-    EXPECT_EQ(crc16(bytesOf("123456789")), 0x4B37);
+    EXPECT_EQ(0x4B37, crc16(bytesOf("123456789")));
 }
 
 TEST(CrcTest, StandardsExampleOfFunctionSevenAtNodeTwo) {
-    EXPECT_EQ(crc16(Bytes{0x02, 0x07}), 0x1241);
+    EXPECT_EQ(0x1241, crc16(Bytes{0x02, 0x07}));
 }
 
 TEST(CrcTest, NothingGivesTheStartValue) {
-    EXPECT_EQ(crc16({}), 0xFFFF);
+    EXPECT_EQ(0xFFFF, crc16({}));
 }
 
 TEST(CrcTest, EverySingleBitErrorChangesIt) {
@@ -34,7 +34,7 @@ TEST(CrcTest, EverySingleBitErrorChangesIt) {
 }
 
 TEST(LrcTest, KnownRequest) {
-    EXPECT_EQ(lrc8(Bytes{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03}), 0x7E);
+    EXPECT_EQ(0x7E, lrc8(Bytes{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03}));
 }
 
 TEST(LrcTest, SumWithTheBytesIsZero) {
@@ -42,11 +42,11 @@ TEST(LrcTest, SumWithTheBytesIsZero) {
     std::uint32_t sum = lrc8(bytes);
     for (const std::uint8_t byte : bytes)
         sum += byte;
-    EXPECT_EQ(sum % 256, 0U);
+    EXPECT_EQ(0U, sum % 256);
 }
 
 TEST(LrcTest, NothingGivesZero) {
-    EXPECT_EQ(lrc8({}), 0);
+    EXPECT_EQ(0, lrc8({}));
 }
 
 }  // namespace

@@ -29,29 +29,29 @@ std::optional<std::size_t> unknownLength(ByteView) {
 }
 
 TEST(EncodeFrameTest, RtuCarriesTheLowByteOfTheCrcFirst) {
-    EXPECT_EQ(encodeFrame(Mode::rtu, kReadRequest), kReadRequestRtu);
+    EXPECT_EQ(kReadRequestRtu, encodeFrame(Mode::rtu, kReadRequest));
 }
 
 TEST(EncodeFrameTest, AsciiCarriesUpperCaseDigitsAndCrLf) {
-    EXPECT_EQ(textOf(encodeFrame(Mode::ascii, kReadRequest)), kReadRequestAscii);
+    EXPECT_EQ(kReadRequestAscii, textOf(encodeFrame(Mode::ascii, kReadRequest)));
 }
 
 TEST(EncodeFrameTest, BrokenCheckDiffersInAllItsBitsOnly) {
     const Bytes rtu{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03, 0x89, 0x78};
-    EXPECT_EQ(encodeFrame(Mode::rtu, kReadRequest, true), rtu);
-    EXPECT_EQ(textOf(encodeFrame(Mode::ascii, kReadRequest, true)), ":1103006B000381\r\n");
+    EXPECT_EQ(rtu, encodeFrame(Mode::rtu, kReadRequest, true));
+    EXPECT_EQ(":1103006B000381\r\n", textOf(encodeFrame(Mode::ascii, kReadRequest, true)));
 }
 
 TEST(DecodeFrameTest, GoodFramesGiveTheMessage) {
-    EXPECT_EQ(decodeFrame(Mode::rtu, kReadRequestRtu).message, kReadRequest);
-    EXPECT_EQ(decodeFrame(Mode::ascii, bytesOf(kReadRequestAscii)).message, kReadRequest);
+    EXPECT_EQ(kReadRequest, decodeFrame(Mode::rtu, kReadRequestRtu).message);
+    EXPECT_EQ(kReadRequest, decodeFrame(Mode::ascii, bytesOf(kReadRequestAscii)).message);
 }
 
 TEST(DecodeFrameTest, EveryTruncationIsDamagedAndKeepsItsBytes) {
     for (std::size_t length = 0; length < kReadRequestRtu.size(); ++length) {
         const auto frame = decodeFrame(Mode::rtu, ByteView(kReadRequestRtu).first(length));
         EXPECT_TRUE(frame.damaged()) << length;
-        EXPECT_EQ(frame.raw.size(), length);
+        EXPECT_EQ(length, frame.raw.size());
     }
     const Bytes ascii = bytesOf(kReadRequestAscii);
     for (std::size_t length = 0; length < ascii.size(); ++length) {
@@ -86,8 +86,8 @@ TEST(DecodeFrameTest, AsciiFrameOf254BytesIsTheLongest) {
 TEST(RtuSplitterTest, AnnouncedLengthEndsAFrameAtOnce) {
     FrameSplitter splitter(Mode::rtu, eightBytes);
     const auto frames = splitter.add(kReadRequestRtu);
-    ASSERT_EQ(frames.size(), 1U);
-    EXPECT_EQ(frames[0].message, kReadRequest);
+    ASSERT_EQ(1U, frames.size());
+    EXPECT_EQ(kReadRequest, frames[0].message);
     EXPECT_FALSE(splitter.waitsForSilence());
 }
 
@@ -96,7 +96,7 @@ TEST(RtuSplitterTest, BytesMayArriveOneByOne) {
     for (std::size_t i = 0; i + 1 < kReadRequestRtu.size(); ++i) {
         EXPECT_TRUE(splitter.add(ByteView(kReadRequestRtu).subspan(i, 1)).empty()) << i;
     }
-    EXPECT_EQ(splitter.add(ByteView(kReadRequestRtu).last(1)).size(), 1U);
+    EXPECT_EQ(1U, splitter.add(ByteView(kReadRequestRtu).last(1)).size());
 }
 
 TEST(RtuSplitterTest, FramesMayFollowOneAnotherInOneRead) {
@@ -104,7 +104,7 @@ TEST(RtuSplitterTest, FramesMayFollowOneAnotherInOneRead) {
     Bytes twice = kReadRequestRtu;
     twice.insert(twice.end(), kReadRequestRtu.begin(), kReadRequestRtu.end());
     twice.push_back(0x11);
-    EXPECT_EQ(splitter.add(twice).size(), 2U);
+    EXPECT_EQ(2U, splitter.add(twice).size());
     EXPECT_TRUE(splitter.waitsForSilence());
 }
 
@@ -113,7 +113,7 @@ TEST(RtuSplitterTest, UnknownLengthEndsAtSilence) {
     EXPECT_TRUE(splitter.add(kReadRequestRtu).empty());
     const auto frame = splitter.silence();
     ASSERT_TRUE(frame);
-    EXPECT_EQ(frame->message, kReadRequest);
+    EXPECT_EQ(kReadRequest, frame->message);
     EXPECT_FALSE(splitter.silence());
 }
 
@@ -126,8 +126,8 @@ TEST(RtuSplitterTest, WrongCrcWaitsForSilenceAndTakesAllWithIt) {
     const auto frame = splitter.silence();
     ASSERT_TRUE(frame);
     EXPECT_TRUE(frame->damaged());
-    EXPECT_EQ(frame->raw.size(), 16U);
-    EXPECT_EQ(splitter.add(kReadRequestRtu).size(), 1U);
+    EXPECT_EQ(16U, frame->raw.size());
+    EXPECT_EQ(1U, splitter.add(kReadRequestRtu).size());
 }
 
 TEST(RtuSplitterTest, EndlessBytesStayBounded) {
@@ -137,15 +137,15 @@ TEST(RtuSplitterTest, EndlessBytesStayBounded) {
     const auto frame = splitter.silence();
     ASSERT_TRUE(frame);
     EXPECT_TRUE(frame->damaged());
-    EXPECT_EQ(frame->raw.size(), kMaxRtuFrame + 1);
+    EXPECT_EQ(kMaxRtuFrame + 1, frame->raw.size());
 }
 
 TEST(AsciiSplitterTest, FrameBeginsAtTheLastColonAndEndsAtCrLf) {
     FrameSplitter splitter(Mode::ascii, unknownLength);
     const auto frames = splitter.add(bytesOf("noise\r\n:1103:1103006B00037E\r\n:11"));
-    ASSERT_EQ(frames.size(), 1U);
-    EXPECT_EQ(frames[0].message, kReadRequest);
-    EXPECT_EQ(textOf(frames[0].raw), kReadRequestAscii);
+    ASSERT_EQ(1U, frames.size());
+    EXPECT_EQ(kReadRequest, frames[0].message);
+    EXPECT_EQ(kReadRequestAscii, textOf(frames[0].raw));
 }
 
 TEST(AsciiSplitterTest, SilenceDoesNotEndAFrame) {
@@ -153,13 +153,13 @@ TEST(AsciiSplitterTest, SilenceDoesNotEndAFrame) {
     EXPECT_TRUE(splitter.add(bytesOf(":1103006B0")).empty());
     EXPECT_FALSE(splitter.waitsForSilence());
     EXPECT_FALSE(splitter.silence());
-    EXPECT_EQ(splitter.add(bytesOf("0037E\r\n")).size(), 1U);
+    EXPECT_EQ(1U, splitter.add(bytesOf("0037E\r\n")).size());
 }
 
 TEST(AsciiSplitterTest, WrongLrcIsReportedAndTheNextFrameIsFound) {
     FrameSplitter splitter(Mode::ascii, unknownLength);
     const auto frames = splitter.add(bytesOf(":1103006B000300\r\n:1103006B00037E\r\n"));
-    ASSERT_EQ(frames.size(), 2U);
+    ASSERT_EQ(2U, frames.size());
     EXPECT_TRUE(frames[0].damaged());
     EXPECT_FALSE(frames[1].damaged());
 }
@@ -167,9 +167,9 @@ TEST(AsciiSplitterTest, WrongLrcIsReportedAndTheNextFrameIsFound) {
 TEST(AsciiSplitterTest, EndlessFrameIsGivenUpAsDamaged) {
     FrameSplitter splitter(Mode::ascii, unknownLength);
     const auto frames = splitter.add(bytesOf(":" + std::string(2000, '0')));
-    ASSERT_EQ(frames.size(), 1U);
+    ASSERT_EQ(1U, frames.size());
     EXPECT_TRUE(frames[0].damaged());
-    EXPECT_EQ(frames[0].raw.size(), kMaxAsciiFrame + 1);
+    EXPECT_EQ(kMaxAsciiFrame + 1, frames[0].raw.size());
 }
 
 }  // namespace
