@@ -63,27 +63,28 @@ class CheckCommand : public testing::Test {
 TEST_F(CheckCommand, CleanConfigurationAndTagsAreClean) {
     const Outcome outcome =
         check(kGood, {"--strict", "1?HREG?400001?unsignedShort", "1?OUTP?1?boolean-8"});
-    EXPECT_EQ(outcome.code, 0);
-    EXPECT_EQ(outcome.out, "0 errors, 0 warnings (2 tags checked)\n");
+    EXPECT_EQ(0, outcome.code);
+    EXPECT_EQ("0 errors, 0 warnings (2 tags checked)\n", outcome.out);
 }
 
 TEST_F(CheckCommand, ByteOrdersMayBeNamed) {
     const Outcome good =
         check(kGood, {"--strict", "1?HREG?400001?float@ABCD", "1?HREG?400003?double@GHEFCDAB",
                       "1?HREG?400007?string-8@AB"});
-    EXPECT_EQ(good.code, 0) << good.out;
+    EXPECT_EQ(0, good.code) << good.out;
     const Outcome wrong = check(kGood, {"1?HREG?400001?float@ABDC"});
-    EXPECT_EQ(wrong.code, 2);
-    EXPECT_EQ(wrong.out,
-              "argument:1:15: error: 'ABDC' is no byte order of float: ABCD, CDAB, DCBA, BADC "
-              "[refused]\n1 error, 0 warnings (1 tag checked)\n");
+    EXPECT_EQ(2, wrong.code);
+    EXPECT_EQ(
+        "argument:1:15: error: 'ABDC' is no byte order of float: ABCD, CDAB, DCBA, BADC "
+        "[refused]\n1 error, 0 warnings (1 tag checked)\n",
+        wrong.out);
 }
 
 TEST_F(CheckCommand, WarningsCountOnlyWhenStrict) {
     const std::string config = kGood + "timout=1";
-    EXPECT_EQ(check(config, {}).code, 0);
+    EXPECT_EQ(0, check(config, {}).code);
     const Outcome strict = check(config, {"--strict"});
-    EXPECT_EQ(strict.code, 1);
+    EXPECT_EQ(1, strict.code);
     EXPECT_NE(strict.out.find("line.cfg:3:1: warning: unknown key 'timout' [unknown-key]\n"
                               "    did you mean 'timeout'?\n"),
               std::string::npos)
@@ -92,7 +93,7 @@ TEST_F(CheckCommand, WarningsCountOnlyWhenStrict) {
 
 TEST_F(CheckCommand, RefusedConfigurationIsAnErrorAndLeavesTagsUnchecked) {
     const Outcome outcome = check("CfgVer=1 defNodeId=1", {"1?HREG?x?y"});
-    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(2, outcome.code);
     EXPECT_NE(outcome.out.find("line.cfg:1:21: error: Parser: parameter 'uart' is not found"),
               std::string::npos)
         << outcome.out;
@@ -101,14 +102,14 @@ TEST_F(CheckCommand, RefusedConfigurationIsAnErrorAndLeavesTagsUnchecked) {
 
 TEST_F(CheckCommand, RefusedTagIsAnErrorWithTheDriversWords) {
     const Outcome outcome = check(kGood, {"1?INP?100001?unsignedShort"});
-    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(2, outcome.code);
     EXPECT_NE(outcome.out.find("argument:1:14: error: "), std::string::npos) << outcome.out;
     EXPECT_NE(outcome.out.find("not allowed icom type"), std::string::npos) << outcome.out;
 }
 
 TEST_F(CheckCommand, EveryListedSilenceIsFound) {
-    EXPECT_EQ(rules(kGood + "bits=8 repeat=1 repeat=2 model=x timout=5", {}),
-              "ignored-key duplicate-key unknown-model unknown-key ");
+    EXPECT_EQ("ignored-key duplicate-key unknown-model unknown-key ",
+              rules(kGood + "bits=8 repeat=1 repeat=2 model=x timout=5", {}));
     struct Case {
         std::vector<std::string> uris;
         const char* rules;
@@ -124,7 +125,7 @@ TEST_F(CheckCommand, EveryListedSilenceIsFound) {
         {{"1?OUTP?1?boolean-16", "1?OUTP?3?boolean"}, ""},
     };
     for (const Case& each : cases) {
-        EXPECT_EQ(rules(kGood, each.uris), each.rules) << each.uris.front();
+        EXPECT_EQ(each.rules, rules(kGood, each.uris)) << each.uris.front();
     }
 }
 
@@ -181,20 +182,20 @@ TEST_F(CheckCommand, ControlCharactersOfTheFilesStayOffTheTerminal) {
 }
 
 TEST_F(CheckCommand, ZeroBasedModelsShareTheirFiveDigitForms) {
-    EXPECT_EQ(rules(kGood + "model=2", {"1?HREG?40010?short", "1?HREG?400010?float"}),
-              "short-address overlap ");
+    EXPECT_EQ("short-address overlap ",
+              rules(kGood + "model=2", {"1?HREG?40010?short", "1?HREG?400010?float"}));
 }
 
 TEST_F(CheckCommand, WideRegistersOfTheEnronModelsAreTakenByTheirWidth) {
-    EXPECT_EQ(rules(kGood + "model=3", {"1?LONG?0?int", "1?LONG?1?float"}), "");
-    EXPECT_EQ(rules(kGood + "model=3", {"1?LONG?0?int-2", "1?LONG?1?float"}), "overlap ");
+    EXPECT_EQ("", rules(kGood + "model=3", {"1?LONG?0?int", "1?LONG?1?float"}));
+    EXPECT_EQ("overlap ", rules(kGood + "model=3", {"1?LONG?0?int-2", "1?LONG?1?float"}));
 }
 
 TEST_F(CheckCommand, TagsMayComeFromAFile) {
     const std::string tags =
         store("tags", "# two\n1?HREG?400001?short\n\n1?HREG?400001?float # b\n");
     const Outcome outcome = check(kGood, {"--tags", tags});
-    EXPECT_EQ(outcome.code, 0);
+    EXPECT_EQ(0, outcome.code);
     EXPECT_NE(outcome.out.find("tags:4:8: warning: overlaps '1?HREG?400001?short'"),
               std::string::npos)
         << outcome.out;
@@ -227,23 +228,23 @@ TEST_F(CheckCommand, DocumentationShowsTheRealOutput) {
 
 TEST_F(CheckCommand, JsonCountsWhatItLists) {
     const Outcome outcome = check(kGood + "timout=1", {"--json", "1?HREG?1?short"});
-    EXPECT_EQ(outcome.code, 2);
+    EXPECT_EQ(2, outcome.code);
     const Json json = Json::parse(outcome.out);
-    EXPECT_EQ(json["errors"], 1);
-    EXPECT_EQ(json["warnings"], 1);
-    EXPECT_EQ(json["tagsChecked"], 1);
-    EXPECT_EQ(json["findings"].size(), 2U);
+    EXPECT_EQ(1, json["errors"]);
+    EXPECT_EQ(1, json["warnings"]);
+    EXPECT_EQ(1, json["tagsChecked"]);
+    EXPECT_EQ(2U, json["findings"].size());
 }
 
 TEST_F(CheckCommand, JsonSurvivesBytesThatAreNoText) {
     const Outcome outcome = check(kGood + "\xff\xfe=1", {"--json"});
-    EXPECT_EQ(outcome.code, 0);
-    EXPECT_EQ(Json::parse(outcome.out)["warnings"], 1);
+    EXPECT_EQ(0, outcome.code);
+    EXPECT_EQ(1, Json::parse(outcome.out)["warnings"]);
 }
 
 TEST_F(CheckCommand, UnreadableFilesAreWrongUsage) {
-    EXPECT_EQ(check(kGood, {"--tags", "/nowhere/tags"}).code, 2);
-    EXPECT_EQ(check(kGood, {"--tags", "/"}).code, 2);
+    EXPECT_EQ(2, check(kGood, {"--tags", "/nowhere/tags"}).code);
+    EXPECT_EQ(2, check(kGood, {"--tags", "/"}).code);
 }
 
 TEST_F(CheckCommand, WhatReadRefusesIsRefused) {
@@ -270,7 +271,7 @@ TEST_F(CheckCommand, TagsFileIsReadWithTheSameCare) {
 }
 
 TEST_F(CheckCommand, FileAndArgumentsExcludeEachOther) {
-    EXPECT_EQ(check(kGood, {"--tags", "x", "1?HREG?400001?short"}).code, 2);
+    EXPECT_EQ(2, check(kGood, {"--tags", "x", "1?HREG?400001?short"}).code);
 }
 
 }  // namespace

@@ -14,19 +14,19 @@ Finding finding(Severity severity, const char* source, int line, int column) {
 }
 
 TEST(FindingText, TextNamesPlaceSeverityAndRule) {
-    EXPECT_EQ(findingsText({finding(Severity::Warning, "a.cfg", 2, 5)}),
-              "a.cfg:2:5: warning: message [rule]\n    advice\n");
+    EXPECT_EQ("a.cfg:2:5: warning: message [rule]\n    advice\n",
+              findingsText({finding(Severity::Warning, "a.cfg", 2, 5)}));
     Finding without = finding(Severity::Error, "a.cfg", 1, 1);
     without.suggestion.clear();
-    EXPECT_EQ(findingsText({without}), "a.cfg:1:1: error: message [rule]\n");
-    EXPECT_EQ(findingsText({}), "");
+    EXPECT_EQ("a.cfg:1:1: error: message [rule]\n", findingsText({without}));
+    EXPECT_EQ("", findingsText({}));
 }
 
 TEST(FindingText, JsonHasEveryMember) {
-    EXPECT_EQ(findingsJson({finding(Severity::Error, "a", 2, 5)}).dump(),
-              R"([{"severity":"error","rule":"rule","source":"a","line":2,"column":5,)"
-              R"("message":"message","suggestion":"advice"}])");
-    EXPECT_EQ(findingsJson({}).dump(), "[]");
+    EXPECT_EQ(R"([{"severity":"error","rule":"rule","source":"a","line":2,"column":5,)"
+              R"("message":"message","suggestion":"advice"}])",
+              findingsJson({finding(Severity::Error, "a", 2, 5)}).dump());
+    EXPECT_EQ("[]", findingsJson({}).dump());
 }
 
 TEST(FindingText, VerdictFollowsErrorsAndStrictness) {
@@ -42,7 +42,7 @@ TEST(FindingText, VerdictFollowsErrorsAndStrictness) {
     const Case cases[] = {{none, false, 0},   {none, true, 0},   {warning, false, 0},
                           {warning, true, 1}, {error, false, 2}, {error, true, 2}};
     for (const Case& each : cases) {
-        EXPECT_EQ(static_cast<int>(verdictOf(each.findings, each.strict)), each.code)
+        EXPECT_EQ(each.code, static_cast<int>(verdictOf(each.findings, each.strict)))
             << each.findings.size() << " findings, strict " << each.strict;
     }
 }

@@ -48,16 +48,16 @@ TEST(DescribeCommand, XmlIsTheDocumentByteForByte) {
     const std::string document = contentsOf(SOURCE_FOLDER "/description/mrtu.xml");
     ASSERT_FALSE(document.empty());
     const Outcome outcome = describe({"--xml"});
-    EXPECT_EQ(outcome.code, 0);
-    EXPECT_EQ(outcome.out, document);
+    EXPECT_EQ(0, outcome.code);
+    EXPECT_EQ(document, outcome.out);
 }
 
 TEST(DescribeCommand, SectionsAreFoundInTheWhole) {
     const Outcome whole = describe({});
-    ASSERT_EQ(whole.code, 0) << whole.err;
+    ASSERT_EQ(0, whole.code) << whole.err;
     for (const char* section : {"models", "memory", "parameters", "conversions"}) {
         const Outcome part = describe({section});
-        EXPECT_EQ(part.code, 0) << section;
+        EXPECT_EQ(0, part.code) << section;
         EXPECT_FALSE(part.out.empty()) << section;
         EXPECT_NE(whole.out.find(part.out), std::string::npos) << section;
     }
@@ -65,24 +65,24 @@ TEST(DescribeCommand, SectionsAreFoundInTheWhole) {
 
 TEST(DescribeCommand, JsonHoldsEverySection) {
     const Json json = Json::parse(describe({"--json"}).out);
-    EXPECT_EQ(json["facts"]["name"], "MRTU");
-    EXPECT_EQ(json["parameters"].size(), 18U);
-    EXPECT_EQ(json["memory"].size(), 12U);
-    EXPECT_EQ(json["tagFields"].size(), 4U);
-    EXPECT_EQ(json["models"].size(), 4U);
-    EXPECT_EQ(json["conversions"].size(), 7U);
-    EXPECT_EQ(Json::parse(describe({"models", "--json"}).out), json["models"]);
+    EXPECT_EQ("MRTU", json["facts"]["name"]);
+    EXPECT_EQ(18U, json["parameters"].size());
+    EXPECT_EQ(12U, json["memory"].size());
+    EXPECT_EQ(4U, json["tagFields"].size());
+    EXPECT_EQ(4U, json["models"].size());
+    EXPECT_EQ(7U, json["conversions"].size());
+    EXPECT_EQ(json["models"], Json::parse(describe({"models", "--json"}).out));
 }
 
 TEST(DescribeCommand, WrongUsageIsRefused) {
-    EXPECT_EQ(describe({"--xml", "--json"}).code, 2);
-    EXPECT_EQ(describe({"--xml", "models"}).code, 2);
-    EXPECT_EQ(describe({"weather"}).code, 2);
+    EXPECT_EQ(2, describe({"--xml", "--json"}).code);
+    EXPECT_EQ(2, describe({"--xml", "models"}).code);
+    EXPECT_EQ(2, describe({"weather"}).code);
 }
 
 TEST(DescribeCommand, UnknownProtocolIsSaidToBeUnknown) {
     const Outcome outcome = describe({"--protocol", "XYZ"});
-    EXPECT_EQ(outcome.code, 1);
+    EXPECT_EQ(1, outcome.code);
     EXPECT_NE(outcome.err.find("XYZ"), std::string::npos) << outcome.err;
 }
 

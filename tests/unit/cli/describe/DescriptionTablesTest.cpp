@@ -14,33 +14,35 @@ using settings_test::kDocument;
 using values::Json;
 
 TEST(DescriptionTables, ParametersShowDefaultsAndChoices) {
-    EXPECT_EQ(parametersText(parseDescription(kDocument)),
-              "KEY     MEANING  GIVEN FOR    DEFAULT   SUGGESTED  VALUES\n"
-              "pause   Pause    node or all  6         5          1..9\n"
-              "frames  Frames   all          required  long       short, long\n"
-              "size    Size     all          required  2          2; not with frames=long\n");
+    EXPECT_EQ(
+        "KEY     MEANING  GIVEN FOR    DEFAULT   SUGGESTED  VALUES\n"
+        "pause   Pause    node or all  6         5          1..9\n"
+        "frames  Frames   all          required  long       short, long\n"
+        "size    Size     all          required  2          2; not with frames=long\n",
+        parametersText(parseDescription(kDocument)));
 }
 
 TEST(DescriptionTables, ModelsShowTheirAddresses) {
-    EXPECT_EQ(modelsText(parseDescription(kDocument)),
-              "model A: The only one\n"
-              "  AREA  ADDRESSES  MEANING\n"
-              "  W     0..98      Words\n");
+    EXPECT_EQ(
+        "model A: The only one\n"
+        "  AREA  ADDRESSES  MEANING\n"
+        "  W     0..98      Words\n",
+        modelsText(parseDescription(kDocument)));
 }
 
 TEST(DescriptionJson, LeavesOutWhatAParameterDoesNotHave) {
     const Json json = parametersJson(parseDescription(kDocument));
-    ASSERT_EQ(json.size(), 3U);
-    EXPECT_EQ(json[0]["default"], "6");
-    EXPECT_EQ(json[0]["max"], 9);
+    ASSERT_EQ(3U, json.size());
+    EXPECT_EQ("6", json[0]["default"]);
+    EXPECT_EQ(9, json[0]["max"]);
     EXPECT_FALSE(json[0].contains("choices"));
     EXPECT_FALSE(json[1].contains("default"));
-    EXPECT_EQ(json[2]["notWith"]["value"], "long");
+    EXPECT_EQ("long", json[2]["notWith"]["value"]);
 }
 
 TEST(DescriptionJson, DataTypesAreNames) {
     const Json json = memoryJson(parseDescription(kDocument));
-    EXPECT_EQ(json[0]["types"], (Json{"boolean", "unsignedShort"}));
+    EXPECT_EQ((Json{"boolean", "unsignedShort"}), json[0]["types"]);
 }
 
 }  // namespace

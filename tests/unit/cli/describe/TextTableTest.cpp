@@ -6,23 +6,23 @@ namespace cli {
 namespace {
 
 TEST(TextTable, ColumnsAreAsWideAsTheirLongestText) {
-    EXPECT_EQ(textTable({{"A", "B"}, {"long", "x"}}), "A     B\nlong  x\n");
+    EXPECT_EQ("A     B\nlong  x\n", textTable({{"A", "B"}, {"long", "x"}}));
 }
 
 TEST(TextTable, LastColumnGoesOnBelowItself) {
-    EXPECT_EQ(textTable({{"k", "one, two, three"}}, 12), "k  one, two,\n   three\n");
+    EXPECT_EQ("k  one, two,\n   three\n", textTable({{"k", "one, two, three"}}, 12));
 }
 
 TEST(TextTable, WordsLongerThanTheSpaceAreNotCut) {
-    EXPECT_EQ(textTable({{"key", "abcdefghij kl"}}, 8), "key  abcdefghij\n     kl\n");
+    EXPECT_EQ("key  abcdefghij\n     kl\n", textTable({{"key", "abcdefghij kl"}}, 8));
 }
 
 TEST(TextTable, EmptyLastTextsLeaveNoBlanksAtTheEnd) {
-    EXPECT_EQ(textTable({{"a", "b", ""}, {"c", "", ""}}), "a  b\nc\n");
+    EXPECT_EQ("a  b\nc\n", textTable({{"a", "b", ""}, {"c", "", ""}}));
 }
 
 TEST(TextTable, NothingIsNothing) {
-    EXPECT_EQ(textTable({}), "");
+    EXPECT_EQ("", textTable({}));
 }
 
 }  // namespace
