@@ -11,7 +11,7 @@ Finding finding(Severity severity, const char* source, int line, int column) {
     return {severity, "rule", {source, line, column}, "message", "advice"};
 }
 
-TEST(Finding, OrderIsThatOfSourcesLinesAndColumns) {
+TEST(FindingTest, OrderIsThatOfSourcesLinesAndColumns) {
     Findings findings{finding(Severity::Warning, "z", 2, 1), finding(Severity::Warning, "a", 1, 1),
                       finding(Severity::Error, "z", 1, 9), finding(Severity::Error, "z", 1, 2)};
     sortByPlace(findings);

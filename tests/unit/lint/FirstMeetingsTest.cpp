@@ -9,19 +9,19 @@ namespace {
 
 using Met = std::vector<std::optional<std::size_t>>;
 
-TEST(FirstMeetings, EndsDoNotBelongToAStretch) {
+TEST(FirstMeetingsTest, EndsDoNotBelongToAStretch) {
     const std::vector<Stretch> others{{0, 4, 0}, {4, 8, 0}};
     EXPECT_EQ((Met{0, 1, 0, std::nullopt}),
               firstMeetings({{3, 4, kNoKind}, {4, 5, kNoKind}, {3, 5, kNoKind}, {8, 9, kNoKind}},
                             others));
 }
 
-TEST(FirstMeetings, OnlyOtherKindsAreMet) {
+TEST(FirstMeetingsTest, OnlyOtherKindsAreMet) {
     const std::vector<Stretch> all{{0, 4, 0}, {0, 4, 0}, {0, 4, 1}, {0, 4, 2}};
     EXPECT_EQ((Met{2, 2, 0, 0}), firstMeetings(all, all));
 }
 
-TEST(FirstMeetings, NoneAmongNone) {
+TEST(FirstMeetingsTest, NoneAmongNone) {
     EXPECT_EQ(Met{}, firstMeetings({}, {{0, 1, 0}}));
     EXPECT_EQ(Met{std::nullopt}, firstMeetings({{0, 1, 0}}, {}));
 }
@@ -50,7 +50,7 @@ std::vector<Stretch> randomStretches(std::mt19937& random, bool ofAKind) {
     return stretches;
 }
 
-TEST(FirstMeetings, AgreesWithTryingEveryPair) {
+TEST(FirstMeetingsTest, AgreesWithTryingEveryPair) {
     std::mt19937 random(1);
     for (int round = 0; round < 5000; ++round) {
         const auto others = randomStretches(random, true);

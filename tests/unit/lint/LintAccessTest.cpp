@@ -25,7 +25,7 @@ std::string lint(const TagLine& tag) {
     return placesOf(findingsOf(tag));
 }
 
-TEST(LintAccess, TagWithoutLengthIsAnError) {
+TEST(LintAccessTest, TagWithoutLengthIsAnError) {
     struct Case {
         const char* uri;
         int length;
@@ -47,7 +47,7 @@ TEST(LintAccess, TagWithoutLengthIsAnError) {
     EXPECT_EQ("write how many, e.g. string-16", findings[0].suggestion);
 }
 
-TEST(LintAccess, TagThatLeavesItsAreaIsAnError) {
+TEST(LintAccessTest, TagThatLeavesItsAreaIsAnError) {
     EXPECT_EQ("", lint(acceptedTag("1?HREG?465536?short", 1, 65535, 0, ICU_Type::short_, 2)));
     EXPECT_EQ("", lint(acceptedTag("1?HREG?465535?int", 1, 65534, 0, ICU_Type::int_, 4)));
     const TagLine beyond = acceptedTag("1?HREG?465536?int", 1, 65535, 0, ICU_Type::int_, 4);
@@ -60,7 +60,7 @@ TEST(LintAccess, TagThatLeavesItsAreaIsAnError) {
         finding.message);
 }
 
-TEST(LintAccess, TagThatLeavesItsAreaIsSeenInEveryKindOfArea) {
+TEST(LintAccessTest, TagThatLeavesItsAreaIsSeenInEveryKindOfArea) {
     // Coils: offset 65532 is bit 4 of byte 8191.
     const auto coils = [](int count) {
         return acceptedTag("1?OUTP?65533?boolean-" + std::to_string(count), 1, 8191, 4,
@@ -81,7 +81,7 @@ TEST(LintAccess, TagThatLeavesItsAreaIsSeenInEveryKindOfArea) {
     EXPECT_EQ("", lint(acceptedTag("1?NO?0?unsignedByte", 1, 0, 0, ICU_Type::unsignedByte, 1)));
 }
 
-TEST(LintAccess, NodesThatNoDeviceHasAreFound) {
+TEST(LintAccessTest, NodesThatNoDeviceHasAreFound) {
     struct Case {
         const char* node;
         const char* message;
@@ -110,7 +110,7 @@ TEST(LintAccess, NodesThatNoDeviceHasAreFound) {
     EXPECT_EQ("", lint(acceptedTag("255?NO?0?unsignedByte", 1, 0, 0, ICU_Type::unsignedByte, 1)));
 }
 
-TEST(LintAccess, NegativeSubIndexOfBitsIsAnError) {
+TEST(LintAccessTest, NegativeSubIndexOfBitsIsAnError) {
     const TagLine bit = acceptedTag("1?HREG?400001.-1?boolean", 1, 0, -1, ICU_Type::boolean, 1);
     ASSERT_EQ("negative-subindex@1:8", lint(bit));
     EXPECT_EQ(Severity::Error, findingsOf(bit)[0].severity);
@@ -126,7 +126,7 @@ TagLine coilArray(int node, int firstBit, int count) {
     return tag;
 }
 
-TEST(LintAccess, CoilArraysBeyondOneByteNeedFunction15) {
+TEST(LintAccessTest, CoilArraysBeyondOneByteNeedFunction15) {
     EXPECT_EQ("repeated-coils@1:10", lint(coilArray(3, 0, 9)));
     EXPECT_EQ("repeated-coils@1:10", lint(coilArray(3, 6, 3)));
     EXPECT_EQ("", lint(coilArray(3, 0, 8)));
@@ -139,7 +139,7 @@ TEST(LintAccess, CoilArraysBeyondOneByteNeedFunction15) {
         findingsOf(coilArray(3, 6, 3))[0].message);
 }
 
-TEST(LintAccess, CoilFunctionOfAllNodesIsHeeded) {
+TEST(LintAccessTest, CoilFunctionOfAllNodesIsHeeded) {
     const std::string config = "CfgVer=1 defNodeId=1 forceFunction=05 Node4::forceFunction=15";
     EXPECT_EQ("repeated-coils@1:10", placesOf(findingsOf(coilArray(1, 0, 16), config)));
     EXPECT_EQ("", placesOf(findingsOf(coilArray(4, 0, 16), config)));

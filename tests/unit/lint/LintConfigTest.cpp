@@ -16,7 +16,7 @@ Findings lint(const std::string& text) {
     return lintConfig(settings::scanConfig("cfg", text), sampleDescription());
 }
 
-TEST(LintConfig, FindsWhatTheDriverPassesOver) {
+TEST(LintConfigTest, FindsWhatTheDriverPassesOver) {
     struct Case {
         const char* text;
         const char* places;
@@ -60,7 +60,7 @@ TEST(LintConfig, FindsWhatTheDriverPassesOver) {
         EXPECT_EQ(each.places, placesOf(lint(each.text))) << each.text;
 }
 
-TEST(LintConfig, DataBitsWithoutEffectAreFound) {
+TEST(LintConfigTest, DataBitsWithoutEffectAreFound) {
     struct Case {
         const char* text;
         const char* places;
@@ -77,13 +77,13 @@ TEST(LintConfig, DataBitsWithoutEffectAreFound) {
         EXPECT_EQ(each.places, placesOf(lint(each.text))) << each.text;
 }
 
-TEST(LintConfig, NearestKnownKeyIsSuggested) {
+TEST(LintConfigTest, NearestKnownKeyIsSuggested) {
     EXPECT_EQ("did you mean 'timeout'?", lint("CfgVer=1 timout=1").at(0).suggestion);
     EXPECT_EQ("'mrtu describe parameters' lists the keys",
               lint("CfgVer=1 weather=1").at(0).suggestion);
 }
 
-TEST(LintConfig, EveryWarningHasASuggestion) {
+TEST(LintConfigTest, EveryWarningHasASuggestion) {
     for (const Finding& finding :
          lint("x CfgVer=1 a b=1 timeout=01 timeout=2 Node01::timeout=1 Node1::uart=a bits=7 "
               "maxOptLen=999 stopbits=3x model=9 CfgVer=2")) {
@@ -93,12 +93,12 @@ TEST(LintConfig, EveryWarningHasASuggestion) {
     }
 }
 
-TEST(LintConfig, DuplicateNamesTheValueThatCounts) {
+TEST(LintConfigTest, DuplicateNamesTheValueThatCounts) {
     EXPECT_EQ("'timeout' is given twice; the first value, '7' in line 2, counts",
               lint("CfgVer=1\ntimeout=7 timeout=8").at(0).message);
 }
 
-TEST(ConfigRefusal, StandsAtTheItemThatTheMessageNames) {
+TEST(LintConfigTest, RefusalStandsAtTheItemThatTheMessageNames) {
     const ScannedConfig config = settings::scanConfig("cfg", "CfgVer=1\nparity=evn");
     const Finding finding =
         configRefusal(config, sampleDescription(), "Parser: parameter 'parity' has invalid value");
@@ -107,7 +107,7 @@ TEST(ConfigRefusal, StandsAtTheItemThatTheMessageNames) {
     EXPECT_EQ("e.g. parity=even; choices: none, even, odd", finding.suggestion);
 }
 
-TEST(ConfigRefusal, MissingKeyIsToBeAddedAtTheEnd) {
+TEST(LintConfigTest, RefusalMissingKeyIsToBeAddedAtTheEnd) {
     const ScannedConfig config = settings::scanConfig("cfg", "CfgVer=1 timeout=5");
     const Finding finding =
         configRefusal(config, sampleDescription(), "Parser: parameter 'uart' is not found");
@@ -115,14 +115,14 @@ TEST(ConfigRefusal, MissingKeyIsToBeAddedAtTheEnd) {
     EXPECT_EQ("add e.g. uart=com1; choices: com1, com2", finding.suggestion);
 }
 
-TEST(ConfigRefusal, MissingMarkerIsToBeAddedAtTheStart) {
+TEST(LintConfigTest, RefusalMissingMarkerIsToBeAddedAtTheStart) {
     const Finding finding = configRefusal(settings::scanConfig("cfg", "\n\ntimeout=5"),
                                           sampleDescription(), "Parser: unknown format");
     EXPECT_EQ((Place{"cfg", 1, 1}), finding.place);
     EXPECT_EQ("begin with CfgVer=1", finding.suggestion);
 }
 
-TEST(LintConfig, EveryItemOfALongTextIsLookedAtOnce) {
+TEST(LintConfigTest, EveryItemOfALongTextIsLookedAtOnce) {
     // A look at the whole text for each of its items would be forty thousand times a megabyte.
     std::string text = "CfgVer=1\n";
     for (int node = 1; node <= 40000; ++node)

@@ -20,13 +20,13 @@ Findings lintShort(const std::string& dataType, std::vector<ConversionFacts> tri
     return lint("HREG", ICU_Type::short_, 2, dataType, std::move(tried));
 }
 
-TEST(LintConversions, WhatWorksIsNotMentioned) {
+TEST(LintConversionsTest, WhatWorksIsNotMentioned) {
     EXPECT_EQ("", placesOf(lintShort("short", {})));
     EXPECT_EQ("", placesOf(lintShort("short(swap2)", {{"swap2", true, true, 1, 0}})));
     EXPECT_EQ("", placesOf(lintShort("short(neg)", {{"neg", true, true, 1, 1}})));
 }
 
-TEST(LintConversions, WhatFailsBothWaysIsAnError) {
+TEST(LintConversionsTest, WhatFailsBothWaysIsAnError) {
     const Findings findings = lintShort("short(swap4)", {{"swap4", false, false, 1, 0}});
     ASSERT_EQ("impossible-conversion@1:15", placesOf(findings)) << "and nothing more";
     EXPECT_EQ(Severity::Error, findings[0].severity);
@@ -34,7 +34,7 @@ TEST(LintConversions, WhatFailsBothWaysIsAnError) {
               findings[0].message);
 }
 
-TEST(LintConversions, WhatFailsOneWayIsAWarningWhereThatWayExists) {
+TEST(LintConversionsTest, WhatFailsOneWayIsAWarningWhereThatWayExists) {
     const std::vector<ConversionFacts> tried{{"bcd", true, false, 1, 1}};
     const Findings findings = lint("HREG", ICU_Type::double_, 8, "double(bcd)", tried);
     ASSERT_EQ("impossible-conversion@1:15", placesOf(findings));
@@ -48,14 +48,14 @@ TEST(LintConversions, WhatFailsOneWayIsAWarningWhereThatWayExists) {
     EXPECT_EQ(Severity::Error, unreadable[0].severity) << "nothing else can be done with it";
 }
 
-TEST(LintConversions, WhatReachesOnlySomeItemsIsAWarning) {
+TEST(LintConversionsTest, WhatReachesOnlySomeItemsIsAWarning) {
     const Findings findings =
         lint("HREG", ICU_Type::shortArray, 20, "short-10(neg)", {{"neg", true, true, 10, 5}});
     ASSERT_EQ("partial-conversion@1:15", placesOf(findings));
     EXPECT_EQ("conversion 'neg' reaches only the first 5 of 10 items", findings[0].message);
 }
 
-TEST(LintConversions, EachOfSeveralIsLookedAt) {
+TEST(LintConversionsTest, EachOfSeveralIsLookedAt) {
     EXPECT_EQ("unknown-conversion@1:15 impossible-conversion@1:15",
               placesOf(lintShort("short(swp2,swap4)",
                                  {{"swp2", false, false, 1, 0}, {"swap4", false, false, 1, 0}})));

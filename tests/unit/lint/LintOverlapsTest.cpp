@@ -24,46 +24,46 @@ TagLine bit(int line, const char* area, unsigned offset, int index, int count = 
                        count == 1 ? ICU_Type::none : ICU_Type::boolean);
 }
 
-TEST(LintOverlaps, TagsSideBySideDoNotOverlap) {
+TEST(LintOverlapsTest, TagsSideBySideDoNotOverlap) {
     EXPECT_EQ("",
               lint({reg(1, "HREG", 0, ICU_Type::short_, 2), reg(2, "HREG", 1, ICU_Type::float_, 4),
                     reg(3, "HREG", 3, ICU_Type::short_, 2)}));
 }
 
-TEST(LintOverlaps, TheTagFurtherDownIsReported) {
+TEST(LintOverlapsTest, TheTagFurtherDownIsReported) {
     EXPECT_EQ("overlap@2:8", lint({reg(1, "HREG", 0, ICU_Type::float_, 4),
                                    reg(2, "HREG", 1, ICU_Type::short_, 2)}));
     EXPECT_EQ("overlap@2:8", lint({reg(1, "HREG", 1, ICU_Type::short_, 2),
                                    reg(2, "HREG", 0, ICU_Type::float_, 4)}));
 }
 
-TEST(LintOverlaps, SameStartWithAnotherTypeOverlaps) {
+TEST(LintOverlapsTest, SameStartWithAnotherTypeOverlaps) {
     EXPECT_EQ("overlap@2:8", lint({reg(1, "HREG", 5, ICU_Type::short_, 2),
                                    reg(2, "HREG", 5, ICU_Type::unsignedShort, 2)}));
 }
 
-TEST(LintOverlaps, AnArrayAndItsItemsAreOfOneKind) {
+TEST(LintOverlapsTest, AnArrayAndItsItemsAreOfOneKind) {
     const TagLine array = reg(1, "HREG", 0, ICU_Type::intArray, 16, ICU_Type::int_);
     EXPECT_EQ("", lint({array, reg(2, "HREG", 2, ICU_Type::int_, 4)}));
     EXPECT_EQ("overlap@2:8", lint({array, reg(2, "HREG", 1, ICU_Type::int_, 4)}))
         << "halves of two items";
 }
 
-TEST(LintOverlaps, OtherNodesAndAreasAreOtherMemory) {
+TEST(LintOverlapsTest, OtherNodesAndAreasAreOtherMemory) {
     TagLine elsewhere = reg(2, "HREG", 0, ICU_Type::float_, 4);
     elsewhere.facts->node = 2;
     EXPECT_EQ("", lint({reg(1, "HREG", 0, ICU_Type::int_, 4), elsewhere,
                         reg(3, "IREG", 0, ICU_Type::short_, 2)}));
 }
 
-TEST(LintOverlaps, WideRegistersCountByTheirOwnWidth) {
+TEST(LintOverlapsTest, WideRegistersCountByTheirOwnWidth) {
     EXPECT_EQ("",
               lint({reg(1, "LONG", 0, ICU_Type::int_, 4), reg(2, "LONG", 1, ICU_Type::float_, 4)}));
     EXPECT_EQ("overlap@2:8", lint({reg(1, "LONG", 0, ICU_Type::intArray, 8, ICU_Type::int_),
                                    reg(2, "LONG", 1, ICU_Type::float_, 4)}));
 }
 
-TEST(LintOverlaps, BitWrittenIntoARegisterOfAnotherTagIsReportedAtTheBit) {
+TEST(LintOverlapsTest, BitWrittenIntoARegisterOfAnotherTagIsReportedAtTheBit) {
     EXPECT_EQ("shared-register@2:8",
               lint({reg(1, "HREG", 4, ICU_Type::short_, 2), bit(2, "HREG", 4, 15)}));
     EXPECT_EQ("shared-register@1:8",
@@ -73,24 +73,24 @@ TEST(LintOverlaps, BitWrittenIntoARegisterOfAnotherTagIsReportedAtTheBit) {
         << "bit 17 is in the next register";
 }
 
-TEST(LintOverlaps, BitSharesTheRegisterWithAByteBesideIt) {
+TEST(LintOverlapsTest, BitSharesTheRegisterWithAByteBesideIt) {
     EXPECT_EQ("shared-register@2:8",
               lint({reg(1, "HREG", 4, ICU_Type::unsignedByte, 1), bit(2, "HREG", 4, 12)}));
 }
 
-TEST(LintOverlaps, BitsOfOneRegisterAreNoOnesProperty) {
+TEST(LintOverlapsTest, BitsOfOneRegisterAreNoOnesProperty) {
     EXPECT_EQ("", lint({bit(1, "HREG", 4, 0), bit(2, "HREG", 4, 1), bit(3, "HREG", 4, 0, 16)}));
 }
 
-TEST(LintOverlaps, BitsOfAStatusWordMayBeReadBesideIt) {
+TEST(LintOverlapsTest, BitsOfAStatusWordMayBeReadBesideIt) {
     EXPECT_EQ("", lint({reg(1, "IREG", 4, ICU_Type::short_, 2), bit(2, "IREG", 4, 3)}));
 }
 
-TEST(LintOverlaps, CoilsAreOfOneKind) {
+TEST(LintOverlapsTest, CoilsAreOfOneKind) {
     EXPECT_EQ("", lint({bit(1, "OUTP", 0, 3), bit(2, "OUTP", 0, 0, 16)}));
 }
 
-TEST(LintOverlaps, ATagIsReportedOnceAgainstTheFirstThatItMeets) {
+TEST(LintOverlapsTest, ATagIsReportedOnceAgainstTheFirstThatItMeets) {
     const Findings findings = lintOverlaps(
         {reg(1, "HREG", 0, ICU_Type::short_, 2), reg(2, "HREG", 1, ICU_Type::short_, 2),
          reg(3, "HREG", 0, ICU_Type::float_, 4)},
@@ -136,7 +136,7 @@ Findings lintPairs(const std::vector<TagLine>& tags) {
     return out;
 }
 
-TEST(LintOverlaps, ManyTagsGiveWhatTheirPairsGive) {
+TEST(LintOverlapsTest, ManyTagsGiveWhatTheirPairsGive) {
     std::mt19937 random(1);
     for (int round = 0; round < 300; ++round) {
         std::vector<TagLine> tags;
@@ -150,7 +150,7 @@ TEST(LintOverlaps, ManyTagsGiveWhatTheirPairsGive) {
     }
 }
 
-TEST(LintOverlaps, RefusedAndEmptyTagsTakeNoPart) {
+TEST(LintOverlapsTest, RefusedAndEmptyTagsTakeNoPart) {
     EXPECT_EQ("", lint({tagLine("1?HREG?400001?x", "tags", 1, 1),
                         reg(2, "HREG", 0, ICU_Type::intArray, 0, ICU_Type::int_),
                         reg(3, "HREG", 0, ICU_Type::short_, 2)}));

@@ -21,7 +21,7 @@ std::string lint(const std::string& uri) {
                 around()));
 }
 
-TEST(LintTag, FindsWhatTheDriverPassesOver) {
+TEST(LintTagTest, FindsWhatTheDriverPassesOver) {
     struct Case {
         const char* uri;
         const char* places;
@@ -63,21 +63,21 @@ TEST(LintTag, FindsWhatTheDriverPassesOver) {
         EXPECT_EQ(each.places, lint(each.uri)) << each.uri;
 }
 
-TEST(LintTag, FiveDigitAddressIsExplainedInBothForms) {
+TEST(LintTagTest, FiveDigitAddressIsExplainedInBothForms) {
     const Findings findings =
         lintTag(acceptedTag("1?HREG?40010?short", 1, 9, 0, ICU_Type::short_, 2), around());
     ASSERT_EQ(1U, findings.size());
     EXPECT_EQ("write 400010 or 440010", findings[0].suggestion);
 }
 
-TEST(LintTag, SixDigitFormIsSuggestedForAnotherAreasShortForm) {
+TEST(LintTagTest, SixDigitFormIsSuggestedForAnotherAreasShortForm) {
     const Findings findings =
         lintTag(acceptedTag("1?OUTP?40010?boolean", 1, 0, 0, ICU_Type::boolean, 1), around());
     ASSERT_EQ(1U, findings.size());
     EXPECT_NE(findings[0].suggestion.find("400010"), std::string::npos) << findings[0].suggestion;
 }
 
-TEST(LintTag, OctalAddressTellsWhatItIsReadAs) {
+TEST(LintTagTest, OctalAddressTellsWhatItIsReadAs) {
     const Findings findings =
         lintTag(acceptedTag("1?OUTP?0100?boolean", 1, 0, 0, ICU_Type::boolean, 1), around());
     ASSERT_EQ(1U, findings.size());
@@ -85,12 +85,12 @@ TEST(LintTag, OctalAddressTellsWhatItIsReadAs) {
     EXPECT_EQ("write 100 for the decimal number", findings[0].suggestion);
 }
 
-TEST(LintTag, RefusedTagsAreLeftToTheirRefusal) {
+TEST(LintTagTest, RefusedTagsAreLeftToTheirRefusal) {
     EXPECT_TRUE(lintTag(tagLine("7?HREG?0100?x", "t", 1, 1), around()).empty());
     EXPECT_TRUE(lintTag(tagLine("7", "t", 1, 1), around()).empty());
 }
 
-TEST(TagSurroundings, ModelsFollowTheNodeAndThenTheConfiguration) {
+TEST(LintTagTest, ModelsFollowTheNodeAndThenTheConfiguration) {
     const TagSurroundings surroundings = surroundingsOf(
         "CfgVer=1 defNodeId=1 model=3 Node2::model=1 Node4::model=x", sampleDescription());
     EXPECT_EQ((std::set<int>{1, 2, 4}), surroundings.nodes);

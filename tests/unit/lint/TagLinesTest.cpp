@@ -7,7 +7,7 @@ namespace {
 
 using settings::Place;
 
-TEST(TagLines, CommentsAndBlanksDoNotCount) {
+TEST(TagLinesTest, CommentsAndBlanksDoNotCount) {
     const auto tags = tagLines("t", "# all\n\n  1?A?2?int  # one\r\n\t#\n1?B?3?int");
     ASSERT_EQ(2U, tags.size());
     EXPECT_EQ("1?A?2?int", tags[0].uri);
@@ -15,14 +15,14 @@ TEST(TagLines, CommentsAndBlanksDoNotCount) {
     EXPECT_EQ((Place{"t", 5, 1}), tags[1].place);
 }
 
-TEST(TagLines, LinesMayEndInCarriageReturns) {
+TEST(TagLinesTest, LinesMayEndInCarriageReturns) {
     const auto tags = tagLines("t", "1?A?2?int\r\n1?A?3?int\r\n");
     ASSERT_EQ(2U, tags.size());
     EXPECT_EQ("1?A?2?int", tags[0].uri);
     EXPECT_EQ("int", tags[1].dataType());
 }
 
-TEST(TagLines, FieldsAreTrimmedAndKnowTheirColumns) {
+TEST(TagLinesTest, FieldsAreTrimmedAndKnowTheirColumns) {
     const TagLine tag = tagLine("1? HREG ?400001.3? int (swap2)", "t", 1, 5);
     ASSERT_TRUE(tag.wellFormed());
     EXPECT_EQ("HREG", tag.area());
@@ -33,7 +33,7 @@ TEST(TagLines, FieldsAreTrimmedAndKnowTheirColumns) {
     EXPECT_EQ(tag.place, tag.placeOf(9));
 }
 
-TEST(TagLines, AByteOrderByNameIsItsConversions) {
+TEST(TagLinesTest, AByteOrderByNameIsItsConversions) {
     const TagLine tag = tagLine("1?HREG?400001?float@ABCD", "t", 1, 1);
     EXPECT_EQ("1?HREG?400001?float@ABCD", tag.uri);
     EXPECT_EQ("1?HREG?400001?float(swap2,swap4)", tag.driverUri);
@@ -44,13 +44,13 @@ TEST(TagLines, AByteOrderByNameIsItsConversions) {
     EXPECT_EQ(wrong.driverUri, wrong.uri);
 }
 
-TEST(TagLines, OtherCountsOfFieldsAreNotWellFormed) {
+TEST(TagLinesTest, OtherCountsOfFieldsAreNotWellFormed) {
     for (const char* uri : {"", "1", "1?A?2", "1?A?2?int?x"}) {
         EXPECT_FALSE(tagLine(uri, "t", 1, 1).wellFormed()) << uri;
     }
 }
 
-TEST(TagLines, DataTypesComeApart) {
+TEST(TagLinesTest, DataTypesComeApart) {
     const DataTypeText array = dataTypeText("float-4(swap2, swap4)");
     EXPECT_EQ("float-", array.name);
     EXPECT_EQ((std::vector<std::string>{"swap2", "swap4"}), array.conversions);

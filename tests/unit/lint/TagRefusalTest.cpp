@@ -7,7 +7,7 @@
 namespace lint {
 namespace {
 
-TEST(TagRefusal, PointsAtTheFieldWithASuggestion) {
+TEST(TagRefusalTest, PointsAtTheFieldWithASuggestion) {
     struct Case {
         const char* uri;
         int column;
