@@ -40,7 +40,7 @@ std::string refusal(const std::string& bytes) {
     return "accepted";
 }
 
-TEST(DescriptionBlock, DocumentsOfAnySizeAreInflated) {
+TEST(DescriptionBlockTest, DocumentsOfAnySizeAreInflated) {
     for (const std::size_t size : {0U, 1U, 4096U, 4097U, 100000U}) {
         const std::string text(size, 'x');
         const std::string stream = zlibStream(text);
@@ -48,11 +48,11 @@ TEST(DescriptionBlock, DocumentsOfAnySizeAreInflated) {
     }
 }
 
-TEST(DescriptionBlock, ADriverWithoutABlockIsSaidToHaveNone) {
+TEST(DescriptionBlockTest, ADriverWithoutABlockIsSaidToHaveNone) {
     EXPECT_THROW(inflateDescription(nullptr), DescriptionError);
 }
 
-TEST(DescriptionBlock, DamagedBlocksAreRefusedWithTheReason) {
+TEST(DescriptionBlockTest, DamagedBlocksAreRefusedWithTheReason) {
     const std::string stream = zlibStream("<protocol_cfg/>");
     const std::string length = std::to_string(stream.size());
     const std::string shorter = std::to_string(stream.size() - 1);

@@ -11,7 +11,7 @@ namespace {
 
 using settings_test::kDocument;
 
-TEST(Description, FactsAreTheElementsThatHoldATextAlone) {
+TEST(DriverDescriptionTest, FactsAreTheElementsThatHoldATextAlone) {
     const Description description = parseDescription(kDocument);
     EXPECT_EQ(3U, description.facts.size());
     EXPECT_EQ("A demonstration", description.fact("display"));
@@ -19,7 +19,7 @@ TEST(Description, FactsAreTheElementsThatHoldATextAlone) {
     EXPECT_EQ("", description.fact("nothing"));
 }
 
-TEST(Description, ParametersHaveWhatTheirElementsSay) {
+TEST(DriverDescriptionTest, ParametersHaveWhatTheirElementsSay) {
     const Description description = parseDescription(kDocument);
     const ParameterInfo* pause = description.parameter("pause");
     ASSERT_NE(pause, nullptr);
@@ -34,7 +34,7 @@ TEST(Description, ParametersHaveWhatTheirElementsSay) {
     EXPECT_EQ(nullptr, description.parameter("Pause")) << "names are exact";
 }
 
-TEST(Description, KeyOfAListIsFoundInFrontOfItsChoices) {
+TEST(DriverDescriptionTest, KeyOfAListIsFoundInFrontOfItsChoices) {
     const Description description = parseDescription(kDocument);
     const ParameterInfo* frames = description.parameter("frames");
     ASSERT_NE(frames, nullptr);
@@ -43,7 +43,7 @@ TEST(Description, KeyOfAListIsFoundInFrontOfItsChoices) {
     EXPECT_FALSE(frames->defaultValue.has_value());
 }
 
-TEST(Description, DisablingEntryIsResolvedToItsValue) {
+TEST(DriverDescriptionTest, DisablingEntryIsResolvedToItsValue) {
     const Description description = parseDescription(kDocument);
     const ParameterInfo* size = description.parameter("size");
     ASSERT_NE(size, nullptr);
@@ -51,7 +51,7 @@ TEST(Description, DisablingEntryIsResolvedToItsValue) {
     EXPECT_EQ("long", size->disablingValue);
 }
 
-TEST(Description, AreasModelsAndConversionsHaveWhatTheirElementsSay) {
+TEST(DriverDescriptionTest, AreasModelsAndConversionsHaveWhatTheirElementsSay) {
     const Description description = parseDescription(kDocument);
     const AreaInfo* area = description.area("W");
     ASSERT_NE(area, nullptr);
@@ -68,7 +68,7 @@ TEST(Description, AreasModelsAndConversionsHaveWhatTheirElementsSay) {
     EXPECT_EQ("AB->BA", description.conversion("swap")->display);
 }
 
-TEST(Description, MalformedAndForeignDocumentsAreRefused) {
+TEST(DriverDescriptionTest, MalformedAndForeignDocumentsAreRefused) {
     for (const char* text : {"", "<protocol_cfg>", "<other/>", "no xml"}) {
         EXPECT_THROW(parseDescription(text), DescriptionError) << text;
     }

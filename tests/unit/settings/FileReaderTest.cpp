@@ -19,7 +19,7 @@ namespace {
 constexpr FileLimits kSmall{.bytes = 8, .silence = std::chrono::milliseconds(1)};
 constexpr FileLimits kPatient{.bytes = 8, .silence = std::chrono::seconds(60)};
 
-class FileReader : public testing::Test {
+class FileReaderTest : public testing::Test {
   protected:
     void SetUp() override {
         std::string name = testing::TempDir() + "file_reader_XXXXXX";
@@ -60,37 +60,37 @@ std::string refusalOf(const std::string& path, const FileLimits& limits) {
     return "read";
 }
 
-TEST_F(FileReader, TakesEveryByteUpToTheLimit) {
+TEST_F(FileReaderTest, TakesEveryByteUpToTheLimit) {
     EXPECT_EQ("", readFile(store(""), kSmall));
     EXPECT_EQ("12345678", readFile(store("12345678"), kSmall));
     EXPECT_EQ(std::string("\0a", 2), readFile(store(std::string("\0a", 2)), kSmall));
     EXPECT_EQ("longer than 8 bytes", reasonOf(store("123456789"), kSmall));
 }
 
-TEST_F(FileReader, EndlessDevicesAreCutOff) {
+TEST_F(FileReaderTest, EndlessDevicesAreCutOff) {
     EXPECT_EQ("longer than 1 MiB", reasonOf("/dev/zero", {.bytes = kConfigBytes}));
     EXPECT_EQ("longer than 8 bytes", reasonOf("/dev/urandom", kSmall));
     EXPECT_EQ("", readFile("/dev/null", kSmall));
 }
 
-TEST_F(FileReader, WhatCannotBeReadSaysWhy) {
+TEST_F(FileReaderTest, WhatCannotBeReadSaysWhy) {
     EXPECT_EQ("No such file or directory", reasonOf("/nowhere/at/all", kSmall));
     EXPECT_EQ("Is a directory", reasonOf("/", kSmall));
     EXPECT_EQ("No such file or directory", reasonOf("", kSmall));
 }
 
-TEST_F(FileReader, PipeWithoutWriterIsGivenUp) {
+TEST_F(FileReaderTest, PipeWithoutWriterIsGivenUp) {
     EXPECT_EQ("nothing came for 0.001 s", reasonOf(pipe(), kSmall));
 }
 
-TEST_F(FileReader, PipeThatIsNeverClosedIsGivenUp) {
+TEST_F(FileReaderTest, PipeThatIsNeverClosedIsGivenUp) {
     const std::string path = pipe();
     const posix::FileDescriptor both(open(path.c_str(), O_RDWR | O_CLOEXEC));
     ASSERT_EQ(3, write(both.get(), "abc", 3));
     EXPECT_EQ("nothing came for 0.001 s", reasonOf(path, kSmall));
 }
 
-TEST_F(FileReader, PipeIsReadToItsEnd) {
+TEST_F(FileReaderTest, PipeIsReadToItsEnd) {
     // As a shell's <(command) hands it over.
     int ends[2];
     ASSERT_EQ(0, ::pipe2(ends, O_CLOEXEC));
@@ -102,7 +102,7 @@ TEST_F(FileReader, PipeIsReadToItsEnd) {
     EXPECT_EQ("abc", readFile("/dev/fd/" + std::to_string(out.get()), kPatient));
 }
 
-TEST_F(FileReader, OnlyRegularFilesAreOpenedToLookInto) {
+TEST_F(FileReaderTest, OnlyRegularFilesAreOpenedToLookInto) {
     EXPECT_TRUE(openRegularFile(store("a")));
     const auto reason = [](const std::string& path) -> std::string {
         try {
@@ -118,7 +118,7 @@ TEST_F(FileReader, OnlyRegularFilesAreOpenedToLookInto) {
     EXPECT_EQ("No such file or directory", reason("/nowhere/at/all"));
 }
 
-TEST_F(FileReader, TextForTheDriverHoldsNoZero) {
+TEST_F(FileReaderTest, TextForTheDriverHoldsNoZero) {
     const std::string path = store(std::string("a\0b", 3));
     EXPECT_EQ("configuration " + path + ": holds a zero byte", refusalOf(path, kSmall));
     EXPECT_EQ("configuration /: Is a directory", refusalOf("/", kSmall));

@@ -5,7 +5,7 @@
 namespace settings {
 namespace {
 
-TEST(NumberText, IsReadWithTheBaseOfItsPrefix) {
+TEST(NumberTextTest, IsReadWithTheBaseOfItsPrefix) {
     struct Case {
         const char* text;
         long value;
@@ -38,7 +38,7 @@ TEST(NumberText, IsReadWithTheBaseOfItsPrefix) {
     }
 }
 
-TEST(NumberText, LosesItsLeadingZeroes) {
+TEST(NumberTextTest, LosesItsLeadingZeroes) {
     EXPECT_EQ("100", withoutLeadingZeroes("0100"));
     EXPECT_EQ("0", withoutLeadingZeroes("00"));
     EXPECT_EQ("7", withoutLeadingZeroes("7"));
