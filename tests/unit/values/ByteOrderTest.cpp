@@ -10,7 +10,7 @@ namespace {
 
 using values::withoutByteOrder;
 
-TEST(ByteOrder, ANameBecomesConversions) {
+TEST(ByteOrderTest, ANameBecomesConversions) {
     const struct {
         const char* named;
         const char* plain;
@@ -40,14 +40,14 @@ TEST(ByteOrder, ANameBecomesConversions) {
         EXPECT_EQ(row.plain, withoutByteOrder(row.named)) << row.named;
 }
 
-TEST(ByteOrder, A32BitRegisterTravelsHighByteFirst) {
+TEST(ByteOrderTest, A32BitRegisterTravelsHighByteFirst) {
     EXPECT_EQ("1?LONG?5000?float", withoutByteOrder("1?LONG?5000?float@ABCD"));
     EXPECT_EQ("1?LONG?5000?int(swap2,swap4)", withoutByteOrder("1?LONG?5000?int@CDAB"));
     EXPECT_EQ("1?LONG?5000?int(swap4)", withoutByteOrder("1?LONG?5000?int@DCBA"));
     EXPECT_EQ("1?LONG?5000?int(swap2)", withoutByteOrder("1?LONG?5000?int@BADC"));
 }
 
-TEST(ByteOrder, WhatHasNoneStaysAsItIs) {
+TEST(ByteOrderTest, WhatHasNoneStaysAsItIs) {
     for (const char* const uri :
          {"1?HREG?400010?float", "1?HREG?400010?float(swap2)", "1?OUTP?1?boolean-8", "", "@",
           "1?HREG?400010@ABCD", "1?HREG@ABCD?400010?float", " 1?HREG ?400010? float( swap2 ) "})
@@ -55,7 +55,7 @@ TEST(ByteOrder, WhatHasNoneStaysAsItIs) {
 }
 
 // The driver's own complaint about the type says more than one about the order.
-TEST(ByteOrder, AnUnknownTypeIsLeftToTheDriver) {
+TEST(ByteOrderTest, AnUnknownTypeIsLeftToTheDriver) {
     EXPECT_EQ("1?HREG?400010?word", withoutByteOrder("1?HREG?400010?word@ABCD"));
 }
 
@@ -67,7 +67,7 @@ std::string refusalOf(const std::string& uri) {
     }
 }
 
-TEST(ByteOrder, OneThatDoesNotFitIsRefusedWithTheChoices) {
+TEST(ByteOrderTest, OneThatDoesNotFitIsRefusedWithTheChoices) {
     const struct {
         const char* uri;
         const char* refusal;
@@ -92,7 +92,7 @@ TEST(ByteOrder, OneThatDoesNotFitIsRefusedWithTheChoices) {
         EXPECT_EQ(row.refusal, refusalOf(row.uri)) << row.uri;
 }
 
-TEST(ByteOrder, EachNameOfTheTableIsAPermutationAndStandsOnce) {
+TEST(ByteOrderTest, EachNameOfTheTableIsAPermutationAndStandsOnce) {
     const auto orders = values::byteOrders();
     EXPECT_EQ(14U, orders.size());
     for (const values::ByteOrder& order : orders) {

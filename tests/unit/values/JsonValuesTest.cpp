@@ -36,14 +36,14 @@ const Row kRows[] = {
     {{binary, 2}, "0x01ff", "\"0x01ff\""},
 };
 
-TEST(JsonValues, HaveTheTagsType) {
+TEST(JsonValuesTest, HaveTheTagsType) {
     for (const Row& row : kRows) {
         const Bytes bytes = values::parseValue(row.shape, row.value);
         EXPECT_EQ(row.json, values::jsonValue(row.shape, bytes).dump()) << row.value;
     }
 }
 
-TEST(JsonValues, TextInUtf8StaysText) {
+TEST(JsonValuesTest, TextInUtf8StaysText) {
     const auto json = values::jsonValue({string, 8}, values_test::bytesOf("K\xc3\xbch\0\0\0\0"));
     EXPECT_EQ("K\xc3\xbch", json.get<std::string>());
 }

@@ -5,7 +5,7 @@
 namespace values {
 namespace {
 
-TEST(NearestName, DistanceCountsEdits) {
+TEST(NearestNameTest, DistanceCountsEdits) {
     struct Case {
         const char* a;
         const char* b;
@@ -27,12 +27,12 @@ TEST(NearestName, DistanceCountsEdits) {
     }
 }
 
-TEST(NearestName, IsTheFirstOfTheNearest) {
+TEST(NearestNameTest, IsTheFirstOfTheNearest) {
     EXPECT_EQ("timeout", nearestName("timout", {"delay", "timeout", "timeouts"}));
     EXPECT_EQ("xb", nearestName("ab", {"xb", "ax"}));
 }
 
-TEST(NearestName, IsEmptyWhereNothingIsNear) {
+TEST(NearestNameTest, IsEmptyWhereNothingIsNear) {
     EXPECT_EQ("", nearestName("weather", {"timeout", "delay"}));
     EXPECT_EQ("", nearestName("xy", {"ab", "1"})) << "every character would change";
     EXPECT_EQ("", nearestName("x", {}));

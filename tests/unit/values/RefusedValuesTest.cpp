@@ -94,14 +94,14 @@ const Refused kRefused[] = {
     {{object, 0}, "", "values of type object can't be written as text"},
 };
 
-TEST(RefusedValues, AreNamedTogetherWithWhatWouldDo) {
+TEST(RefusedValuesTest, AreNamedTogetherWithWhatWouldDo) {
     for (const Refused& row : kRefused) {
         EXPECT_EQ(row.complaint, refusal(row.shape, row.text))
             << values::typeName(row.shape) << ": " << row.text;
     }
 }
 
-TEST(RefusedValues, OneTooManyIsRefusedForEveryWholeNumber) {
+TEST(RefusedValuesTest, OneTooManyIsRefusedForEveryWholeNumber) {
     for (const values::ValueType& row : values::kValueTypes) {
         const bool isSigned = row.kind == values::ValueKind::Signed;
         if (!isSigned && row.kind != values::ValueKind::Unsigned) continue;

@@ -37,30 +37,30 @@ constexpr Row kRows[] = {
     {"\xf0\x9f\x94\xa7"sv, "\xf0\x9f\x94\xa7"},      // four bytes
 };
 
-TEST(TextEscapes, KeepPrintableTextAndHideTheRest) {
+TEST(TextEscapesTest, KeepPrintableTextAndHideTheRest) {
     for (const Row& row : kRows)
         EXPECT_EQ(row.text, escapeText(bytesOf(row.bytes)));
 }
 
-TEST(TextEscapes, AreUndone) {
+TEST(TextEscapesTest, AreUndone) {
     for (const Row& row : kRows) {
         EXPECT_EQ(bytesOf(row.bytes), unescapeText(row.text)) << row.text;
         EXPECT_EQ(bytesOf(row.bytes), unescapeText('"' + std::string(row.text) + '"')) << row.text;
     }
 }
 
-TEST(TextEscapes, PrintableTextKeepsQuotesAndBackslashes) {
+TEST(TextEscapesTest, PrintableTextKeepsQuotesAndBackslashes) {
     EXPECT_EQ("a \"b\" c:\\d", values::printableText("a \"b\" c:\\d"));
     EXPECT_EQ("\\x1b[2J\\x0a\\x00\\xff\\x7f\\xc2\\x9b",
               values::printableText("\x1b[2J\n\0\xff\x7f\xc2\x9b"sv));
     EXPECT_EQ("K\xc3\xbchler", values::printableText("K\xc3\xbchler"));
 }
 
-TEST(TextEscapes, QuotesInsideAnUnquotedTextStandForThemselves) {
+TEST(TextEscapesTest, QuotesInsideAnUnquotedTextStandForThemselves) {
     EXPECT_EQ(bytesOf("a\"b\""), unescapeText("a\"b\""));
 }
 
-TEST(TextEscapes, HexadecimalDigitsMayBeUpperCase) {
+TEST(TextEscapesTest, HexadecimalDigitsMayBeUpperCase) {
     EXPECT_EQ(bytesOf("\xaf"), unescapeText("\\xAf"));
 }
 

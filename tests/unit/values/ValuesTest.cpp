@@ -99,14 +99,14 @@ const Accepted kAccepted[] = {
     {{int64Array, 8}, "-1", {255, 255, 255, 255, 255, 255, 255, 255}, ""},
 };
 
-TEST(Values, AreReadByTheTagsType) {
+TEST(ValuesTest, AreReadByTheTagsType) {
     for (const Accepted& row : kAccepted) {
         SCOPED_TRACE(values::typeName(row.shape) + ": " + std::string(row.text));
         EXPECT_EQ(row.bytes, parseValue(row.shape, row.text));
     }
 }
 
-TEST(Values, ArePrintedInOneForm) {
+TEST(ValuesTest, ArePrintedInOneForm) {
     for (const Accepted& row : kAccepted) {
         const std::string_view expected = row.printed.empty() ? row.text : row.printed;
         EXPECT_EQ(expected, formatValue(row.shape, row.bytes)) << values::typeName(row.shape);
@@ -128,7 +128,7 @@ bool countsBits(ICU_Type type) {
     return type == boolean || type == booleanArray;
 }
 
-TEST(Values, ReadBackExactlyWhateverTheirBits) {
+TEST(ValuesTest, ReadBackExactlyWhateverTheirBits) {
     std::mt19937 random(20240501);
     ASSERT_EQ(24U, writableShapes().size());
     for (const ValueShape shape : writableShapes()) {
@@ -143,7 +143,7 @@ TEST(Values, ReadBackExactlyWhateverTheirBits) {
     }
 }
 
-TEST(Values, EveryKindOfFloatReadsBackExactly) {
+TEST(ValuesTest, EveryKindOfFloatReadsBackExactly) {
     // Sign and exponent whole, the mantissa at its ends and in between.
     for (std::uint32_t top = 0; top < 512; ++top) {
         for (const std::uint32_t low : {0U, 1U, 0x2AAAAAU, 0x400000U, 0x7FFFFFU}) {
@@ -155,7 +155,7 @@ TEST(Values, EveryKindOfFloatReadsBackExactly) {
     }
 }
 
-TEST(Values, WholeNumberRangesEndWhereTheTypesEnd) {
+TEST(ValuesTest, WholeNumberRangesEndWhereTheTypesEnd) {
     const auto range = [](ICU_Type type) { return values::rangeText(values::rowOf(type)); };
     EXPECT_EQ("-128..127", range(byte));
     EXPECT_EQ("-32768..32767", range(short_));
@@ -167,13 +167,13 @@ TEST(Values, WholeNumberRangesEndWhereTheTypesEnd) {
     EXPECT_EQ("0..18446744073709551615", range(uint64));
 }
 
-TEST(Values, TypesWithoutATextFormAreShownAsBytes) {
+TEST(ValuesTest, TypesWithoutATextFormAreShownAsBytes) {
     EXPECT_EQ("0x0102030405060708090a",
               formatValue({time, 10}, Bytes{1, 2, 3, 4, 5, 6, 7, 8, 9, 10}));
     EXPECT_EQ("0x", formatValue({object, 0}, Bytes{}));
 }
 
-TEST(Values, TypesAreNamedAsUrisNameThem) {
+TEST(ValuesTest, TypesAreNamedAsUrisNameThem) {
     EXPECT_EQ("int", values::typeName({int_, 4}));
     EXPECT_EQ("int-10", values::typeName({intArray, 40}));
     EXPECT_EQ("string-20", values::typeName({string, 20}));
