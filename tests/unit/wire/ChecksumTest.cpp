@@ -12,19 +12,19 @@ Bytes bytesOf(std::string_view text) {
     return {text.begin(), text.end()};
 }
 
-TEST(CrcTest, CheckValueIsTheCataloguedOne) {
+TEST(ChecksumTest, CrcCheckValueIsTheCataloguedOne) {
     EXPECT_EQ(0x4B37, crc16(bytesOf("123456789")));
 }
 
-TEST(CrcTest, StandardsExampleOfFunctionSevenAtNodeTwo) {
+TEST(ChecksumTest, CrcStandardsExampleOfFunctionSevenAtNodeTwo) {
     EXPECT_EQ(0x1241, crc16(Bytes{0x02, 0x07}));
 }
 
-TEST(CrcTest, NothingGivesTheStartValue) {
+TEST(ChecksumTest, CrcNothingGivesTheStartValue) {
     EXPECT_EQ(0xFFFF, crc16({}));
 }
 
-TEST(CrcTest, EverySingleBitErrorChangesIt) {
+TEST(ChecksumTest, CrcEverySingleBitErrorChangesIt) {
     const Bytes good{0x01, 0x03, 0x00, 0x00, 0x00, 0x0A};
     for (std::size_t bit = 0; bit < good.size() * 8; ++bit) {
         Bytes bad = good;
@@ -33,11 +33,11 @@ TEST(CrcTest, EverySingleBitErrorChangesIt) {
     }
 }
 
-TEST(LrcTest, KnownRequest) {
+TEST(ChecksumTest, LrcKnownRequest) {
     EXPECT_EQ(0x7E, lrc8(Bytes{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03}));
 }
 
-TEST(LrcTest, SumWithTheBytesIsZero) {
+TEST(ChecksumTest, LrcSumWithTheBytesIsZero) {
     const Bytes bytes{0xFF, 0xFF, 0x80, 0x7F, 0x01};
     std::uint32_t sum = lrc8(bytes);
     for (const std::uint8_t byte : bytes)
@@ -45,7 +45,7 @@ TEST(LrcTest, SumWithTheBytesIsZero) {
     EXPECT_EQ(0U, sum % 256);
 }
 
-TEST(LrcTest, NothingGivesZero) {
+TEST(ChecksumTest, LrcNothingGivesZero) {
     EXPECT_EQ(0, lrc8({}));
 }
 

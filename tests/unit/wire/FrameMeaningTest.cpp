@@ -73,7 +73,7 @@ const Row kRows[] = {
     {{1, 43, 14, 1, 0}, {1, 43, 14}, "node 1: function 43, 3 bytes", "node 1: function 43, 1 byte"},
 };
 
-TEST(FrameMeaning, OfRequestAndReplyInBothModes) {
+TEST(FrameMeaningTest, OfRequestAndReplyInBothModes) {
     for (const Mode mode : {Mode::rtu, Mode::ascii}) {
         for (const Row& row : kRows) {
             FrameMeaning meaning(mode);
@@ -84,12 +84,12 @@ TEST(FrameMeaning, OfRequestAndReplyInBothModes) {
     }
 }
 
-TEST(FrameMeaning, ABroadcastIsForAllNodes) {
+TEST(FrameMeaningTest, ABroadcastIsForAllNodes) {
     EXPECT_EQ("all nodes: write coil at 4: on", FrameMeaning(Mode::rtu).ofRequest(wire::encodeFrame(
                                                     Mode::rtu, Bytes{0, 5, 0, 4, 0xFF, 0})));
 }
 
-TEST(FrameMeaning, AFrameWithAWrongCheckIsDamaged) {
+TEST(FrameMeaningTest, AFrameWithAWrongCheckIsDamaged) {
     const Bytes request{1, 3, 0, 9, 0, 1};
     for (const Mode mode : {Mode::rtu, Mode::ascii}) {
         FrameMeaning meaning(mode);
@@ -98,7 +98,7 @@ TEST(FrameMeaning, AFrameWithAWrongCheckIsDamaged) {
     }
 }
 
-TEST(FrameMeaning, AReplyThatNobodyAskedForIsToldApart) {
+TEST(FrameMeaningTest, AReplyThatNobodyAskedForIsToldApart) {
     FrameMeaning meaning(Mode::rtu);
     const Bytes reply = wire::encodeFrame(Mode::rtu, Bytes{2, 3, 2, 3, 0xF1});
     EXPECT_EQ("node 2: 1009 (not what was asked for)", meaning.ofReply(reply));
@@ -106,7 +106,7 @@ TEST(FrameMeaning, AReplyThatNobodyAskedForIsToldApart) {
     EXPECT_EQ("node 2: 1009 (not what was asked for)", meaning.ofReply(reply));
 }
 
-TEST(FrameMeaning, LongListsAreCut) {
+TEST(FrameMeaningTest, LongListsAreCut) {
     FrameMeaning meaning(Mode::rtu);
     meaning.ofRequest(wire::encodeFrame(Mode::rtu, Bytes{1, 1, 0, 0, 0, 17}));
     EXPECT_EQ("node 1: 1 0 0 0 0 0 0 0 0 0 0 0 0 0 0 0 ...",
@@ -114,7 +114,7 @@ TEST(FrameMeaning, LongListsAreCut) {
 }
 
 /// Frames come from outside: any bytes behind node and function have some meaning.
-TEST(FrameMeaning, OfEveryTruncationIsHarmless) {
+TEST(FrameMeaningTest, OfEveryTruncationIsHarmless) {
     for (int function = 0; function < 256; ++function) {
         for (std::size_t size = 2; size < 12; ++size) {
             Bytes message(size, 0x11);

@@ -28,26 +28,26 @@ std::optional<std::size_t> unknownLength(ByteView) {
     return std::nullopt;
 }
 
-TEST(EncodeFrameTest, RtuCarriesTheLowByteOfTheCrcFirst) {
+TEST(FramingTest, EncodedRtuCarriesTheLowByteOfTheCrcFirst) {
     EXPECT_EQ(kReadRequestRtu, encodeFrame(Mode::rtu, kReadRequest));
 }
 
-TEST(EncodeFrameTest, AsciiCarriesUpperCaseDigitsAndCrLf) {
+TEST(FramingTest, EncodedAsciiCarriesUpperCaseDigitsAndCrLf) {
     EXPECT_EQ(kReadRequestAscii, textOf(encodeFrame(Mode::ascii, kReadRequest)));
 }
 
-TEST(EncodeFrameTest, BrokenCheckDiffersInAllItsBitsOnly) {
+TEST(FramingTest, EncodedBrokenCheckDiffersInAllItsBitsOnly) {
     const Bytes rtu{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03, 0x89, 0x78};
     EXPECT_EQ(rtu, encodeFrame(Mode::rtu, kReadRequest, true));
     EXPECT_EQ(":1103006B000381\r\n", textOf(encodeFrame(Mode::ascii, kReadRequest, true)));
 }
 
-TEST(DecodeFrameTest, GoodFramesGiveTheMessage) {
+TEST(FramingTest, DecodedGoodFramesGiveTheMessage) {
     EXPECT_EQ(kReadRequest, decodeFrame(Mode::rtu, kReadRequestRtu).message);
     EXPECT_EQ(kReadRequest, decodeFrame(Mode::ascii, bytesOf(kReadRequestAscii)).message);
 }
 
-TEST(DecodeFrameTest, EveryTruncationIsDamagedAndKeepsItsBytes) {
+TEST(FramingTest, DecodedEveryTruncationIsDamagedAndKeepsItsBytes) {
     for (std::size_t length = 0; length < kReadRequestRtu.size(); ++length) {
         const auto frame = decodeFrame(Mode::rtu, ByteView(kReadRequestRtu).first(length));
         EXPECT_TRUE(frame.damaged()) << length;
@@ -59,7 +59,7 @@ TEST(DecodeFrameTest, EveryTruncationIsDamagedAndKeepsItsBytes) {
     }
 }
 
-TEST(DecodeFrameTest, DamagedAsciiFrames) {
+TEST(FramingTest, DecodedDamagedAsciiFrames) {
     for (const std::string_view text : {
              ":1103006B00037F\r\n",   // wrong LRC
              ":1103006b00037E\r\n",   // lower case
@@ -73,17 +73,17 @@ TEST(DecodeFrameTest, DamagedAsciiFrames) {
     }
 }
 
-TEST(DecodeFrameTest, RtuFrameOf256BytesIsTheLongest) {
+TEST(FramingTest, DecodedRtuFrameOf256BytesIsTheLongest) {
     EXPECT_FALSE(decodeFrame(Mode::rtu, encodeFrame(Mode::rtu, Bytes(254, 0x55))).damaged());
     EXPECT_TRUE(decodeFrame(Mode::rtu, encodeFrame(Mode::rtu, Bytes(255, 0x55))).damaged());
 }
 
-TEST(DecodeFrameTest, AsciiFrameOf254BytesIsTheLongest) {
+TEST(FramingTest, DecodedAsciiFrameOf254BytesIsTheLongest) {
     EXPECT_FALSE(decodeFrame(Mode::ascii, encodeFrame(Mode::ascii, Bytes(254, 0x55))).damaged());
     EXPECT_TRUE(decodeFrame(Mode::ascii, encodeFrame(Mode::ascii, Bytes(255, 0x55))).damaged());
 }
 
-TEST(RtuSplitterTest, AnnouncedLengthEndsAFrameAtOnce) {
+TEST(FramingTest, RtuSplitterAnnouncedLengthEndsAFrameAtOnce) {
     FrameSplitter splitter(Mode::rtu, eightBytes);
     const auto frames = splitter.add(kReadRequestRtu);
     ASSERT_EQ(1U, frames.size());
@@ -91,7 +91,7 @@ TEST(RtuSplitterTest, AnnouncedLengthEndsAFrameAtOnce) {
     EXPECT_FALSE(splitter.waitsForSilence());
 }
 
-TEST(RtuSplitterTest, BytesMayArriveOneByOne) {
+TEST(FramingTest, RtuSplitterBytesMayArriveOneByOne) {
     FrameSplitter splitter(Mode::rtu, eightBytes);
     for (std::size_t i = 0; i + 1 < kReadRequestRtu.size(); ++i) {
         EXPECT_TRUE(splitter.add(ByteView(kReadRequestRtu).subspan(i, 1)).empty()) << i;
@@ -99,7 +99,7 @@ TEST(RtuSplitterTest, BytesMayArriveOneByOne) {
     EXPECT_EQ(1U, splitter.add(ByteView(kReadRequestRtu).last(1)).size());
 }
 
-TEST(RtuSplitterTest, FramesMayFollowOneAnotherInOneRead) {
+TEST(FramingTest, RtuSplitterFramesMayFollowOneAnotherInOneRead) {
     FrameSplitter splitter(Mode::rtu, eightBytes);
     Bytes twice = kReadRequestRtu;
     twice.insert(twice.end(), kReadRequestRtu.begin(), kReadRequestRtu.end());
@@ -108,7 +108,7 @@ TEST(RtuSplitterTest, FramesMayFollowOneAnotherInOneRead) {
     EXPECT_TRUE(splitter.waitsForSilence());
 }
 
-TEST(RtuSplitterTest, UnknownLengthEndsAtSilence) {
+TEST(FramingTest, RtuSplitterUnknownLengthEndsAtSilence) {
     FrameSplitter splitter(Mode::rtu, unknownLength);
     EXPECT_TRUE(splitter.add(kReadRequestRtu).empty());
     const auto frame = splitter.silence();
@@ -117,7 +117,7 @@ TEST(RtuSplitterTest, UnknownLengthEndsAtSilence) {
     EXPECT_FALSE(splitter.silence());
 }
 
-TEST(RtuSplitterTest, WrongCrcWaitsForSilenceAndTakesAllWithIt) {
+TEST(FramingTest, RtuSplitterWrongCrcWaitsForSilenceAndTakesAllWithIt) {
     FrameSplitter splitter(Mode::rtu, eightBytes);
     Bytes bad = kReadRequestRtu;
     bad[7] ^= 0x01;
@@ -130,7 +130,7 @@ TEST(RtuSplitterTest, WrongCrcWaitsForSilenceAndTakesAllWithIt) {
     EXPECT_EQ(1U, splitter.add(kReadRequestRtu).size());
 }
 
-TEST(RtuSplitterTest, EndlessBytesStayBounded) {
+TEST(FramingTest, RtuSplitterEndlessBytesStayBounded) {
     FrameSplitter splitter(Mode::rtu, unknownLength);
     for (int i = 0; i < 100; ++i)
         EXPECT_TRUE(splitter.add(Bytes(1000, 0xAA)).empty());
@@ -140,7 +140,7 @@ TEST(RtuSplitterTest, EndlessBytesStayBounded) {
     EXPECT_EQ(kMaxRtuFrame + 1, frame->raw.size());
 }
 
-TEST(AsciiSplitterTest, FrameBeginsAtTheLastColonAndEndsAtCrLf) {
+TEST(FramingTest, AsciiSplitterFrameBeginsAtTheLastColonAndEndsAtCrLf) {
     FrameSplitter splitter(Mode::ascii, unknownLength);
     const auto frames = splitter.add(bytesOf("noise\r\n:1103:1103006B00037E\r\n:11"));
     ASSERT_EQ(1U, frames.size());
@@ -148,7 +148,7 @@ TEST(AsciiSplitterTest, FrameBeginsAtTheLastColonAndEndsAtCrLf) {
     EXPECT_EQ(kReadRequestAscii, textOf(frames[0].raw));
 }
 
-TEST(AsciiSplitterTest, SilenceDoesNotEndAFrame) {
+TEST(FramingTest, AsciiSplitterSilenceDoesNotEndAFrame) {
     FrameSplitter splitter(Mode::ascii, unknownLength);
     EXPECT_TRUE(splitter.add(bytesOf(":1103006B0")).empty());
     EXPECT_FALSE(splitter.waitsForSilence());
@@ -156,7 +156,7 @@ TEST(AsciiSplitterTest, SilenceDoesNotEndAFrame) {
     EXPECT_EQ(1U, splitter.add(bytesOf("0037E\r\n")).size());
 }
 
-TEST(AsciiSplitterTest, WrongLrcIsReportedAndTheNextFrameIsFound) {
+TEST(FramingTest, AsciiSplitterWrongLrcIsReportedAndTheNextFrameIsFound) {
     FrameSplitter splitter(Mode::ascii, unknownLength);
     const auto frames = splitter.add(bytesOf(":1103006B000300\r\n:1103006B00037E\r\n"));
     ASSERT_EQ(2U, frames.size());
@@ -164,7 +164,7 @@ TEST(AsciiSplitterTest, WrongLrcIsReportedAndTheNextFrameIsFound) {
     EXPECT_FALSE(frames[1].damaged());
 }
 
-TEST(AsciiSplitterTest, EndlessFrameIsGivenUpAsDamaged) {
+TEST(FramingTest, AsciiSplitterEndlessFrameIsGivenUpAsDamaged) {
     FrameSplitter splitter(Mode::ascii, unknownLength);
     const auto frames = splitter.add(bytesOf(":" + std::string(2000, '0')));
     ASSERT_EQ(1U, frames.size());
