@@ -23,7 +23,7 @@ const std::string kGood =
     "CfgVer=1 defNodeId=1 txMode=RTU uart=com1 baudrate=9600\n"
     "parity=even stopbits=1 mode=RS-485\n";
 
-class CheckCommand : public testing::Test {
+class CheckCommandTest : public testing::Test {
   protected:
     void SetUp() override {
         std::string name = (fs::temp_directory_path() / "mrtu_check_XXXXXX").string();
@@ -60,14 +60,14 @@ class CheckCommand : public testing::Test {
     fs::path directory_;
 };
 
-TEST_F(CheckCommand, CleanConfigurationAndTagsAreClean) {
+TEST_F(CheckCommandTest, CleanConfigurationAndTagsAreClean) {
     const Outcome outcome =
         check(kGood, {"--strict", "1?HREG?400001?unsignedShort", "1?OUTP?1?boolean-8"});
     EXPECT_EQ(0, outcome.code);
     EXPECT_EQ("0 errors, 0 warnings (2 tags checked)\n", outcome.out);
 }
 
-TEST_F(CheckCommand, ByteOrdersMayBeNamed) {
+TEST_F(CheckCommandTest, ByteOrdersMayBeNamed) {
     const Outcome good =
         check(kGood, {"--strict", "1?HREG?400001?float@ABCD", "1?HREG?400003?double@GHEFCDAB",
                       "1?HREG?400007?string-8@AB"});
@@ -80,7 +80,7 @@ TEST_F(CheckCommand, ByteOrdersMayBeNamed) {
         wrong.out);
 }
 
-TEST_F(CheckCommand, WarningsCountOnlyWhenStrict) {
+TEST_F(CheckCommandTest, WarningsCountOnlyWhenStrict) {
     const std::string config = kGood + "timout=1";
     EXPECT_EQ(0, check(config, {}).code);
     const Outcome strict = check(config, {"--strict"});
@@ -91,7 +91,7 @@ TEST_F(CheckCommand, WarningsCountOnlyWhenStrict) {
         << strict.out;
 }
 
-TEST_F(CheckCommand, RefusedConfigurationIsAnErrorAndLeavesTagsUnchecked) {
+TEST_F(CheckCommandTest, RefusedConfigurationIsAnErrorAndLeavesTagsUnchecked) {
     const Outcome outcome = check("CfgVer=1 defNodeId=1", {"1?HREG?x?y"});
     EXPECT_EQ(2, outcome.code);
     EXPECT_NE(outcome.out.find("line.cfg:1:21: error: Parser: parameter 'uart' is not found"),
@@ -100,14 +100,14 @@ TEST_F(CheckCommand, RefusedConfigurationIsAnErrorAndLeavesTagsUnchecked) {
     EXPECT_NE(outcome.out.find("1 tag not checked"), std::string::npos) << outcome.out;
 }
 
-TEST_F(CheckCommand, RefusedTagIsAnErrorWithTheDriversWords) {
+TEST_F(CheckCommandTest, RefusedTagIsAnErrorWithTheDriversWords) {
     const Outcome outcome = check(kGood, {"1?INP?100001?unsignedShort"});
     EXPECT_EQ(2, outcome.code);
     EXPECT_NE(outcome.out.find("argument:1:14: error: "), std::string::npos) << outcome.out;
     EXPECT_NE(outcome.out.find("not allowed icom type"), std::string::npos) << outcome.out;
 }
 
-TEST_F(CheckCommand, EveryListedSilenceIsFound) {
+TEST_F(CheckCommandTest, EveryListedSilenceIsFound) {
     EXPECT_EQ("ignored-key duplicate-key unknown-model unknown-key ",
               rules(kGood + "bits=8 repeat=1 repeat=2 model=x timout=5", {}));
     struct Case {
@@ -129,7 +129,7 @@ TEST_F(CheckCommand, EveryListedSilenceIsFound) {
     }
 }
 
-TEST_F(CheckCommand, WhatCanNeverWorkIsFound) {
+TEST_F(CheckCommandTest, WhatCanNeverWorkIsFound) {
     struct Case {
         const char* uri;
         const char* rules;
@@ -169,29 +169,29 @@ TEST_F(CheckCommand, WhatCanNeverWorkIsFound) {
     EXPECT_EQ("", rules(kGood + "forceFunction=05", {"1?OUTP?1?boolean-8"}));
 }
 
-TEST_F(CheckCommand, WhatFailsWithEveryAccessIsAnError) {
+TEST_F(CheckCommandTest, WhatFailsWithEveryAccessIsAnError) {
     EXPECT_EQ(2, check(kGood, {"1?HREG?465536?int"}).code);
     EXPECT_EQ(2, check(kGood, {"1?HREG?400001?short(swp2)"}).code);
     EXPECT_EQ(0, check(kGood, {"1?HREG?400001?short-10(neg)"}).code);
 }
 
-TEST_F(CheckCommand, ControlCharactersOfTheFilesStayOffTheTerminal) {
+TEST_F(CheckCommandTest, ControlCharactersOfTheFilesStayOffTheTerminal) {
     const Outcome outcome = check(kGood + "\x1b[2J=1", {"1?HREG\x1b?400001?short"});
     EXPECT_EQ(std::string::npos, outcome.out.find('\x1b')) << outcome.out;
     EXPECT_NE(std::string::npos, outcome.out.find("unknown key '\\x1b[2J'")) << outcome.out;
 }
 
-TEST_F(CheckCommand, ZeroBasedModelsShareTheirFiveDigitForms) {
+TEST_F(CheckCommandTest, ZeroBasedModelsShareTheirFiveDigitForms) {
     EXPECT_EQ("short-address overlap ",
               rules(kGood + "model=2", {"1?HREG?40010?short", "1?HREG?400010?float"}));
 }
 
-TEST_F(CheckCommand, WideRegistersOfTheEnronModelsAreTakenByTheirWidth) {
+TEST_F(CheckCommandTest, WideRegistersOfTheEnronModelsAreTakenByTheirWidth) {
     EXPECT_EQ("", rules(kGood + "model=3", {"1?LONG?0?int", "1?LONG?1?float"}));
     EXPECT_EQ("overlap ", rules(kGood + "model=3", {"1?LONG?0?int-2", "1?LONG?1?float"}));
 }
 
-TEST_F(CheckCommand, TagsMayComeFromAFile) {
+TEST_F(CheckCommandTest, TagsMayComeFromAFile) {
     const std::string tags =
         store("tags", "# two\n1?HREG?400001?short\n\n1?HREG?400001?float # b\n");
     const Outcome outcome = check(kGood, {"--tags", tags});
@@ -218,7 +218,7 @@ std::string asShown(std::string text, const std::string& folder) {
     return shown;
 }
 
-TEST_F(CheckCommand, DocumentationShowsTheRealOutput) {
+TEST_F(CheckCommandTest, DocumentationShowsTheRealOutput) {
     const std::string folder = SOURCE_FOLDER "/examples/check/";
     const std::string copy = store("tags.txt", contentsOf(folder + "tags.txt"));
     const Outcome outcome = check(contentsOf(folder + "line.cfg"), {"--tags", copy});
@@ -226,7 +226,7 @@ TEST_F(CheckCommand, DocumentationShowsTheRealOutput) {
     EXPECT_NE(contentsOf(SOURCE_FOLDER "/docs/check.md").find(shown), std::string::npos) << shown;
 }
 
-TEST_F(CheckCommand, JsonCountsWhatItLists) {
+TEST_F(CheckCommandTest, JsonCountsWhatItLists) {
     const Outcome outcome = check(kGood + "timout=1", {"--json", "1?HREG?1?short"});
     EXPECT_EQ(2, outcome.code);
     const Json json = Json::parse(outcome.out);
@@ -236,18 +236,18 @@ TEST_F(CheckCommand, JsonCountsWhatItLists) {
     EXPECT_EQ(2U, json["findings"].size());
 }
 
-TEST_F(CheckCommand, JsonSurvivesBytesThatAreNoText) {
+TEST_F(CheckCommandTest, JsonSurvivesBytesThatAreNoText) {
     const Outcome outcome = check(kGood + "\xff\xfe=1", {"--json"});
     EXPECT_EQ(0, outcome.code);
     EXPECT_EQ(1, Json::parse(outcome.out)["warnings"]);
 }
 
-TEST_F(CheckCommand, UnreadableFilesAreWrongUsage) {
+TEST_F(CheckCommandTest, UnreadableFilesAreWrongUsage) {
     EXPECT_EQ(2, check(kGood, {"--tags", "/nowhere/tags"}).code);
     EXPECT_EQ(2, check(kGood, {"--tags", "/"}).code);
 }
 
-TEST_F(CheckCommand, WhatReadRefusesIsRefused) {
+TEST_F(CheckCommandTest, WhatReadRefusesIsRefused) {
     const struct {
         std::string config;
         const char* reason;
@@ -265,12 +265,12 @@ TEST_F(CheckCommand, WhatReadRefusesIsRefused) {
     EXPECT_EQ("mrtu: configuration /dev/zero: longer than 1 MiB\n", endless.err);
 }
 
-TEST_F(CheckCommand, TagsFileIsReadWithTheSameCare) {
+TEST_F(CheckCommandTest, TagsFileIsReadWithTheSameCare) {
     EXPECT_EQ(2, check(kGood, {"--tags", "/dev/zero"}).code);
     EXPECT_EQ(2, check(kGood, {"--tags", store("tags", std::string("1?\0", 3))}).code);
 }
 
-TEST_F(CheckCommand, FileAndArgumentsExcludeEachOther) {
+TEST_F(CheckCommandTest, FileAndArgumentsExcludeEachOther) {
     EXPECT_EQ(2, check(kGood, {"--tags", "x", "1?HREG?400001?short"}).code);
 }
 

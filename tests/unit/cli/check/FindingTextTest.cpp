@@ -13,7 +13,7 @@ Finding finding(Severity severity, const char* source, int line, int column) {
     return {severity, "rule", {source, line, column}, "message", "advice"};
 }
 
-TEST(FindingText, TextNamesPlaceSeverityAndRule) {
+TEST(FindingTextTest, TextNamesPlaceSeverityAndRule) {
     EXPECT_EQ("a.cfg:2:5: warning: message [rule]\n    advice\n",
               findingsText({finding(Severity::Warning, "a.cfg", 2, 5)}));
     Finding without = finding(Severity::Error, "a.cfg", 1, 1);
@@ -22,14 +22,14 @@ TEST(FindingText, TextNamesPlaceSeverityAndRule) {
     EXPECT_EQ("", findingsText({}));
 }
 
-TEST(FindingText, JsonHasEveryMember) {
+TEST(FindingTextTest, JsonHasEveryMember) {
     EXPECT_EQ(R"([{"severity":"error","rule":"rule","source":"a","line":2,"column":5,)"
               R"("message":"message","suggestion":"advice"}])",
               findingsJson({finding(Severity::Error, "a", 2, 5)}).dump());
     EXPECT_EQ("[]", findingsJson({}).dump());
 }
 
-TEST(FindingText, VerdictFollowsErrorsAndStrictness) {
+TEST(FindingTextTest, VerdictFollowsErrorsAndStrictness) {
     const Findings warning{finding(Severity::Warning, "a", 1, 1)};
     const Findings error{finding(Severity::Warning, "a", 1, 1),
                          finding(Severity::Error, "a", 1, 1)};

@@ -35,7 +35,7 @@ std::string asShown(const std::string& text) {
     return shown;
 }
 
-TEST(DescribeCommand, DocumentationShowsTheRealOutput) {
+TEST(DescribeCommandTest, DocumentationShowsTheRealOutput) {
     const std::string page = contentsOf(SOURCE_FOLDER "/docs/description.md");
     for (const char* section : {"parameters", "memory", "conversions"}) {
         const std::string shown = asShown(describe({section}).out);
@@ -44,7 +44,7 @@ TEST(DescribeCommand, DocumentationShowsTheRealOutput) {
     }
 }
 
-TEST(DescribeCommand, XmlIsTheDocumentByteForByte) {
+TEST(DescribeCommandTest, XmlIsTheDocumentByteForByte) {
     const std::string document = contentsOf(SOURCE_FOLDER "/description/mrtu.xml");
     ASSERT_FALSE(document.empty());
     const Outcome outcome = describe({"--xml"});
@@ -52,7 +52,7 @@ TEST(DescribeCommand, XmlIsTheDocumentByteForByte) {
     EXPECT_EQ(document, outcome.out);
 }
 
-TEST(DescribeCommand, SectionsAreFoundInTheWhole) {
+TEST(DescribeCommandTest, SectionsAreFoundInTheWhole) {
     const Outcome whole = describe({});
     ASSERT_EQ(0, whole.code) << whole.err;
     for (const char* section : {"models", "memory", "parameters", "conversions"}) {
@@ -63,7 +63,7 @@ TEST(DescribeCommand, SectionsAreFoundInTheWhole) {
     }
 }
 
-TEST(DescribeCommand, JsonHoldsEverySection) {
+TEST(DescribeCommandTest, JsonHoldsEverySection) {
     const Json json = Json::parse(describe({"--json"}).out);
     EXPECT_EQ("MRTU", json["facts"]["name"]);
     EXPECT_EQ(18U, json["parameters"].size());
@@ -74,13 +74,13 @@ TEST(DescribeCommand, JsonHoldsEverySection) {
     EXPECT_EQ(json["models"], Json::parse(describe({"models", "--json"}).out));
 }
 
-TEST(DescribeCommand, WrongUsageIsRefused) {
+TEST(DescribeCommandTest, WrongUsageIsRefused) {
     EXPECT_EQ(2, describe({"--xml", "--json"}).code);
     EXPECT_EQ(2, describe({"--xml", "models"}).code);
     EXPECT_EQ(2, describe({"weather"}).code);
 }
 
-TEST(DescribeCommand, UnknownProtocolIsSaidToBeUnknown) {
+TEST(DescribeCommandTest, UnknownProtocolIsSaidToBeUnknown) {
     const Outcome outcome = describe({"--protocol", "XYZ"});
     EXPECT_EQ(1, outcome.code);
     EXPECT_NE(outcome.err.find("XYZ"), std::string::npos) << outcome.err;

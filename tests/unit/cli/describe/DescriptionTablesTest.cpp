@@ -13,7 +13,7 @@ using settings::parseDescription;
 using settings_test::kDocument;
 using values::Json;
 
-TEST(DescriptionTables, ParametersShowDefaultsAndChoices) {
+TEST(DescriptionTablesTest, ParametersShowDefaultsAndChoices) {
     EXPECT_EQ(
         "KEY     MEANING  GIVEN FOR    DEFAULT   SUGGESTED  VALUES\n"
         "pause   Pause    node or all  6         5          1..9\n"
@@ -22,7 +22,7 @@ TEST(DescriptionTables, ParametersShowDefaultsAndChoices) {
         parametersText(parseDescription(kDocument)));
 }
 
-TEST(DescriptionTables, ModelsShowTheirAddresses) {
+TEST(DescriptionTablesTest, ModelsShowTheirAddresses) {
     EXPECT_EQ(
         "model A: The only one\n"
         "  AREA  ADDRESSES  MEANING\n"
@@ -30,7 +30,7 @@ TEST(DescriptionTables, ModelsShowTheirAddresses) {
         modelsText(parseDescription(kDocument)));
 }
 
-TEST(DescriptionJson, LeavesOutWhatAParameterDoesNotHave) {
+TEST(DescriptionTablesTest, JsonLeavesOutWhatAParameterDoesNotHave) {
     const Json json = parametersJson(parseDescription(kDocument));
     ASSERT_EQ(3U, json.size());
     EXPECT_EQ("6", json[0]["default"]);
@@ -40,7 +40,7 @@ TEST(DescriptionJson, LeavesOutWhatAParameterDoesNotHave) {
     EXPECT_EQ("long", json[2]["notWith"]["value"]);
 }
 
-TEST(DescriptionJson, DataTypesAreNames) {
+TEST(DescriptionTablesTest, JsonDataTypesAreNames) {
     const Json json = memoryJson(parseDescription(kDocument));
     EXPECT_EQ((Json{"boolean", "unsignedShort"}), json[0]["types"]);
 }

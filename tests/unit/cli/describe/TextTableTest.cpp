@@ -5,23 +5,23 @@
 namespace cli {
 namespace {
 
-TEST(TextTable, ColumnsAreAsWideAsTheirLongestText) {
+TEST(TextTableTest, ColumnsAreAsWideAsTheirLongestText) {
     EXPECT_EQ("A     B\nlong  x\n", textTable({{"A", "B"}, {"long", "x"}}));
 }
 
-TEST(TextTable, LastColumnGoesOnBelowItself) {
+TEST(TextTableTest, LastColumnGoesOnBelowItself) {
     EXPECT_EQ("k  one, two,\n   three\n", textTable({{"k", "one, two, three"}}, 12));
 }
 
-TEST(TextTable, WordsLongerThanTheSpaceAreNotCut) {
+TEST(TextTableTest, WordsLongerThanTheSpaceAreNotCut) {
     EXPECT_EQ("key  abcdefghij\n     kl\n", textTable({{"key", "abcdefghij kl"}}, 8));
 }
 
-TEST(TextTable, EmptyLastTextsLeaveNoBlanksAtTheEnd) {
+TEST(TextTableTest, EmptyLastTextsLeaveNoBlanksAtTheEnd) {
     EXPECT_EQ("a  b\nc\n", textTable({{"a", "b", ""}, {"c", "", ""}}));
 }
 
-TEST(TextTable, NothingIsNothing) {
+TEST(TextTableTest, NothingIsNothing) {
     EXPECT_EQ("", textTable({}));
 }
 
