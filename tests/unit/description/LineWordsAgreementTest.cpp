@@ -60,7 +60,9 @@ std::vector<int> numbersOf(const Words& words) {
     return numbers;
 }
 
-TEST(LineWordsAgreementTest, BaudRatesAreTheSameEverywhere) {
+using LineWordsAgreementTest = driver_test::DriverTest;
+
+TEST_F(LineWordsAgreementTest, BaudRatesAreTheSameEverywhere) {
     constexpr int kFast = 4'000'000;
     const std::vector<int> rates = numbersOf(offered("baudrate"));
     EXPECT_EQ(11U, rates.size());
@@ -71,7 +73,7 @@ TEST(LineWordsAgreementTest, BaudRatesAreTheSameEverywhere) {
         EXPECT_EQ(std::to_string(word.code), word.word);
 }
 
-TEST(LineWordsAgreementTest, ParityWordsStandForTheSameCodes) {
+TEST_F(LineWordsAgreementTest, ParityWordsStandForTheSameCodes) {
     for (const cli::SettingWord& word : overridable("parity").words)
         EXPECT_EQ(word.word, _MRTU::parityWord(static_cast<int>(word.code)));
     // The tools offer fewer than the driver takes, and the driver's configuration fewer than codes.
@@ -81,14 +83,14 @@ TEST(LineWordsAgreementTest, ParityWordsStandForTheSameCodes) {
     EXPECT_EQ((Words{"none", "even", "odd", "mark", "space"}), wordsOf("parity"));
 }
 
-TEST(LineWordsAgreementTest, PortTakesEveryParityThatHasAWord) {
+TEST_F(LineWordsAgreementTest, PortTakesEveryParityThatHasAWord) {
     std::vector<int> codes;
     for (const cli::SettingWord& word : overridable("parity").words)
         codes.push_back(static_cast<int>(word.code));
     EXPECT_EQ(codes, accepted(9, [](int parity) { return portTakes({.parity = parity}); }));
 }
 
-TEST(LineWordsAgreementTest, ModesAreTheSameEverywhere) {
+TEST_F(LineWordsAgreementTest, ModesAreTheSameEverywhere) {
     EXPECT_EQ(offered("mode"), wordsOf("mode"));
     for (const cli::SettingWord& word : overridable("mode").words) {
         EXPECT_EQ(static_cast<int>(word.code), _MRTU::modeCode(word.word));
@@ -100,7 +102,7 @@ TEST(LineWordsAgreementTest, ModesAreTheSameEverywhere) {
     EXPECT_STREQ("RS-485P", _MRTU::modeWord(3));
 }
 
-TEST(LineWordsAgreementTest, StopBitsAndDataBitsAreTheSameEverywhere) {
+TEST_F(LineWordsAgreementTest, StopBitsAndDataBitsAreTheSameEverywhere) {
     const std::vector<int> stopBits = numbersOf(offered("stopbits"));
     EXPECT_EQ(stopBits, numbersOf(wordsOf("stop")));
     EXPECT_EQ(stopBits, accepted(9, [](int bits) { return portTakes({.stopBits = bits}); }));
@@ -108,16 +110,14 @@ TEST(LineWordsAgreementTest, StopBitsAndDataBitsAreTheSameEverywhere) {
               accepted(9, [](int bits) { return portTakes({.dataBits = bits}); }));
 }
 
-TEST(LineWordsAgreementTest, AreasThatStageSettingsAreDescribed) {
+TEST_F(LineWordsAgreementTest, AreasThatStageSettingsAreDescribed) {
     for (const cli::SerialSetting& setting : cli::serialSettings()) {
         const auto area = childWithText(root().child("memtypes"), std::string(setting.area));
         EXPECT_FALSE(area.empty()) << setting.area;
     }
 }
 
-class LineAreasAgreementTest : public driver_test::DriverTest {};
-
-TEST_F(LineAreasAgreementTest, DriverStagesExactlyWhatHasAWord) {
+TEST_F(LineWordsAgreementTest, DriverStagesExactlyWhatHasAWord) {
     start();
     for (const std::string name : {"parity", "stop", "mode"}) {
         const cli::SerialSetting& setting = overridable(name);
