@@ -5,15 +5,15 @@
 
 namespace {
 
-constexpr unsigned char block[] = {
+constexpr unsigned char kBlock[] = {
 #include "description/DescriptionBlock.inc"
 };
 
-constexpr auto markerEnd = std::find(std::begin(block), std::end(block), 0);
-static_assert(markerEnd != std::end(block), "the marker line must end in a zero byte");
+constexpr auto kMarkerEnd = std::find(std::begin(kBlock), std::end(kBlock), 0);
+static_assert(kMarkerEnd != std::end(kBlock), "the marker line must end in a zero byte");
 
 }  // namespace
 
 const unsigned char* GetXml_MRTU() {
-    return std::next(markerEnd);
+    return std::next(kMarkerEnd);
 }

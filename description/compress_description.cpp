@@ -16,9 +16,9 @@ namespace {
 
 // The fields behind the marker, separated by "?": the protocol's short name, its display name, the
 // version of the description and the platform.
-const std::string startLine =
+const std::string kStartLine =
     "<<ICOM_XML_START>>Name=MRTU?FullName=Modbus RTU?Version=126?Platform=KV58_LIN";
-const std::string endLine = "<<ICOM_XML_END>>";
+const std::string kEndLine = "<<ICOM_XML_END>>";
 
 [[noreturn]] void fail(const std::string& message) {
     std::fprintf(stderr, "compress_description: %s\n", message.c_str());
@@ -49,16 +49,16 @@ std::string compressed(const std::string& document) {
 /// not, since its length is known.
 std::string framed(const std::string& stream) {
     const std::string zero(1, '\0');
-    return startLine + zero + "compressedXML=" + std::to_string(stream.size()) + zero + stream +
-           endLine + zero;
+    return kStartLine + zero + "compressedXML=" + std::to_string(stream.size()) + zero + stream +
+           kEndLine + zero;
 }
 
 void writeArray(const char* path, const std::string& block) {
-    constexpr std::size_t bytesPerLine = 16;
+    constexpr std::size_t kBytesPerLine = 16;
     std::ofstream file(path);
     for (std::size_t i = 0; i < block.size(); ++i) {
         const unsigned value = static_cast<unsigned char>(block[i]);
-        file << value << (i % bytesPerLine == bytesPerLine - 1 ? ",\n" : ",");
+        file << value << (i % kBytesPerLine == kBytesPerLine - 1 ? ",\n" : ",");
     }
     file << '\n';
     file.close();

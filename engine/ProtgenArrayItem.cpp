@@ -86,7 +86,7 @@ int ProtgenProtocol::writeArrayItem(const ITag* tag, int index, const unsigned c
     const ProtgenTag& target = *static_cast<const ProtgenTag*>(tag);
     if (target.memoryType() == nullptr) return ProtocolBase::writeArrayItem(tag, index, value);
     if (!itemsAreAddressed(target, true)) {
-        const WriteTurn turn(writeTurns_, target, WriteTurn::change);
+        const WriteTurn turn(writeTurns_, target, WriteTurn::Change);
         return ProtocolBase::writeArrayItem(tag, index, value);
     }
     if (!arrayItemInRange(tag, index)) return 0;
@@ -97,7 +97,7 @@ int ProtgenProtocol::writeArrayItem(const ITag* tag, int index, const unsigned c
     const engine::Footprint& place = image.place();
     const bool readFirst = place.partial || image.hasPartners();
 
-    const WriteTurn turn(writeTurns_, target, readFirst ? WriteTurn::change : WriteTurn::free);
+    const WriteTurn turn(writeTurns_, target, readFirst ? WriteTurn::Change : WriteTurn::Free);
     if (readFirst && !readItems(target, place.address, image.items(), place.count)) return 0;
     if (image.hasPartners() && !image.toRunTime())
         return conversionFailed(tag, "read conversion error");

@@ -42,9 +42,9 @@ ProtgenTag::ProtgenTag(const char* uri, const char* const* fieldNames) {
 void ProtgenTag::takeAddress(const char* const* fieldNames) {
     const std::string address = addressField(uri_, fieldNames);
     const std::size_t dot = address.find('.');
-    offset_ = ProtUtilsN::ParseInteger(address.substr(0, dot).c_str());
+    offset_ = ProtUtilsN::parseInteger(address.substr(0, dot).c_str());
     if (dot == std::string::npos) return;
-    subIndex_ = ProtUtilsN::ParseInteger(address.substr(dot + 1).c_str());
+    subIndex_ = ProtUtilsN::parseInteger(address.substr(dot + 1).c_str());
 }
 
 ITag* ProtgenTag::Clone() const {

@@ -17,7 +17,7 @@ int ProtgenProtocol::Write(const ITag* tag, const unsigned char* value) {
     if (image.data() == nullptr) return fail(-1, "Out of memory");
     unsigned char* items = image.data() + place.firstByte();
 
-    const WriteTurn turn(writeTurns_, target, place.partial ? WriteTurn::change : WriteTurn::free);
+    const WriteTurn turn(writeTurns_, target, place.partial ? WriteTurn::Change : WriteTurn::Free);
     const bool readFirst = place.partial && engine::declaredBlock(target, true) != 0;
     if (readFirst && !readItems(target, place.address, items, place.count)) return 0;
     if (!target.ConvertVariable(value, image.data(), true)) {
@@ -37,7 +37,7 @@ int ProtgenProtocol::WriteBlock(const ITag* tag, const unsigned char* data, int 
     ImageBuffer image(items * itemLength);
     if (image.data() == nullptr) return fail(-1, "Out of memory");
 
-    const WriteTurn turn(writeTurns_, target, WriteTurn::change);
+    const WriteTurn turn(writeTurns_, target, WriteTurn::Change);
     const bool readFirst = engine::declaredBlock(target, true) != 0;
     if (readFirst && !readItems(target, target.offset(), image.data(), items)) return 0;
     std::memcpy(image.data(), data, static_cast<std::size_t>(length));
@@ -61,7 +61,7 @@ bool ProtgenProtocol::writeItems(const ProtgenTag& tag, int address, const unsig
     for (const Blocks::Block block : Blocks(count, requestLimit(tag, count, true))) {
         const int index = address + block.first;
         const int byte = engine::byteOfItem(tag, address, block.first);
-        const WriteTurn turn(writeTurns_, tag, WriteTurn::request);
+        const WriteTurn turn(writeTurns_, tag, WriteTurn::Request);
         const int done = tag.inBitMemory() ? doWriteBits(&tag, index, data + byte, block.count)
                                            : doWrite(&tag, index, data + byte, block.count);
         if (done == 0) return false;

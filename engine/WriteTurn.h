@@ -13,7 +13,7 @@ class WriteTurn : public WriteTurns::Turn {
 
     WriteTurn(WriteTurns& turns, const ProtgenTag& tag, WriteTurns::Kind kind)
         : Turn(turns, {tag.nodeId(), tag.memoryType()->nameRef()},
-               declaredBlock(tag, true) == 0 ? free : kind) {}
+               declaredBlock(tag, true) == 0 ? Free : kind) {}
 };
 
 }  // namespace engine

@@ -4,13 +4,13 @@ namespace engine {
 
 WriteTurns::Turn::Turn(WriteTurns& turns, const WritePlace& place, Kind kind)
     : turns_(turns), place_(place), kind_(kind) {
-    if (kind_ == Kind::free) return;
+    if (kind_ == Kind::Free) return;
     turns_.enlist(*this);
     granted_.wait(0);
 }
 
 WriteTurns::Turn::~Turn() {
-    if (kind_ != Kind::free) turns_.strike(*this);
+    if (kind_ != Kind::Free) turns_.strike(*this);
 }
 
 void WriteTurns::enlist(Turn& turn) {
@@ -42,7 +42,7 @@ bool WriteTurns::mayHave(const Turn& turn) const {
     for (const Turn* other = first_; other != &turn; other = other->next_) {
         if (other->place_ != turn.place_) continue;
         if (other->thread_ == turn.thread_ && other->granted_ != 0) return true;
-        if (other->kind_ == Kind::change || turn.kind_ == Kind::change) free = false;
+        if (other->kind_ == Kind::Change || turn.kind_ == Kind::Change) free = false;
     }
     return free;
 }

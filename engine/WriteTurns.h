@@ -26,9 +26,9 @@ struct WritePlace {
 class WriteTurns {
   public:
     enum class Kind {
-        free,     ///< Waits for nobody, and nobody for it.
-        request,  ///< One request that writes whole items.
-        change,   ///< A read, and the write back that depends on it.
+        Free,     ///< Waits for nobody, and nobody for it.
+        Request,  ///< One request that writes whole items.
+        Change,   ///< A read, and the write back that depends on it.
     };
 
     /// Has the turn from its construction, which waits for it, to its destruction.

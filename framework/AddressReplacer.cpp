@@ -181,5 +181,5 @@ std::string AddressReplacerID::toString(int address) const {
 }
 
 int AddressReplacerID::fromString(const std::string& text) const {
-    return ProtUtilsN::ParseInteger(text.c_str());
+    return ProtUtilsN::parseInteger(text.c_str());
 }

@@ -7,7 +7,7 @@
 
 namespace {
 
-using ProtUtilsN::IsWhiteSpace;
+using ProtUtilsN::isWhiteSpace;
 
 std::size_t hashOf(std::string_view name) {
     return std::hash<std::string_view>{}(name);
@@ -18,7 +18,7 @@ std::size_t hashOf(std::string_view name) {
 CfgItems::CfgItems(std::string_view text) {
     std::size_t begin = 0;
     for (std::size_t at = 0; at <= text.size(); ++at) {
-        if (at < text.size() && !IsWhiteSpace(text[at])) continue;
+        if (at < text.size() && !isWhiteSpace(text[at])) continue;
         addItem(text, begin, at);
         begin = at + 1;
     }
@@ -49,5 +49,5 @@ std::optional<std::string_view> CfgItems::find(std::string_view text, std::strin
 
 bool CfgItems::isName(std::string_view name) {
     return std::none_of(name.begin(), name.end(),
-                        [](char each) { return each == '=' || IsWhiteSpace(each); });
+                        [](char each) { return each == '=' || isWhiteSpace(each); });
 }

@@ -23,18 +23,18 @@ constexpr std::string_view kBlank = "&nbsp;";
 std::optional<std::string_view> scanFor(std::string_view text, const std::string& name) {
     const std::string key = name + "=";
     std::size_t at = text.find(key);
-    while (at != std::string_view::npos && at != 0 && !ProtUtilsN::IsWhiteSpace(text[at - 1])) {
+    while (at != std::string_view::npos && at != 0 && !ProtUtilsN::isWhiteSpace(text[at - 1])) {
         at = text.find(key, at + 1);
     }
     if (at == std::string_view::npos) return std::nullopt;
 
     text.remove_prefix(at + key.size());
-    const auto* const end = std::find_if(text.begin(), text.end(), ProtUtilsN::IsWhiteSpace);
+    const auto* const end = std::find_if(text.begin(), text.end(), ProtUtilsN::isWhiteSpace);
     return text.substr(0, static_cast<std::size_t>(end - text.begin()));
 }
 
 std::size_t skipDigits(const std::string& text, std::size_t at) {
-    while (at < text.size() && ProtUtilsN::IsDecimalDigit(text[at])) {
+    while (at < text.size() && ProtUtilsN::isDecimalDigit(text[at])) {
         ++at;
     }
     return at;
@@ -45,13 +45,13 @@ std::string nodeName(int node, const char* name) {
 }
 
 CfgParser::parseResult deliver(const char* found, std::string& value) {
-    if (found == nullptr) return CfgParser::notFound;
+    if (found == nullptr) return CfgParser::NotFound;
     value = found;
-    return CfgParser::found;
+    return CfgParser::Found;
 }
 
 bool decode(const std::string& raw, int& value) {
-    value = ProtUtilsN::ParseInteger(raw.c_str());
+    value = ProtUtilsN::parseInteger(raw.c_str());
     return true;
 }
 
@@ -80,7 +80,7 @@ void CfgParser::collectNodes() {
         const std::size_t digits = at + kNode.size();
         const std::size_t end = skipDigits(text_, digits);
         if (text_.compare(end, kNodeEnd.size(), kNodeEnd) == 0) {
-            const int id = ProtUtilsN::ParseDecimal(text_.substr(digits, end - digits).c_str());
+            const int id = ProtUtilsN::parseDecimal(text_.substr(digits, end - digits).c_str());
             if (known.insert(id).second) nodeIds_.push_back(id);
         }
         at = text_.find(kNode, end);
@@ -101,19 +101,19 @@ const char* CfgParser::GetParam(const char* name) {
 
 CfgParser::parseResult CfgParser::getParam(const char* name, int node, std::string& value,
                                            int flags) {
-    const bool mustBeCommon = (flags & commonOnly) != 0;
-    const bool mustBePrefixed = (flags & nodeOnly) != 0;
-    if (mustBeCommon && mustBePrefixed) return invalidFlags;
+    const bool mustBeCommon = (flags & CommonOnly) != 0;
+    const bool mustBePrefixed = (flags & NodeOnly) != 0;
+    if (mustBeCommon && mustBePrefixed) return InvalidFlags;
 
     if (node != -1) {
         const char* own = GetParam(nodeName(node, name).c_str());
-        if (own != nullptr && mustBeCommon) return cannotBePrefixed;
+        if (own != nullptr && mustBeCommon) return CannotBePrefixed;
         return deliver(own != nullptr ? own : GetParam(name), value);
     }
 
     const char* common = GetParam(name);
     if (mustBePrefixed && !nodeIds_.empty()) {
-        return common != nullptr ? cannotBeNodeIndependent : notGiven;
+        return common != nullptr ? CannotBeNodeIndependent : NotGiven;
     }
     return deliver(common, value);
 }
@@ -128,23 +128,23 @@ struct MessageRow {
 };
 
 constexpr std::array kMessages{
-    MessageRow{CfgParser::found, "has unknown error"},
-    MessageRow{CfgParser::notGiven, "has unknown error"},
-    MessageRow{CfgParser::notFound, "is not found"},
-    MessageRow{CfgParser::illegalValue, "has illegal value"},
-    MessageRow{CfgParser::cannotBePrefixed, "can't be prefixed"},
-    MessageRow{CfgParser::cannotBeNodeIndependent, "can't be node independent"},
-    MessageRow{CfgParser::invalidFlags, "has invalid internal specification"},
+    MessageRow{CfgParser::Found, "has unknown error"},
+    MessageRow{CfgParser::NotGiven, "has unknown error"},
+    MessageRow{CfgParser::NotFound, "is not found"},
+    MessageRow{CfgParser::IllegalValue, "has illegal value"},
+    MessageRow{CfgParser::CannotBePrefixed, "can't be prefixed"},
+    MessageRow{CfgParser::CannotBeNodeIndependent, "can't be node independent"},
+    MessageRow{CfgParser::InvalidFlags, "has invalid internal specification"},
 };
 
-constexpr bool RowsMatchResults() {
+constexpr bool rowsMatchResults() {
     for (std::size_t i = 0; i < kMessages.size(); ++i) {
         if (static_cast<std::size_t>(kMessages[i].result) != i) return false;
     }
     return true;
 }
-static_assert(kMessages.size() == CfgParser::invalidFlags + 1);
-static_assert(RowsMatchResults());
+static_assert(kMessages.size() == CfgParser::InvalidFlags + 1);
+static_assert(rowsMatchResults());
 
 std::string_view tailOf(CfgParser::parseResult result) {
     const auto* row = std::find_if(kMessages.begin(), kMessages.end(),
@@ -179,10 +179,10 @@ bool readParam(CfgParser& parser, const char* name, int node, Value& value, int 
                bool optional, std::string& error) {
     std::string raw;
     CfgParser::parseResult result = parser.getParam(name, node, raw, flags);
-    if (result == CfgParser::found && !decode(raw, value)) result = CfgParser::illegalValue;
+    if (result == CfgParser::Found && !decode(raw, value)) result = CfgParser::IllegalValue;
 
-    if (result == CfgParser::found || result == CfgParser::notGiven) return true;
-    if (result == CfgParser::notFound && optional) return true;
+    if (result == CfgParser::Found || result == CfgParser::NotGiven) return true;
+    if (result == CfgParser::NotFound && optional) return true;
     error = CfgParserN::getErrorString(result, name);
     return false;
 }

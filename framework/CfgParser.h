@@ -13,17 +13,17 @@
 class CfgParser {
   public:
     enum parseResult {
-        found = 0,
-        notGiven = 1,  ///< A node parameter asked for without a node, where nodes have their own.
-        notFound = 2,
-        illegalValue = 3,
-        cannotBePrefixed = 4,
-        cannotBeNodeIndependent = 5,
-        invalidFlags = 6,
+        Found = 0,
+        NotGiven = 1,  ///< A node parameter asked for without a node, where nodes have their own.
+        NotFound = 2,
+        IllegalValue = 3,
+        CannotBePrefixed = 4,
+        CannotBeNodeIndependent = 5,
+        InvalidFlags = 6,
     };
 
     /// Bits of the lookup flags.
-    enum lookupFlags { anyPlace = 0, commonOnly = 1, nodeOnly = 2 };
+    enum LookupFlags { AnyPlace = 0, CommonOnly = 1, NodeOnly = 2 };
 
     /// Never fails; see KnownFormat().
     explicit CfgParser(const char* text);
@@ -41,7 +41,7 @@ class CfgParser {
     const char* GetParam(const char* name);
 
     /// Looks a parameter up for a node (-1: for none); a node's request falls back to the common
-    /// value. `value` is stored only when the result is `found`.
+    /// value. `value` is stored only when the result is `Found`.
     parseResult getParam(const char* name, int node, std::string& value, int flags);
 
   private:

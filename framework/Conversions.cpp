@@ -162,7 +162,7 @@ constexpr std::array kConversions{
 
 }  // namespace
 
-bool ApplyConversion(unsigned char* buf, const char* name, const ConversionShape& shape,
+bool applyConversion(unsigned char* buf, const char* name, const ConversionShape& shape,
                      bool toDevice) {
     if (name == nullptr) return false;
     const std::string_view wanted(name);

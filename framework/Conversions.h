@@ -17,7 +17,7 @@ struct ConversionShape {
 /// @param toDevice  True on the way to the device; only "bcd" depends on it.
 /// @return false, with `buf` in an unspecified state, when the conversion does not exist or refuses
 /// the value.
-bool ApplyConversion(unsigned char* buf, const char* name, const ConversionShape& shape,
+bool applyConversion(unsigned char* buf, const char* name, const ConversionShape& shape,
                      bool toDevice);
 
 }  // namespace ProtUtilsN

@@ -58,7 +58,7 @@ constexpr int dataLength(ICU_Type type) {
     return kDataLengths[static_cast<std::size_t>(code)];
 }
 
-constexpr bool RowsMatchCodes() {
+constexpr bool rowsMatchCodes() {
     for (std::size_t i = 0; i < DataTypes.size(); ++i) {
         const auto code = static_cast<std::int32_t>(DataTypes[i].type);
         if (code != static_cast<std::int32_t>(i) + 1) return false;
@@ -66,11 +66,11 @@ constexpr bool RowsMatchCodes() {
     }
     return true;
 }
-static_assert(RowsMatchCodes());
+static_assert(rowsMatchCodes());
 
 // The dash, the element type and the missing fixed length go together; only the object has none of
 // them, and no length either.
-constexpr bool ArraysHaveElements() {
+constexpr bool arraysHaveElements() {
     for (const DataType& row : DataTypes) {
         if (row.typeString.empty()) return false;
         const bool array = row.typeString.back() == '-';
@@ -81,15 +81,15 @@ constexpr bool ArraysHaveElements() {
     }
     return true;
 }
-static_assert(ArraysHaveElements());
+static_assert(arraysHaveElements());
 
-constexpr bool BothTablesAgree() {
+constexpr bool bothTablesAgree() {
     for (const DataType& row : DataTypes) {
         if (dataLength(row.type) != row.fixedLength) return false;
     }
     return true;
 }
-static_assert(BothTablesAgree());
+static_assert(bothTablesAgree());
 
 const DataType* findRow(ICU_Type type) {
     const auto* row = std::find_if(DataTypes.begin(), DataTypes.end(),
@@ -135,7 +135,7 @@ bool GetICOMType(const std::string& text, ICU_Type& type, ICU_Type& elementType,
     std::int32_t count = 1;
     const std::size_t dash = name.find('-');
     if (dash != std::string::npos) {
-        count = ParseDecimal(name.c_str() + dash + 1);
+        count = parseDecimal(name.c_str() + dash + 1);
         name.erase(dash + 1);
     }
 

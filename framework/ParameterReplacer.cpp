@@ -57,7 +57,7 @@ void takeStored(const std::string& section, const std::string& key,
                 ParameterReplacer::Variant& value) {
     IPermanentStorage* store = storage();
     if (store == nullptr || store->hasKey(section.c_str(), key.c_str()) == 0) return;
-    if (value.type == ParameterReplacer::integer) {
+    if (value.type == ParameterReplacer::Integer) {
         value.intValue = store->readInt(section.c_str(), key.c_str());
     } else {
         value.boolValue = store->readBool(section.c_str(), key.c_str());
@@ -71,9 +71,9 @@ void putStored(const std::string& section, const std::string& key,
     if (store == nullptr) return;
     const char* place = section.c_str();
     const char* name = key.c_str();
-    if (value.type == ParameterReplacer::integer) store->writeInt(place, name, value.intValue);
-    if (value.type == ParameterReplacer::boolean) store->writeBool(place, name, value.boolValue);
-    if (value.type == ParameterReplacer::text) {
+    if (value.type == ParameterReplacer::Integer) store->writeInt(place, name, value.intValue);
+    if (value.type == ParameterReplacer::Boolean) store->writeBool(place, name, value.boolValue);
+    if (value.type == ParameterReplacer::Text) {
         store->writeString(place, name, value.stringValue.c_str());
     }
 }
@@ -115,7 +115,7 @@ ParameterReplacer::Opened ParameterReplacer::open(const char* section,
     for (const Default& each : wanted) {
         if (isCached(each.name)) continue;
         const auto place = opened.values.try_emplace(each.name).first;
-        place->second.type = integer;
+        place->second.type = Integer;
         place->second.intValue = each.value;
         takeStored(opened.section, place->first, place->second);
     }
@@ -147,14 +147,14 @@ ParameterReplacer::Number ParameterReplacer::lookUp(std::string_view name, int n
 
 void ParameterReplacer::get(std::string_view name, int node, int fallback, int& out) {
     Variant value;
-    value.type = integer;
+    value.type = Integer;
     value.intValue = fallback;
     out = lookUp(name, node, value).intValue;
 }
 
 void ParameterReplacer::get(std::string_view name, int node, bool fallback, bool& out) {
     Variant value;
-    value.type = boolean;
+    value.type = Boolean;
     value.boolValue = fallback;
     out = lookUp(name, node, value).boolValue;
 }
@@ -199,7 +199,7 @@ void ParameterReplacer::store(Values values) {
 
 void GroupParameterReplacer::set(const std::string& name, int group, int value) {
     Variant staged;
-    staged.type = ParameterReplacer::integer;
+    staged.type = ParameterReplacer::Integer;
     staged.name = name;
     staged.intValue = value;
     staged.group = group;

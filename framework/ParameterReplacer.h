@@ -15,10 +15,10 @@
 /// neither is consulted again.
 class ParameterReplacer {
   public:
-    enum VariantType { boolean = 0, integer = 1, text = 2 };
+    enum VariantType { Boolean = 0, Integer = 1, Text = 2 };
 
     struct Variant {
-        int type = boolean;
+        int type = Boolean;
         bool boolValue = false;
         int intValue = 0;
         std::string stringValue;
@@ -86,7 +86,7 @@ class ParameterReplacer {
 class GroupParameterReplacer {
   public:
     struct Variant {
-        int type = ParameterReplacer::boolean;
+        int type = ParameterReplacer::Boolean;
         std::string name;  ///< The plain parameter name, the key under which it is committed.
         bool boolValue = false;
         int intValue = 0;

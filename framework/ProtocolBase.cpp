@@ -149,7 +149,7 @@ void ProtocolBase::SetTagError(const TagBase* tag) noexcept {
         return;
     }
     const std::string_view parts[] = {"Tag URI error: ", orEmpty(tag->GetVarName()), " - ",
-                                      tag->GetError()};
+                                      tag->getError()};
     if (!error_.setQuoting(-1, parts)) outOfMemory();
 }
 

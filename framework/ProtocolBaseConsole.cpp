@@ -30,7 +30,7 @@ constexpr int kRoomBeforeByte = 4;
 
 /// @return 1, the result of every recognised command.
 int reply(char* answer, const char* text, int size) {
-    ProtUtilsN::CopyBounded(answer, text != nullptr ? text : "", size);
+    ProtUtilsN::copyBounded(answer, text != nullptr ? text : "", size);
     return 1;
 }
 
@@ -93,7 +93,7 @@ int ProtocolBase::DoCommand(const char* command, char* answer, int size) {
     // The word is told without memory, so that what it stands for is recognised at any time.
     std::string_view line = command;
     bool more = false;
-    const std::string_view word = ProtUtilsN::TakePiece(line, ' ', more);
+    const std::string_view word = ProtUtilsN::takePiece(line, ' ', more);
     if (word == "help") return reply(answer, kHelp, size);
     if (word == "info") return commandInfo(answer, size);
     // The copy ends at the first zero, so only the line in front of the compressed text is shown.

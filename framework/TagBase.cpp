@@ -51,7 +51,7 @@ bool TagBase::Convert(const unsigned char* src, unsigned char* dst, bool toDevic
 }
 
 bool TagBase::wasShortOfMemory() const {
-    return std::strcmp(GetError(), kOutOfMemory) == 0;
+    return std::strcmp(getError(), kOutOfMemory) == 0;
 }
 
 bool TagBase::toDeviceForm(const unsigned char* src, unsigned char* dst,
@@ -109,5 +109,5 @@ bool TagBase::DoConversion(unsigned char* buf, const char* name, bool toDevice) 
     const ProtUtilsN::ConversionShape shape{GetVarLength(), ProtUtilsN::GetBasicLength(this),
                                             ProtUtilsN::GetItemCount(this),
                                             ProtUtilsN::GetBasicType(this)};
-    return ProtUtilsN::ApplyConversion(buf, name, shape, toDevice);
+    return ProtUtilsN::applyConversion(buf, name, shape, toDevice);
 }

@@ -23,7 +23,7 @@ class TagBase : public ITag {
     /// "Out of memory" takes the place of a new text that finds none. Never throws.
     void SetError(const char* text) const;
     /// @return the last text; readable and unchanged as long as the tag lives.
-    const char* GetError() const { return error_.get(); }
+    const char* getError() const { return error_.get(); }
     /// Whether the last error was a lack of memory.
     bool wasShortOfMemory() const;
 

@@ -16,7 +16,7 @@ namespace {
 constexpr std::string_view kTrimmed = " \t";
 
 bool isLetterOrDigit(char c) {
-    return IsDecimalDigit(c) || (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
+    return isDecimalDigit(c) || (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
 }
 
 // strtol() has 64 bits on one architecture and 32 on the other: the clamp makes both agree.
@@ -28,7 +28,7 @@ std::int32_t parseClamped(const char* text, int base) {
 
 // Chosen here, since newer libraries read "0b1" as a binary number when strtol() chooses.
 int baseOf(const char* text) {
-    while (IsWhiteSpace(*text)) {
+    while (isWhiteSpace(*text)) {
         ++text;
     }
     if (*text == '+' || *text == '-') ++text;
@@ -38,11 +38,11 @@ int baseOf(const char* text) {
 
 }  // namespace
 
-bool IsWhiteSpace(char c) {
+bool isWhiteSpace(char c) {
     return c == ' ' || (c >= '\t' && c <= '\r');
 }
 
-bool IsDecimalDigit(char c) {
+bool isDecimalDigit(char c) {
     return c >= '0' && c <= '9';
 }
 
@@ -58,7 +58,7 @@ std::string GetTrim(const std::string& text) {
     return trimmed;
 }
 
-std::string_view TakePiece(std::string_view& rest, char delimiter, bool& more) {
+std::string_view takePiece(std::string_view& rest, char delimiter, bool& more) {
     const std::size_t end = rest.find(delimiter);
     more = end != std::string_view::npos;
     const std::string_view piece = rest.substr(0, end);
@@ -71,7 +71,7 @@ std::string_view TakePiece(std::string_view& rest, char delimiter, bool& more) {
 void ParseSubstrings(const std::string& text, std::vector<std::string>& pieces, char delimiter) {
     std::string_view rest = text;
     for (bool more = true; more;)
-        pieces.emplace_back(TakePiece(rest, delimiter, more));
+        pieces.emplace_back(takePiece(rest, delimiter, more));
 }
 
 bool GetConfigValue(const char* text, const char* key, std::string& value) {
@@ -88,15 +88,15 @@ bool GetConfigValue(const char* text, const char* key, std::string& value) {
     return true;
 }
 
-std::int32_t ParseInteger(const char* text) {
+std::int32_t parseInteger(const char* text) {
     return parseClamped(text, baseOf(text));
 }
 
-std::int32_t ParseDecimal(const char* text) {
+std::int32_t parseDecimal(const char* text) {
     return parseClamped(text, 10);
 }
 
-void CopyBounded(char* out, const char* text, int size) {
+void copyBounded(char* out, const char* text, int size) {
     if (size < 1) return;
     std::strncpy(out, text, static_cast<std::size_t>(size));
 }

@@ -9,8 +9,8 @@
 namespace ProtUtilsN {
 
 /// The six white-space characters and the ten digits of the "C" locale, whatever the host's is.
-bool IsWhiteSpace(char c);
-bool IsDecimalDigit(char c);
+bool isWhiteSpace(char c);
+bool isDecimalDigit(char c);
 
 /// Removes blanks and tabs (no other white space) from both ends.
 void Trim(std::string& text);
@@ -18,7 +18,7 @@ std::string GetTrim(const std::string& text);
 
 /// Takes the first piece, trimmed, and its delimiter off the front of `rest`. Needs no memory.
 /// @param more  Receives whether there was a delimiter, and so another piece behind it.
-std::string_view TakePiece(std::string_view& rest, char delimiter, bool& more);
+std::string_view takePiece(std::string_view& rest, char delimiter, bool& more);
 
 /// Splits at every delimiter and appends each piece, trimmed, to `pieces`, which is not cleared
 /// first. Empty pieces are kept; an empty text is one empty piece.
@@ -32,13 +32,13 @@ bool GetConfigValue(const char* text, const char* key, std::string& value);
 /// decimal), after optional blanks and sign. Reading stops at the first character that does not
 /// fit; no digits read as 0; a number beyond 32 bits reads as the nearest 32-bit one, on every
 /// architecture.
-std::int32_t ParseInteger(const char* text);
+std::int32_t parseInteger(const char* text);
 /// The same with base 10, whatever the prefix.
-std::int32_t ParseDecimal(const char* text);
+std::int32_t parseDecimal(const char* text);
 
 /// Copies `text` into `out` the way strncpy() does: at most `size` bytes, the rest filled with
 /// zeroes, unterminated when the text has `size` bytes or more. A `size` below 1 writes nothing.
-void CopyBounded(char* out, const char* text, int size);
+void copyBounded(char* out, const char* text, int size);
 
 /// Writes one text behind the other into the caller's buffer until that is full; the rest is
 /// swallowed. Needs no memory.

@@ -34,9 +34,9 @@ void append(Frame& frame, std::uint8_t byte) {
 }
 
 void appendHex(Frame& frame, std::uint8_t byte) {
-    constexpr char digits[] = "0123456789ABCDEF";
-    append(frame, static_cast<std::uint8_t>(digits[byte >> 4]));
-    append(frame, static_cast<std::uint8_t>(digits[byte & 0x0F]));
+    constexpr char kDigits[] = "0123456789ABCDEF";
+    append(frame, static_cast<std::uint8_t>(kDigits[byte >> 4]));
+    append(frame, static_cast<std::uint8_t>(kDigits[byte & 0x0F]));
 }
 
 bool isHexDigit(std::uint8_t character) {
@@ -94,7 +94,8 @@ AsciiBytes decodeAscii(ByteView characters) {
     const std::size_t count = (characters.size() - 4) / 2 + 1;
     const ByteView digits = characters.subspan(1, 2 * count);
     for (std::size_t index = 0; index < count; ++index) {
-        const unsigned byte = (nibble(digits[2 * index]) << 4) + nibble(digits[2 * index + 1]);
+        const unsigned upper = nibble(digits[2 * index]);
+        const unsigned byte = (upper << 4) + nibble(digits[2 * index + 1]);
         decoded.bytes[index] = low(byte);
     }
     decoded.length = static_cast<int>(count);

@@ -15,15 +15,15 @@ struct Word {
 };
 
 // Row i stands for code i.
-constexpr std::array parityWords{Word{"none", true}, Word{"even", true}, Word{"odd", true},
-                                 Word{"mark", true}, Word{"space", false}};
-constexpr std::array modeWords{Word{"RS-232", true}, Word{"RS-485", true}, Word{"RS-422", true},
-                               Word{"RS-485P", false}};
+constexpr std::array kParityWords{Word{"none", true}, Word{"even", true}, Word{"odd", true},
+                                  Word{"mark", true}, Word{"space", false}};
+constexpr std::array kModeWords{Word{"RS-232", true}, Word{"RS-485", true}, Word{"RS-422", true},
+                                Word{"RS-485P", false}};
 
-constexpr std::array listedBaudRates{150,  300,   600,   1200,  2400,  4800,
-                                     9600, 19200, 38400, 57600, 115200};
+constexpr std::array kListedBaudRates{150,  300,   600,   1200,  2400,  4800,
+                                      9600, 19200, 38400, 57600, 115200};
 
-constexpr std::array listedStopBits{1, 2};
+constexpr std::array kListedStopBits{1, 2};
 
 template <class List>
 bool holds(const List& list, int number) {
@@ -66,35 +66,35 @@ int interCharacterGap(int baud) {
 }
 
 int parityCode(std::string_view word) {
-    return codeOf(parityWords, word, sameWhenLowered);
+    return codeOf(kParityWords, word, sameWhenLowered);
 }
 
 int modeCode(std::string_view word) {
-    return codeOf(modeWords, word, std::equal_to<std::string_view>());
+    return codeOf(kModeWords, word, std::equal_to<std::string_view>());
 }
 
 const char* parityWord(int code) {
-    return wordOf(parityWords, code);
+    return wordOf(kParityWords, code);
 }
 
 const char* modeWord(int code) {
-    return wordOf(modeWords, code);
+    return wordOf(kModeWords, code);
 }
 
 bool isListedBaudRate(int baud) {
-    return holds(listedBaudRates, baud);
+    return holds(kListedBaudRates, baud);
 }
 
 bool isListedParity(int code) {
-    return isCode(parityWords, code);
+    return isCode(kParityWords, code);
 }
 
 bool isListedStopBits(int bits) {
-    return holds(listedStopBits, bits);
+    return holds(kListedStopBits, bits);
 }
 
 bool isListedMode(int code) {
-    return isCode(modeWords, code) && modeWords[static_cast<std::size_t>(code)].configurable;
+    return isCode(kModeWords, code) && kModeWords[static_cast<std::size_t>(code)].configurable;
 }
 
 }  // namespace _MRTU

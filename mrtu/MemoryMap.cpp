@@ -36,7 +36,7 @@ constexpr MemoryRow own(std::string_view name, ICU_Type natural, std::uint32_t i
 
 // Limits a request: 2000 bits read, 1968 bits written, 125 registers read, 123 registers written;
 // half of that for 32-bit registers. Source: Modbus Application Protocol V1.1b3, 6.1 to 6.12.
-constexpr std::array memoryRows{
+constexpr std::array kMemoryRows{
     MemoryRow{.name = "INP",
               .naturalType = ICU_Type::boolean,
               .icomTypes = kBits,
@@ -46,7 +46,7 @@ constexpr std::array memoryRows{
               .bitRead = true,
               .readOnly = true,
               .readFunction = kReadInputs,
-              .write = WriteChoice::never},
+              .write = WriteChoice::Never},
     MemoryRow{.name = "OUTP",
               .naturalType = ICU_Type::boolean,
               .icomTypes = kBits,
@@ -58,7 +58,7 @@ constexpr std::array memoryRows{
               .bitWrite = true,
               .bitArrayWrite = true,
               .readFunction = kReadCoils,
-              .write = WriteChoice::coils},
+              .write = WriteChoice::Coils},
     MemoryRow{.name = "HREG",
               .naturalType = ICU_Type::unsignedShort,
               .icomTypes = kAnyButTimeAndObject,
@@ -67,7 +67,7 @@ constexpr std::array memoryRows{
               .blockReadCount = 125,
               .blockWriteCount = 123,
               .readFunction = kReadRegisters,
-              .write = WriteChoice::registers},
+              .write = WriteChoice::Registers},
     MemoryRow{.name = "IREG",
               .naturalType = ICU_Type::unsignedShort,
               .icomTypes = kAnyButTimeAndObject,
@@ -76,7 +76,7 @@ constexpr std::array memoryRows{
               .blockReadCount = 125,
               .readOnly = true,
               .readFunction = kReadInputRegisters,
-              .write = WriteChoice::never},
+              .write = WriteChoice::Never},
     MemoryRow{.name = "LONG",
               .naturalType = ICU_Type::unsignedInt,
               .icomTypes = kDoubleWords,
@@ -85,18 +85,18 @@ constexpr std::array memoryRows{
               .blockWriteCount = 61,
               .longRegisters = true,
               .readFunction = kReadRegisters,
-              .write = WriteChoice::single},
-    own("NO", ICU_Type::unsignedByte, kUnsignedByte, 1, 1, DriverArea::nodeOverride),
-    own("NP_Mode", ICU_Type::boolean, kBoolean, 1, 0, DriverArea::modiconMode),
-    own("SP_Baud", ICU_Type::unsignedInt, kUnsignedInt, 0, 0, DriverArea::baud),
-    own("SP_Par", ICU_Type::unsignedByte, kUnsignedByte, 0, 0, DriverArea::parity),
-    own("SP_Stop", ICU_Type::unsignedByte, kUnsignedByte, 0, 0, DriverArea::stopBits),
+              .write = WriteChoice::Single},
+    own("NO", ICU_Type::unsignedByte, kUnsignedByte, 1, 1, DriverArea::NodeOverride),
+    own("NP_Mode", ICU_Type::boolean, kBoolean, 1, 0, DriverArea::ModiconMode),
+    own("SP_Baud", ICU_Type::unsignedInt, kUnsignedInt, 0, 0, DriverArea::Baud),
+    own("SP_Par", ICU_Type::unsignedByte, kUnsignedByte, 0, 0, DriverArea::Parity),
+    own("SP_Stop", ICU_Type::unsignedByte, kUnsignedByte, 0, 0, DriverArea::StopBits),
     // Natural type and mask disagree here, and tools and projects count on both.
-    own("SP_Mode", ICU_Type::boolean, kUnsignedByte, 0, 0, DriverArea::lineMode),
-    own("SP_Done", ICU_Type::boolean, kBoolean, 0, 0, DriverArea::apply),
+    own("SP_Mode", ICU_Type::boolean, kUnsignedByte, 0, 0, DriverArea::LineMode),
+    own("SP_Done", ICU_Type::boolean, kBoolean, 0, 0, DriverArea::Apply),
 };
 
-constexpr std::array addressRanges{
+constexpr std::array kAddressRanges{
     AddressRange{"INP", 10001, 19999, 100001, 165536},
     AddressRange{"OUTP", 1, 9999, 1, 65536},
     AddressRange{"HREG", 40001, 49999, 400001, 465536},
@@ -105,10 +105,10 @@ constexpr std::array addressRanges{
 };
 
 constexpr bool rowsAreComplete() {
-    return std::all_of(memoryRows.begin(), memoryRows.end(), [](const MemoryRow& row) {
-        const bool onTheLine = row.area == DriverArea::none;
+    return std::all_of(kMemoryRows.begin(), kMemoryRows.end(), [](const MemoryRow& row) {
+        const bool onTheLine = row.area == DriverArea::None;
         return !row.name.empty() && row.icomTypes != 0 && onTheLine == (row.readFunction != 0) &&
-               row.readOnly == (row.write == WriteChoice::never);
+               row.readOnly == (row.write == WriteChoice::Never);
     });
 }
 static_assert(rowsAreComplete());
@@ -123,9 +123,9 @@ constexpr auto findRow(const Rows& rows, std::string_view name) {
 // Without an address range every tag of the area would be refused; a range without its area is
 // dead.
 constexpr bool areasOnTheLineHaveRanges() {
-    return std::all_of(memoryRows.begin(), memoryRows.end(), [](const MemoryRow& row) {
-        const AddressRange* range = findRow(addressRanges, row.name);
-        if (row.area != DriverArea::none) return range == nullptr;
+    return std::all_of(kMemoryRows.begin(), kMemoryRows.end(), [](const MemoryRow& row) {
+        const AddressRange* range = findRow(kAddressRanges, row.name);
+        if (row.area != DriverArea::None) return range == nullptr;
         return range != nullptr && range->longMin == row.range.min &&
                range->longMax == row.range.max;
     });
@@ -133,8 +133,8 @@ constexpr bool areasOnTheLineHaveRanges() {
 static_assert(areasOnTheLineHaveRanges());
 
 constexpr bool rangesHaveAreas() {
-    return std::all_of(addressRanges.begin(), addressRanges.end(), [](const AddressRange& range) {
-        return findRow(memoryRows, range.name) != nullptr;
+    return std::all_of(kAddressRanges.begin(), kAddressRanges.end(), [](const AddressRange& range) {
+        return findRow(kMemoryRows, range.name) != nullptr;
     });
 }
 static_assert(rangesHaveAreas());
@@ -144,7 +144,7 @@ constexpr bool namesDiffer(const Rows& rows) {
     return std::all_of(rows.begin(), rows.end(),
                        [&](const auto& row) { return findRow(rows, row.name) == &row; });
 }
-static_assert(namesDiffer(memoryRows) && namesDiffer(addressRanges) && namesDiffer(models));
+static_assert(namesDiffer(kMemoryRows) && namesDiffer(kAddressRanges) && namesDiffer(kModels));
 
 MemoryType memoryTypeFor(const MemoryRow& row, const ModelRow& model) {
     const int shift = row.numbered && model.zeroBased ? 1 : 0;
@@ -165,22 +165,22 @@ MemoryType memoryTypeFor(const MemoryRow& row, const ModelRow& model) {
 
 }  // namespace
 
-constexpr std::span<const AddressRange> table = addressRanges;
+constexpr std::span<const AddressRange> table = kAddressRanges;
 
 const MemoryRow* memoryRow(std::string_view name) {
-    return findRow(memoryRows, name);
+    return findRow(kMemoryRows, name);
 }
 
 const AddressRange* addressRange(std::string_view name) {
-    return findRow(addressRanges, name);
+    return findRow(kAddressRanges, name);
 }
 
 void registerModels(MemoryManager& manager) {
-    for (const ModelRow& row : models) {
+    for (const ModelRow& row : kModels) {
         Model model{std::string(row.name)};
         model.setMaxDatagramItems(0);
         model.setMaxDatagramLength(0);
-        for (const MemoryRow& memory : memoryRows)
+        for (const MemoryRow& memory : kMemoryRows)
             if (row.longRegisters || !memory.longRegisters)
                 model.addMemoryType(memoryTypeFor(memory, row));
         manager.addModel(model);

@@ -11,23 +11,23 @@ namespace _MRTU {
 
 /// The areas that the driver itself serves; they never reach the line.
 enum class DriverArea : std::uint8_t {
-    none,
-    nodeOverride,  // "NO"
-    modiconMode,   // "NP_Mode"
-    baud,          // "SP_Baud"
-    parity,        // "SP_Par"
-    stopBits,      // "SP_Stop"
-    lineMode,      // "SP_Mode"
-    apply,         // "SP_Done"
+    None,
+    NodeOverride,  // "NO"
+    ModiconMode,   // "NP_Mode"
+    Baud,          // "SP_Baud"
+    Parity,        // "SP_Par"
+    StopBits,      // "SP_Stop"
+    LineMode,      // "SP_Mode"
+    Apply,         // "SP_Done"
 };
 
 /// How an area's write function code is chosen.
 enum class WriteChoice : std::uint8_t {
-    keep,       ///< The tag keeps what it has.
-    never,      ///< 0: the area cannot be written.
-    coils,      ///< 15, or 5 after the node's forceFunction.
-    registers,  ///< 16, or 6 after the node's presetFunction.
-    single,     ///< 6, whatever the node says.
+    Keep,       ///< The tag keeps what it has.
+    Never,      ///< 0: the area cannot be written.
+    Coils,      ///< 15, or 5 after the node's forceFunction.
+    Registers,  ///< 16, or 6 after the node's presetFunction.
+    Single,     ///< 6, whatever the node says.
 };
 
 /// One memory type.
@@ -49,8 +49,8 @@ struct MemoryRow {
     bool readOnly = false;
     bool longRegisters = false;     ///< Offered by the models that have them.
     std::uint8_t readFunction = 0;  ///< Modbus function code; 0: the tag keeps what it has.
-    WriteChoice write = WriteChoice::keep;
-    DriverArea area = DriverArea::none;
+    WriteChoice write = WriteChoice::Keep;
+    DriverArea area = DriverArea::None;
 };
 
 /// One row of the reference address table: the classic five-digit form and the six-digit form of an

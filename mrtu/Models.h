@@ -13,7 +13,7 @@ struct ModelRow {
 };
 
 /// In the order in which they are registered. The first serves a node whose model is unknown.
-inline constexpr std::array models{
+inline constexpr std::array kModels{
     ModelRow{.name = "1", .zeroBased = false, .longRegisters = false},
     ModelRow{.name = "2", .zeroBased = true, .longRegisters = false},
     ModelRow{.name = "3", .zeroBased = false, .longRegisters = true},
@@ -22,7 +22,7 @@ inline constexpr std::array models{
 
 /// @return the row of the model called `name`, or null.
 constexpr const ModelRow* modelRow(std::string_view name) {
-    for (const ModelRow& row : models)
+    for (const ModelRow& row : kModels)
         if (row.name == name) return &row;
     return nullptr;
 }

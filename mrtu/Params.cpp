@@ -57,15 +57,15 @@ class Reader {
 /// txMode out still has to give "bits".
 bool saysRtu(CfgParser& parser) {
     std::string txMode;
-    const auto result = parser.getParam("txMode", kWideNode, txMode, CfgParser::commonOnly);
-    return result == CfgParser::found && txMode == "RTU";
+    const auto result = parser.getParam("txMode", kWideNode, txMode, CfgParser::CommonOnly);
+    return result == CfgParser::Found && txMode == "RTU";
 }
 
 }  // namespace
 
 bool NodeParams::parse(CfgParser& parser, int node, std::string& error) {
-    Reader readOwn(parser, node, CfgParser::nodeOnly, error);
-    Reader read(parser, node, CfgParser::anyPlace, error);
+    Reader readOwn(parser, node, CfgParser::NodeOnly, error);
+    Reader read(parser, node, CfgParser::AnyPlace, error);
     const bool ok = readOwn.optional("prefix", prefix, std::string()) &&  //
                     read.required("defNodeId", defNodeId) &&              //
                     read.optional("timeout", timeout, 2000) &&            //
@@ -83,7 +83,7 @@ bool NodeParams::parse(CfgParser& parser, int node, std::string& error) {
 }
 
 bool CommonParams::parse(CfgParser& parser, std::string& error) {
-    Reader read(parser, kWideNode, CfgParser::commonOnly, error);
+    Reader read(parser, kWideNode, CfgParser::CommonOnly, error);
     return read.optional("txMode", txMode, std::string("RTU")) &&  //
            read.required("uart", uart) &&                          //
            read.required("baudrate", baudrate) &&                  //

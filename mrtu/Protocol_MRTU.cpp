@@ -33,8 +33,8 @@ _MRTU::Fault takeOver(const _MRTU::CommonParams& common, _MRTU::LineSettings& li
     return _MRTU::kNoFault;
 }
 
-constexpr const char* uriNames[] = {"nodeid", "memorytype", "arrayindex.subindex", "datatype",
-                                    nullptr};
+constexpr const char* kUriNames[] = {"nodeid", "memorytype", "arrayindex.subindex", "datatype",
+                                     nullptr};
 
 constexpr int kExtensionQuery = 0;
 constexpr int kKnownExtension = 3;
@@ -179,7 +179,7 @@ ITag* Protocol_MRTU::CreateTagBase(const char* uri) {
 }
 
 const char* const* Protocol_MRTU::tagUriNames() const {
-    return uriNames;
+    return kUriNames;
 }
 
 int Protocol_MRTU::vcsGetComParams(char* text, int size) const {

@@ -32,52 +32,52 @@ unsigned char lowByte(int value) {
 
 void Protocol_MRTU::readDriverArea(const Tag_MRTU& tag, unsigned char* data) {
     switch (tag.driverArea()) {
-        case DriverArea::nodeOverride:
+        case DriverArea::NodeOverride:
             data[0] = lowByte(nodeOverrides_.replacementOf(tag.nodeId()));
             break;
-        case DriverArea::modiconMode:
+        case DriverArea::ModiconMode:
             data[0] = modiconMode(tag) ? 1 : 0;
             break;
-        case DriverArea::baud:
+        case DriverArea::Baud:
             storeInt(data, serialValue("baud", lineSetting(&LineSettings::baud)));
             break;
-        case DriverArea::parity:
+        case DriverArea::Parity:
             data[0] = lowByte(serialValue("parity", lineSetting(&LineSettings::parity)));
             break;
-        case DriverArea::stopBits:
+        case DriverArea::StopBits:
             data[0] = lowByte(serialValue("stop", lineSetting(&LineSettings::stopBits)));
             break;
-        case DriverArea::lineMode:
+        case DriverArea::LineMode:
             data[0] = lowByte(serialValue("mode", lineSetting(&LineSettings::mode)));
             break;
-        case DriverArea::apply:
+        case DriverArea::Apply:
             data[0] = 0;
             break;
-        case DriverArea::none:
+        case DriverArea::None:
             break;
     }
 }
 
 bool Protocol_MRTU::writeDriverArea(const Tag_MRTU& tag, const unsigned char* data) {
     switch (tag.driverArea()) {
-        case DriverArea::nodeOverride:
+        case DriverArea::NodeOverride:
             nodeOverrides_.setValue(tag.nodeId(), data[0], GetIdent());
             return true;
-        case DriverArea::modiconMode:
+        case DriverArea::ModiconMode:
             setModiconMode(tag.nodeId(), data[0] != 0);
             return true;
-        case DriverArea::baud:
+        case DriverArea::Baud:
             return stage("baud", loadInt(data), _MRTU::isListedBaudRate(loadInt(data)));
-        case DriverArea::parity:
+        case DriverArea::Parity:
             return stage("parity", data[0], _MRTU::isListedParity(data[0]));
-        case DriverArea::stopBits:
+        case DriverArea::StopBits:
             return stage("stop", data[0], _MRTU::isListedStopBits(data[0]));
-        case DriverArea::lineMode:
+        case DriverArea::LineMode:
             return stage("mode", data[0], _MRTU::isListedMode(data[0]));
-        case DriverArea::apply:
+        case DriverArea::Apply:
             applyStaged();
             return true;
-        case DriverArea::none:
+        case DriverArea::None:
             break;
     }
     return false;
@@ -85,7 +85,7 @@ bool Protocol_MRTU::writeDriverArea(const Tag_MRTU& tag, const unsigned char* da
 
 void Protocol_MRTU::setModiconMode(int node, bool on) {
     ParameterReplacer::Variant value;
-    value.type = ParameterReplacer::boolean;
+    value.type = ParameterReplacer::Boolean;
     value.boolValue = on;
     overrides_.store({{ParameterReplacer::makeFullName("ModiconMode", node), value}});
 }

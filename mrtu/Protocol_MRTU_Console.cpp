@@ -12,7 +12,7 @@
 
 namespace {
 
-using ProtUtilsN::CopyBounded;
+using ProtUtilsN::copyBounded;
 
 constexpr char kHelp[] =
     "setid n m - set the node id n to m\n"
@@ -43,7 +43,7 @@ int Protocol_MRTU::DoCommand(const char* command, char* answer, int size) {
     if (command == nullptr) return 0;
     std::string_view line = command;
     bool more = false;
-    const std::string_view word = ProtUtilsN::TakePiece(line, ' ', more);
+    const std::string_view word = ProtUtilsN::takePiece(line, ' ', more);
     if (word == "help") return commandHelp(command, answer, size);
     if (word == "setid") {
         commandSetId(command, answer, size);
@@ -59,7 +59,7 @@ int Protocol_MRTU::DoCommand(const char* command, char* answer, int size) {
 int Protocol_MRTU::commandHelp(const char* command, char* answer, int size) {
     int used = 0;
     if (ProtgenProtocol::DoCommand(command, answer, size) != 0) used = textLength(answer, size);
-    CopyBounded(answer + used, kHelp, size - used);
+    copyBounded(answer + used, kHelp, size - used);
     return 1;
 }
 
@@ -68,18 +68,18 @@ void Protocol_MRTU::commandSetId(const char* command, char* answer, int size) {
         std::vector<std::string> words;
         ProtUtilsN::ParseSubstrings(command, words, ' ');
         if (words.size() != 3) {
-            CopyBounded(answer, "invalid format\n", size);
+            copyBounded(answer, "invalid format\n", size);
             return true;
         }
-        const int node = ProtUtilsN::ParseInteger(words[1].c_str());
-        const int wanted = ProtUtilsN::ParseInteger(words[2].c_str());
+        const int node = ProtUtilsN::parseInteger(words[1].c_str());
+        const int wanted = ProtUtilsN::parseInteger(words[2].c_str());
         const int replacement = wanted != 0 ? wanted : node;
         nodeOverrides_.setValue(node, replacement, GetIdent());
         const Line text(node, " set to ", replacement);
-        CopyBounded(answer, text.text(), size);
+        copyBounded(answer, text.text(), size);
         return true;
     });
-    if (!done) CopyBounded(answer, GetLastErrorString(), size);
+    if (!done) copyBounded(answer, GetLastErrorString(), size);
 }
 
 void Protocol_MRTU::commandGetId(char* answer, int size) {
@@ -87,11 +87,11 @@ void Protocol_MRTU::commandGetId(char* answer, int size) {
         listIds(answer, size);
         return true;
     });
-    if (!done) CopyBounded(answer, GetLastErrorString(), size);
+    if (!done) copyBounded(answer, GetLastErrorString(), size);
 }
 
 void Protocol_MRTU::listIds(char* answer, int size) const {
-    CopyBounded(answer, "no node configurated\n", size);
+    copyBounded(answer, "no node configurated\n", size);
     for (const auto& [node, replacement] : nodeOverrides_.replacements()) {
         const Line line(node, " -> ", replacement);
         if (line.length() > size) return;

@@ -39,7 +39,7 @@ bool Protocol_MRTU::doReadBlock(const ProtgenTag* tag, int index, unsigned char*
     if (!started_) return fail(_MRTU::kNotStarted) != 0;
     const Tag_MRTU& own = *static_cast<const Tag_MRTU*>(tag);
     return guardedBy(false, [&] {
-        if (own.driverArea() != _MRTU::DriverArea::none) {
+        if (own.driverArea() != _MRTU::DriverArea::None) {
             readDriverArea(own, data);
             return true;
         }

@@ -58,7 +58,7 @@ int Protocol_MRTU::doWrite(const ProtgenTag* tag, int index, const unsigned char
 
 int Protocol_MRTU::write(const Tag_MRTU& own, int index, const unsigned char* data, int count) {
     if (!started_) return fail(_MRTU::kNotStarted);
-    if (own.driverArea() != _MRTU::DriverArea::none) return writeDriverArea(own, data) ? 1 : 0;
+    if (own.driverArea() != _MRTU::DriverArea::None) return writeDriverArea(own, data) ? 1 : 0;
     if (!_MRTU::isSingleWrite(own.writeFunction())) return writeItems(&own, index, data, count);
 
     // One request for each item. Coils all look at the same first byte, each at the bit of its own

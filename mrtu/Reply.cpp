@@ -74,7 +74,7 @@ const char* getExceptionText(unsigned char code) {
         const char* text;
     };
     // Source of the codes: Modbus Application Protocol V1.1b3, 7.
-    static constexpr Row rows[] = {
+    static constexpr Row kRows[] = {
         {1, "Exception: Illegal function"},
         {2, "Exception: Illegal data address"},
         {3, "Exception: Illegal data value"},
@@ -85,7 +85,7 @@ const char* getExceptionText(unsigned char code) {
         {10, "Exception: gateway: path to target unavailable"},
         {11, "Exception: gateway: timeout from target"},
     };
-    for (const Row& row : rows)
+    for (const Row& row : kRows)
         if (row.code == code) return row.text;
     return "Unknown exception";
 }

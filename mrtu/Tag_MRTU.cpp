@@ -19,7 +19,7 @@ using _MRTU::WriteChoice;
 namespace {
 
 // What is wrong when a field is empty, in the order of the URI.
-constexpr std::array missingField{
+constexpr std::array kMissingField{
     "nodeID field missing",
     "memorytype field missing",
     "subIndex field missing",
@@ -54,14 +54,14 @@ bool Tag_MRTU::refuseType(const std::string& text) {
 bool Tag_MRTU::parseTagUrl(Protocol_MRTU* protocol) {
     std::vector<std::string> fields;
     ProtUtilsN::ParseSubstrings(GetVarName(), fields, '?');
-    if (fields.size() != missingField.size())
+    if (fields.size() != kMissingField.size())
         return refuse("there must be 4 tag specification fields");
-    for (std::size_t index = 0; index < missingField.size(); ++index)
-        if (fields[index].empty()) return refuse(missingField[index]);
+    for (std::size_t index = 0; index < kMissingField.size(); ++index)
+        if (fields[index].empty()) return refuse(kMissingField[index]);
 
     if (!resolveArea(*protocol, fields[0], fields[1])) return false;
     if (!resolveType(fields[3])) return false;
-    if (driverArea_ == DriverArea::nodeOverride && GetVarType() != ICU_Type::unsignedByte)
+    if (driverArea_ == DriverArea::NodeOverride && GetVarType() != ICU_Type::unsignedByte)
         return refuse("invalid access to node override");
     if (!normalizeModbusOffset()) return refuse("invalid offset for this memory type");
     getCodes();
@@ -79,7 +79,7 @@ bool Tag_MRTU::resolveArea(const Protocol_MRTU& protocol, const std::string& nod
     commonParams_ = params.getCommonParams();
     if (commonParams_ == nullptr) return refuse("Can't access protocol common parameters");
 
-    setNodeId(ProtUtilsN::ParseInteger(node.c_str()));
+    setNodeId(ProtUtilsN::parseInteger(node.c_str()));
     nodeParams_ = params.shareNodeParams(nodeId());
     if (nodeParams_ == nullptr) return refuse("Can't access protocol node parameters");
 
@@ -91,7 +91,7 @@ bool Tag_MRTU::resolveArea(const Protocol_MRTU& protocol, const std::string& nod
     if (memoryType() == nullptr) return refuse("Can't access memory type");
 
     const _MRTU::MemoryRow* row = _MRTU::memoryRow(memoryType()->nameRef());
-    driverArea_ = row != nullptr ? row->area : DriverArea::none;
+    driverArea_ = row != nullptr ? row->area : DriverArea::None;
     return true;
 }
 
@@ -110,7 +110,7 @@ bool Tag_MRTU::resolveType(const std::string& text) {
 
 bool Tag_MRTU::normalizeModbusOffset() {
     // The declared index range of "NO" is 0..1, yet only index 0 can be addressed.
-    if (driverArea_ != DriverArea::none) return offset() == 0;
+    if (driverArea_ != DriverArea::None) return offset() == 0;
 
     const _MRTU::MemoryRow* row = _MRTU::memoryRow(memoryType()->nameRef());
     const _MRTU::AddressRange* range = _MRTU::addressRange(memoryType()->nameRef());
@@ -132,20 +132,20 @@ void Tag_MRTU::getCodes() {
     if (row == nullptr || row->readFunction == 0) return;
     readFunction_ = row->readFunction;
     switch (row->write) {
-        case WriteChoice::keep:
+        case WriteChoice::Keep:
             break;
-        case WriteChoice::never:
+        case WriteChoice::Never:
             writeFunction_ = 0;
             break;
-        case WriteChoice::coils:
+        case WriteChoice::Coils:
             writeFunction_ =
                 nodeParams_->forceFunction == "15" ? _MRTU::kWriteCoils : _MRTU::kWriteCoil;
             break;
-        case WriteChoice::registers:
+        case WriteChoice::Registers:
             writeFunction_ = nodeParams_->presetFunction == "16" ? _MRTU::kWriteRegisters
                                                                  : _MRTU::kWriteRegister;
             break;
-        case WriteChoice::single:
+        case WriteChoice::Single:
             writeFunction_ = _MRTU::kWriteRegister;
             break;
     }

@@ -39,7 +39,7 @@ class Tag_MRTU final : public ProtgenTag {
     /// Modbus function codes; the write function is 0 where writing is not possible.
     std::uint8_t readFunction() const { return readFunction_; }
     std::uint8_t writeFunction() const { return writeFunction_; }
-    /// The driver's own area that the tag addresses, `none` for areas of the device.
+    /// The driver's own area that the tag addresses, `None` for areas of the device.
     _MRTU::DriverArea driverArea() const { return driverArea_; }
 
   private:
@@ -55,5 +55,5 @@ class Tag_MRTU final : public ProtgenTag {
     const _MRTU::CommonParams* commonParams_ = nullptr;
     std::uint8_t readFunction_ = 0;
     std::uint8_t writeFunction_ = 0;
-    _MRTU::DriverArea driverArea_ = _MRTU::DriverArea::none;
+    _MRTU::DriverArea driverArea_ = _MRTU::DriverArea::None;
 };

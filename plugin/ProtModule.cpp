@@ -23,7 +23,7 @@ struct Service {
 };
 
 // In the order in which they are taken.
-const std::array services{
+const std::array kServices{
     Service{piMultiTask, "IMultiTask2", "IMultiTask2 not created"},
     Service{piSerialFactory, "ISerialFactory", "ISerialFactory not created"},
     Service{piSocketFactory, "ISocketFactory", "ISocketFactory not created"},
@@ -36,10 +36,10 @@ const std::array services{
 };
 
 // The order of handing back: first the optional services, which may lean on the required ones.
-IInterface** const optionalServices[] = {&piFastTimer, &piSmux, &piDriverInterface, &piDiag,
-                                         &piPermanentStorage};
-IInterface** const requiredServices[] = {&piMultiTask, &piSerialFactory, &piSocketFactory,
-                                         &piCDSBuffer};
+IInterface** const kOptionalServices[] = {&piFastTimer, &piSmux, &piDriverInterface, &piDiag,
+                                          &piPermanentStorage};
+IInterface** const kRequiredServices[] = {&piMultiTask, &piSerialFactory, &piSocketFactory,
+                                          &piCDSBuffer};
 
 void handBack(IInterfaceFactory& host, IInterface*& service) {
     host.ReleaseInterface(service);
@@ -67,12 +67,12 @@ int ProtModule::Init(IInterfaceFactory* host) {
         lastError_ = "Interface factory not given";
         return 0;
     }
-    for (const Service& service : services) {
+    for (const Service& service : kServices) {
         service.pointer = host->CreateInterface(service.name);
         if (service.pointer != nullptr || service.missing == nullptr) continue;
         // What was taken goes back in the order in which it came; the pointers keep their values
         // until the next successful call overwrites them.
-        for (const Service* taken = services.data(); taken != &service; ++taken)
+        for (const Service* taken = kServices.data(); taken != &service; ++taken)
             host->ReleaseInterface(taken->pointer);
         lastError_ = service.missing;
         return 0;
@@ -85,9 +85,9 @@ int ProtModule::Init(IInterfaceFactory* host) {
 void ProtModule::Close() {
     if (initCount_ == 0) return;
     if (--initCount_ != 0) return;
-    for (IInterface** service : optionalServices)
+    for (IInterface** service : kOptionalServices)
         if (*service != nullptr) handBack(*host_, *service);
-    for (IInterface** service : requiredServices)
+    for (IInterface** service : kRequiredServices)
         handBack(*host_, *service);
     host_ = nullptr;
 }

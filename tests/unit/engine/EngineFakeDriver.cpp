@@ -85,7 +85,7 @@ ITag* FakeDriver::CreateTagBase(const char* uri) {
         SetTagError(tag.get());
         return nullptr;
     }
-    tag->setNodeId(ProtUtilsN::ParseInteger(fields[0].c_str()));
+    tag->setNodeId(ProtUtilsN::parseInteger(fields[0].c_str()));
     const char* model = tag->nodeId() == 9 ? "B" : "A";
     tag->setModel(manager_.getModel(model));
     tag->setMemoryType(manager_.getMemoryType(model, fields[1]));

@@ -77,15 +77,15 @@ class WriteTurnsTest : public testing::Test {
 };
 
 TEST_F(WriteTurnsTest, RequestsToOnePlaceGoSideBySide) {
-    active("a", kHere, Kind::request);
-    active("b", kHere, Kind::request);
+    active("a", kHere, Kind::Request);
+    active("b", kHere, Kind::Request);
     EXPECT_EQ(0, turns_.waiting());
 }
 
 TEST_F(WriteTurnsTest, ChangeKeepsRequestsAndChangesOut) {
-    Writer& change = active("change", kHere, Kind::change);
-    Writer& request = waiting("request", kHere, Kind::request);
-    Writer& other = waiting("other", kHere, Kind::change);
+    Writer& change = active("change", kHere, Kind::Change);
+    Writer& request = waiting("request", kHere, Kind::Request);
+    Writer& other = waiting("other", kHere, Kind::Change);
     EXPECT_EQ("change", order());
     change.finish();
     request.awaitTurn();
@@ -96,31 +96,31 @@ TEST_F(WriteTurnsTest, ChangeKeepsRequestsAndChangesOut) {
 }
 
 TEST_F(WriteTurnsTest, OtherNodesAndOtherAreasDoNotWait) {
-    active("change", kHere, Kind::change);
-    active("node", {2, "REG"}, Kind::change);
-    active("area", {1, "LONG"}, Kind::change);
+    active("change", kHere, Kind::Change);
+    active("node", {2, "REG"}, Kind::Change);
+    active("area", {1, "LONG"}, Kind::Change);
     EXPECT_EQ(0, turns_.waiting());
 }
 
 TEST_F(WriteTurnsTest, AreaIsItsNameWhereverTheNameIsKept) {
     const std::string elsewhere = "REG";
-    Writer& change = active("change", kHere, Kind::change);
-    Writer& request = waiting("request", {1, elsewhere}, Kind::request);
+    Writer& change = active("change", kHere, Kind::Change);
+    Writer& request = waiting("request", {1, elsewhere}, Kind::Request);
     change.finish();
     request.finish();
 }
 
 TEST_F(WriteTurnsTest, FreeTurnWaitsForNobody) {
-    active("change", kHere, Kind::change);
-    active("free", kHere, Kind::free);
+    active("change", kHere, Kind::Change);
+    active("free", kHere, Kind::Free);
     EXPECT_EQ(0, turns_.waiting());
 }
 
 TEST_F(WriteTurnsTest, StreamOfRequestsDoesNotOvertakeAWaitingChange) {
-    Writer& first = active("first", kHere, Kind::request);
-    Writer& change = waiting("change", kHere, Kind::change);
-    Writer& late = waiting("late", kHere, Kind::request);
-    Writer& later = waiting("later", kHere, Kind::request);
+    Writer& first = active("first", kHere, Kind::Request);
+    Writer& change = waiting("change", kHere, Kind::Change);
+    Writer& late = waiting("late", kHere, Kind::Request);
+    Writer& later = waiting("later", kHere, Kind::Request);
     first.finish();
     change.awaitTurn();
     EXPECT_EQ("first change", order());
@@ -131,9 +131,9 @@ TEST_F(WriteTurnsTest, StreamOfRequestsDoesNotOvertakeAWaitingChange) {
 }
 
 TEST_F(WriteTurnsTest, StreamOfChangesDoesNotOvertakeAWaitingRequest) {
-    Writer& first = active("first", kHere, Kind::change);
-    Writer& request = waiting("request", kHere, Kind::request);
-    waiting("late", kHere, Kind::change);
+    Writer& first = active("first", kHere, Kind::Change);
+    Writer& request = waiting("request", kHere, Kind::Request);
+    waiting("late", kHere, Kind::Change);
     first.finish();
     request.awaitTurn();
     EXPECT_EQ("first request", order());
@@ -141,10 +141,10 @@ TEST_F(WriteTurnsTest, StreamOfChangesDoesNotOvertakeAWaitingRequest) {
 }
 
 TEST_F(WriteTurnsTest, ThreadThatHasATurnGetsAnotherOneThere) {
-    const WriteTurns::Turn change(turns_, kHere, Kind::change);
-    Writer& other = waiting("other", kHere, Kind::change);
-    { const WriteTurns::Turn request(turns_, kHere, Kind::request); }
-    { const WriteTurns::Turn again(turns_, kHere, Kind::change); }
+    const WriteTurns::Turn change(turns_, kHere, Kind::Change);
+    Writer& other = waiting("other", kHere, Kind::Change);
+    { const WriteTurns::Turn request(turns_, kHere, Kind::Request); }
+    { const WriteTurns::Turn again(turns_, kHere, Kind::Change); }
     EXPECT_EQ(1, turns_.waiting());
     EXPECT_EQ("", order());
     static_cast<void>(other);
@@ -158,7 +158,7 @@ TEST_F(WriteTurnsTest, CountersOfManyThreadsLoseNothing) {
         threads.emplace_back([this, thread, &changed] {
             for (int round = 0; round < 1000; ++round) {
                 const bool change = (round + thread) % 2 == 0;
-                const WriteTurns::Turn turn(turns_, kHere, change ? Kind::change : Kind::request);
+                const WriteTurns::Turn turn(turns_, kHere, change ? Kind::Change : Kind::Request);
                 if (change) ++changed;
             }
         });

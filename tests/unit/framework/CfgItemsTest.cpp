@@ -116,7 +116,7 @@ TEST(CfgItemsTest, EveryItemOfALongTextIsFound) {
     ASSERT_EQ(kNodes, parser.GetNodeCount());
     for (int node = 0; node < kNodes; ++node) {
         std::string value;
-        ASSERT_EQ(CfgParser::found, parser.getParam("timeout", node, value, CfgParser::anyPlace));
+        ASSERT_EQ(CfgParser::Found, parser.getParam("timeout", node, value, CfgParser::AnyPlace));
         ASSERT_EQ(std::to_string(node + 7), value);
     }
 }

@@ -92,7 +92,7 @@ TEST(CfgParserReadParamTest, ReadParamReportsARequiredParameterThatIsMissing) {
 }
 
 TEST(CfgParserReadParamTest, ReadParamGoesOnWithoutANodeParameterWhenNoNodeAsks) {
-    const Reading reading = ReadInt("Node1::timeout=5", kNoNode, CfgParser::nodeOnly, false);
+    const Reading reading = ReadInt("Node1::timeout=5", kNoNode, CfgParser::NodeOnly, false);
     EXPECT_TRUE(reading.goOn);
     EXPECT_EQ(-77, reading.value);
     EXPECT_EQ("", reading.error);

@@ -150,7 +150,7 @@ TEST(CfgParserTest, GetParamKeepsItsValueUntilTheNextCall) {
     EXPECT_STREQ("second", second);
 }
 
-constexpr int kBoth = CfgParser::commonOnly | CfgParser::nodeOnly;
+constexpr int kBoth = CfgParser::CommonOnly | CfgParser::NodeOnly;
 
 struct LookupRow {
     const char* body;

@@ -28,13 +28,13 @@ inline ConversionShape Raw(int length) {
 
 // What becomes of the bytes; empty when the conversion refuses them.
 inline Bytes Converted(Bytes bytes, const char* name, const ConversionShape& shape, bool toDevice) {
-    const bool ok = ProtUtilsN::ApplyConversion(bytes.data(), name, shape, toDevice);
+    const bool ok = ProtUtilsN::applyConversion(bytes.data(), name, shape, toDevice);
     return ok ? bytes : Bytes{};
 }
 
 inline bool Refuses(const char* name, const ConversionShape& shape, bool toDevice) {
     Bytes bytes(static_cast<std::size_t>(std::max(shape.length, 1)), 0);
-    return !ProtUtilsN::ApplyConversion(bytes.data(), name, shape, toDevice);
+    return !ProtUtilsN::applyConversion(bytes.data(), name, shape, toDevice);
 }
 
 inline Bytes LittleEndian(std::uint64_t value, int size) {

@@ -102,7 +102,7 @@ TEST(HostileTextsTest, NeverLeadATagOutOfItsBuffers) {
         const bool ok = tag.Convert(device.data(), value.data(), false);
         if (!ok) {
             ASSERT_EQ(std::ssize(value), std::count(value.begin(), value.end(), 0));
-            ASSERT_EQ(0U, std::string(tag.GetError()).rfind("Conversion error at: ", 0));
+            ASSERT_EQ(0U, std::string(tag.getError()).rfind("Conversion error at: ", 0));
             continue;
         }
         if (!tag.Convert(value.data(), device.data(), true)) continue;
@@ -129,15 +129,15 @@ TEST(HostileTextsTest, NeverMakeAParameterOfAnotherOne) {
         }
 
         std::string value = "before";
-        const int result = parser.getParam("timeout", 2, value, CfgParser::anyPlace);
-        if (result != CfgParser::found) {
-            ASSERT_EQ(CfgParser::notFound, result) << text;
+        const int result = parser.getParam("timeout", 2, value, CfgParser::AnyPlace);
+        if (result != CfgParser::Found) {
+            ASSERT_EQ(CfgParser::NotFound, result) << text;
             ASSERT_EQ("before", value) << text;
             continue;
         }
         ++found;
         ASSERT_NE(text.find("timeout=" + value), std::string::npos) << text;
-        ASSERT_TRUE(std::none_of(value.begin(), value.end(), ProtUtilsN::IsWhiteSpace)) << text;
+        ASSERT_TRUE(std::none_of(value.begin(), value.end(), ProtUtilsN::isWhiteSpace)) << text;
     }
     EXPECT_GT(found, 100);
 }

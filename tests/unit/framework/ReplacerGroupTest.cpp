@@ -52,7 +52,7 @@ TEST(ReplacerGroupTest, EntryKeepsThePlainNameAndTheGroup) {
     staging.set("stop", 12, 2);
     staging.set("mode", -1, 1);
     const GroupParameterReplacer::Variant grouped = staging.staged().at("stop12");
-    EXPECT_EQ(ParameterReplacer::integer, grouped.type);
+    EXPECT_EQ(ParameterReplacer::Integer, grouped.type);
     EXPECT_EQ("stop", grouped.name);
     EXPECT_FALSE(grouped.boolValue);
     EXPECT_EQ(2, grouped.intValue);

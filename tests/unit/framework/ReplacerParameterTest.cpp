@@ -145,20 +145,20 @@ TEST_F(ReplacerParameterTest, WithoutStorageDefaultsAreCached) {
 TEST_F(ReplacerParameterTest, ExplicitValueReplacesTheCachedOneInMemoryOnly) {
     EXPECT_EQ(9600, number("baud", 9600));
     storage_.forget();
-    replacer_.set("baud", ofType(ParameterReplacer::integer));
+    replacer_.set("baud", ofType(ParameterReplacer::Integer));
     EXPECT_EQ(42, number("baud", 9600));
     EXPECT_TRUE(storage_.calls().empty());
 }
 
 TEST_F(ReplacerParameterTest, ExplicitValueComesBeforeTheFirstLookUp) {
     contents_.put("MRTU", "node3_ModiconMode", false);
-    replacer_.set("node3_ModiconMode", ofType(ParameterReplacer::boolean));
+    replacer_.set("node3_ModiconMode", ofType(ParameterReplacer::Boolean));
     EXPECT_TRUE(flag("ModiconMode", 3, false));
 }
 
 TEST_F(ReplacerParameterTest, EachFormTakesItsOwnFieldOfAnEntry) {
     ParameterReplacer::Variant value;
-    value.type = ParameterReplacer::boolean;
+    value.type = ParameterReplacer::Boolean;
     value.boolValue = true;
     replacer_.set("mixed", value);
     EXPECT_EQ(0, number("mixed", 9600));
@@ -166,9 +166,9 @@ TEST_F(ReplacerParameterTest, EachFormTakesItsOwnFieldOfAnEntry) {
 }
 
 TEST_F(ReplacerParameterTest, ValuesArePersistedByType) {
-    replacer_.persist("flag", ofType(ParameterReplacer::boolean));
-    replacer_.persist("number", ofType(ParameterReplacer::integer));
-    replacer_.persist("name", ofType(ParameterReplacer::text));
+    replacer_.persist("flag", ofType(ParameterReplacer::Boolean));
+    replacer_.persist("number", ofType(ParameterReplacer::Integer));
+    replacer_.persist("name", ofType(ParameterReplacer::Text));
     EXPECT_EQ("bool:true", stored("flag"));
     EXPECT_EQ("int:42", stored("number"));
     EXPECT_EQ("text:text", stored("name"));
@@ -182,15 +182,15 @@ TEST_F(ReplacerParameterTest, OtherTypesAreNotPersisted) {
 }
 
 TEST_F(ReplacerParameterTest, PersistedValueIsNotCached) {
-    replacer_.persist("baud", ofType(ParameterReplacer::integer));
+    replacer_.persist("baud", ofType(ParameterReplacer::Integer));
     EXPECT_EQ(42, number("baud", 9600));  // found in the storage at the first look-up
-    replacer_.persist("baud", ofType(ParameterReplacer::text));
+    replacer_.persist("baud", ofType(ParameterReplacer::Text));
     EXPECT_EQ(42, number("baud", 9600));
 }
 
 TEST_F(ReplacerParameterTest, PersistingWithoutStorageIsHarmless) {
     useNoStorage();
-    replacer_.persist("baud", ofType(ParameterReplacer::integer));
+    replacer_.persist("baud", ofType(ParameterReplacer::Integer));
     EXPECT_EQ("none", stored("baud"));
 }
 

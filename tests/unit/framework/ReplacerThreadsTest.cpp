@@ -71,7 +71,7 @@ class ReplacerThreadsTest : public testing::Test {
 
     static ParameterReplacer::Variant number(int value) {
         ParameterReplacer::Variant variant;
-        variant.type = ParameterReplacer::integer;
+        variant.type = ParameterReplacer::Integer;
         variant.intValue = value;
         return variant;
     }

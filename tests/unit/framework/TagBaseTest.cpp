@@ -33,14 +33,14 @@ TEST(TagBaseTest, IsReadAndWritable) {
     const ValueTag tag("int");
     EXPECT_FALSE(tag.IsReadOnly());
     EXPECT_FALSE(tag.IsWriteOnly());
-    EXPECT_STREQ("", tag.GetError());
+    EXPECT_STREQ("", tag.getError());
 }
 
 TEST(TagBaseTest, KeepsAnErrorTextThoughConstant) {
     const ValueTag tag("int");
     tag.SetError("first");
     tag.SetError("second");
-    EXPECT_STREQ("second", tag.GetError());
+    EXPECT_STREQ("second", tag.getError());
 }
 
 TEST(TagBaseTest, PackedLenIsTheLengthExceptForBits) {
@@ -145,7 +145,7 @@ TEST(TagBaseTest, ConvertNamesTheConversionThatFailsAndLeavesTheDestination) {
         const ValueTag tag(row.type);
         Bytes dst = kUntouched;
         EXPECT_FALSE(tag.Convert(row.src.data(), dst.data(), row.toDevice)) << row.type;
-        EXPECT_STREQ(row.error, tag.GetError()) << row.type;
+        EXPECT_STREQ(row.error, tag.getError()) << row.type;
         EXPECT_EQ(kUntouched, dst) << row.type;
     }
 }
@@ -155,7 +155,7 @@ TEST(TagBaseTest, ConvertLeavesTheErrorTextOfAnEarlierFailure) {
     Bytes dst(2);
     EXPECT_FALSE(tag.Convert(Bytes{0x3A, 0x12}.data(), dst.data(), kRead));
     EXPECT_TRUE(tag.Convert(Bytes{0x34, 0x12}.data(), dst.data(), kRead));
-    EXPECT_STREQ("Conversion error at: bcd", tag.GetError());
+    EXPECT_STREQ("Conversion error at: bcd", tag.getError());
 }
 
 TEST(TagBaseTest, ConvertNegatesTheFrontPartOfAnArray) {

@@ -112,7 +112,7 @@ TEST(TextUtilsTest, ParseIntegerTakesTheBaseFromThePrefix) {
         {"- 5", 0},   {"--5", 0}, {"7.9", 7},     {"1e3", 1},   {" 0x0F", 15}, {"0778", 63},
     };
     for (const NumberRow& row : rows) {
-        EXPECT_EQ(ProtUtilsN::ParseInteger(row.text), row.value) << '"' << row.text << '"';
+        EXPECT_EQ(ProtUtilsN::parseInteger(row.text), row.value) << '"' << row.text << '"';
     }
 }
 
@@ -128,7 +128,7 @@ TEST(TextUtilsTest, ParseIntegerKeepsToThirtyTwoBits) {
         {"-99999999999999999999999999", INT32_MIN},
     };
     for (const NumberRow& row : rows) {
-        EXPECT_EQ(ProtUtilsN::ParseInteger(row.text), row.value) << row.text;
+        EXPECT_EQ(ProtUtilsN::parseInteger(row.text), row.value) << row.text;
     }
 }
 
@@ -145,22 +145,22 @@ TEST(TextUtilsTest, ParseDecimalIgnoresPrefixes) {
         {"-99999999999", INT32_MIN},
     };
     for (const NumberRow& row : rows) {
-        EXPECT_EQ(ProtUtilsN::ParseDecimal(row.text), row.value) << '"' << row.text << '"';
+        EXPECT_EQ(ProtUtilsN::parseDecimal(row.text), row.value) << '"' << row.text << '"';
     }
 }
 
 TEST(TextUtilsTest, CharacterClassesAreThoseOfTheStandardLocale) {
     for (int code = 0; code < 256; ++code) {
         const char c = static_cast<char>(code);
-        EXPECT_EQ(std::isspace(code) != 0, ProtUtilsN::IsWhiteSpace(c)) << code;
-        EXPECT_EQ(std::isdigit(code) != 0, ProtUtilsN::IsDecimalDigit(c)) << code;
+        EXPECT_EQ(std::isspace(code) != 0, ProtUtilsN::isWhiteSpace(c)) << code;
+        EXPECT_EQ(std::isdigit(code) != 0, ProtUtilsN::isDecimalDigit(c)) << code;
     }
 }
 
 // What is behind the first `size` bytes must never be touched, hence the '#' in every buffer.
 std::string CopiedInto(const char* text, int size) {
     std::string out(8, '#');
-    ProtUtilsN::CopyBounded(out.data(), text, size);
+    ProtUtilsN::copyBounded(out.data(), text, size);
     return out;
 }
 

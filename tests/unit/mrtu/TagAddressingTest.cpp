@@ -21,7 +21,7 @@ TEST_F(TagAddressingTest, HoldingRegisterOfModelOne) {
     EXPECT_EQ(driver->getMemoryManager()->getMemoryType("1", "HREG"), word->memoryType());
     EXPECT_EQ(driver->getParamManager()->getNodeParams(1), word->nodeParams());
     EXPECT_EQ(driver->getParamManager()->getCommonParams(), word->commonParams());
-    EXPECT_EQ(_MRTU::DriverArea::none, word->driverArea());
+    EXPECT_EQ(_MRTU::DriverArea::None, word->driverArea());
     EXPECT_STREQ("1?HREG?400001?unsignedShort", word->GetVarName());
 }
 
@@ -132,7 +132,7 @@ TEST_F(TagAddressingTest, ChecksRunInOrder) {
 
 TEST_F(TagAddressingTest, NodeOverrideTakesOneUnsignedByteAtIndexZero) {
     configure();
-    EXPECT_EQ(_MRTU::DriverArea::nodeOverride, tag("1?NO?0?unsignedByte")->driverArea());
+    EXPECT_EQ(_MRTU::DriverArea::NodeOverride, tag("1?NO?0?unsignedByte")->driverArea());
     for (const char* type : {"byte", "boolean", "int", "unsignedByte-2"})
         expectRefused("1?NO?0?" + std::string(type), "invalid access to node override");
     expectRefused("1?NO?1?unsignedByte", "invalid offset for this memory type");
@@ -150,7 +150,7 @@ TEST_F(TagAddressingTest, DriverAreasExistInEveryModelAtIndexZeroOnly) {
         for (const auto& [name, type] : areas) {
             const std::string area = std::string("1?") + name;
             const Tag_MRTU* made = tag(area + "?0?" + type);
-            EXPECT_NE(_MRTU::DriverArea::none, made->driverArea()) << area;
+            EXPECT_NE(_MRTU::DriverArea::None, made->driverArea()) << area;
             EXPECT_EQ(0, made->offset()) << area << ' ' << model;
             expectRefused(area + "?1?" + type, "invalid offset for this memory type");
         }
@@ -257,7 +257,7 @@ TEST_F(TagAddressingTest, CloneCopiesEveryField) {
     EXPECT_EQ(6, clone->writeFunction());
     EXPECT_EQ(word->driverArea(), clone->driverArea());
     const std::unique_ptr<ITag> area(tag("1?NO?0?unsignedByte")->Clone());
-    EXPECT_EQ(_MRTU::DriverArea::nodeOverride, static_cast<Tag_MRTU*>(area.get())->driverArea());
+    EXPECT_EQ(_MRTU::DriverArea::NodeOverride, static_cast<Tag_MRTU*>(area.get())->driverArea());
 }
 
 /// A later configuration once freed the records that tags pointed to.

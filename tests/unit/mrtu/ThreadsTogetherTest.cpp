@@ -162,7 +162,7 @@ TEST_F(ThreadsTogetherTest, ReadsWritesAreasConsoleStartAndStop) {
     for (int twice = 0; twice < 2; ++twice)
         repeat([=, this](int round) {
             readInVain(round % 2 == 0 ? noBcd : noAddress);
-            const std::string text = noBcd->GetError();
+            const std::string text = noBcd->getError();
             check(text.empty() || text == "Conversion error at: bcd");
         });
     repeat([=, this](int round) { readInVain(round % 2 == 0 ? silent : damaged); });
