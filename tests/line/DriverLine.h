@@ -9,12 +9,12 @@
 #include <utility>
 
 #include "runtime/Channel.h"
-#include "runtime/ServiceFactory.h"
 #include "runtime/MemoryStorage.h"
 #include "runtime/Module.h"
 #include "runtime/PluginLibrary.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
+#include "runtime/ServiceFactory.h"
 #include "sim/Simulator.h"
 
 /// A slave with address 1 on "com1", and a driver that is configured and started.

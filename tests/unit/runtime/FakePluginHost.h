@@ -5,9 +5,9 @@
 
 #include <string>
 
-#include "runtime/ServiceFactory.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
+#include "runtime/ServiceFactory.h"
 
 struct FakeHost {
     runtime::PosixMultiTask multiTask;
