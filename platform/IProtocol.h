@@ -38,10 +38,10 @@ static_assert(sizeof(ExtensionRecord) == 4 + 4 + 58 + 1 + 1);
 /// GetLastError() and GetLastErrorString() tell why. Both keep the last failure; a success does not
 /// clear them.
 /// Ownership: tags belong to the protocol until FreeTag() or its own destruction.
-/// Threads: the host serialises Config(), CreateTag(), FreeTag(), the console's commands on tags and
-/// the destruction with everything else on one object. Reads and writes of tags, the error state,
-/// the ident, the reports, Start() and Stop() may run concurrently when the driver says that it is
-/// re-entrant.
+/// Threads: the host serialises Config(), CreateTag(), FreeTag(), the console's commands on tags
+/// and the destruction with everything else on one object. Reads and writes of tags, the error
+/// state, the ident, the reports, Start() and Stop() may run concurrently when the driver says that
+/// it is re-entrant.
 class IProtocol : public IInterface {
   public:
     /// Takes the configuration text (begins with "CfgVer=1"). REQUIRES: not started.

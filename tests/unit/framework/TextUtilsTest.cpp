@@ -112,7 +112,7 @@ TEST(TextUtilsTest, ParseIntegerTakesTheBaseFromThePrefix) {
         {"- 5", 0},   {"--5", 0}, {"7.9", 7},     {"1e3", 1},   {" 0x0F", 15}, {"0778", 63},
     };
     for (const NumberRow& row : rows) {
-        EXPECT_EQ(ProtUtilsN::parseInteger(row.text), row.value) << '"' << row.text << '"';
+        EXPECT_EQ(row.value, ProtUtilsN::parseInteger(row.text)) << '"' << row.text << '"';
     }
 }
 
@@ -128,7 +128,7 @@ TEST(TextUtilsTest, ParseIntegerKeepsToThirtyTwoBits) {
         {"-99999999999999999999999999", INT32_MIN},
     };
     for (const NumberRow& row : rows) {
-        EXPECT_EQ(ProtUtilsN::parseInteger(row.text), row.value) << row.text;
+        EXPECT_EQ(row.value, ProtUtilsN::parseInteger(row.text)) << row.text;
     }
 }
 
@@ -145,7 +145,7 @@ TEST(TextUtilsTest, ParseDecimalIgnoresPrefixes) {
         {"-99999999999", INT32_MIN},
     };
     for (const NumberRow& row : rows) {
-        EXPECT_EQ(ProtUtilsN::parseDecimal(row.text), row.value) << '"' << row.text << '"';
+        EXPECT_EQ(row.value, ProtUtilsN::parseDecimal(row.text)) << '"' << row.text << '"';
     }
 }
 
