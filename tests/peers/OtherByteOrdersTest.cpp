@@ -138,4 +138,7 @@ TEST_P(OtherByteOrdersTest, PymodbusTakesTheRealsForTheSame) {
         peers::runProgram(words).output);
 }
 
+INSTANTIATE_TEST_SUITE_P(Peers, OtherByteOrdersTest, testing::ValuesIn(peers::kPeers),
+                         peers::nameOf);
+
 }  // namespace
