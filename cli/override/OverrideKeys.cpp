@@ -4,7 +4,8 @@
 #include <fmt/format.h>
 
 #include <charconv>
-#include <cstdlib>
+
+#include "settings/NumberText.h"
 
 namespace cli {
 namespace {
@@ -22,7 +23,7 @@ std::string addressKey(int node) {
 std::optional<int> nodeOfAddressKey(std::string_view key) {
     const auto number = addressNumber(key);
     if (!number) return std::nullopt;
-    return static_cast<int>(std::strtol(number->c_str(), nullptr, 0));
+    return static_cast<int>(settings::readNumber(*number).value);
 }
 
 std::optional<std::string> addressNumber(std::string_view key) {

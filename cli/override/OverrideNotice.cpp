@@ -5,7 +5,6 @@
 #include <fmt/ranges.h>
 
 #include <algorithm>
-#include <cstdlib>
 #include <optional>
 
 #include "cli/Choices.h"
@@ -14,6 +13,7 @@
 #include "runtime/StoragePath.h"
 #include "runtime/StoredValue.h"
 #include "settings/ConfigText.h"
+#include "settings/NumberText.h"
 
 namespace cli {
 namespace {
@@ -50,7 +50,7 @@ std::optional<ActiveOverride> serialOverride(const SerialSetting& setting,
 }
 
 std::optional<ActiveOverride> addressOverride(int node, const runtime::StoredEntry& entry) {
-    const long address = std::strtol(runtime::storedText(entry.value).c_str(), nullptr, 0);
+    const long address = settings::readNumber(runtime::storedText(entry.value)).value;
     if (address == node) return std::nullopt;
     const std::string word = addressWord(static_cast<std::uint32_t>(address));
     return ActiveOverride{fmt::format("node {} = {}", node, word), fmt::format("node {}", node)};

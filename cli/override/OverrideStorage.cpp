@@ -4,13 +4,12 @@
 #include <fmt/format.h>
 
 #include <algorithm>
-#include <cerrno>
-#include <cstdlib>
 #include <optional>
 
 #include "cli/override/OverrideKeys.h"
 #include "cli/override/OverrideWords.h"
 #include "runtime/SqliteStorage.h"
+#include "settings/NumberText.h"
 
 namespace cli {
 namespace {
@@ -21,14 +20,11 @@ using runtime::StorageFault;
 
 constexpr const char* kGoWithout = "--storage none does without";
 
-/// A number as the driver reads it: decimal, 0x hexadecimal, leading 0 octal; but all of the text.
+/// A number as the driver reads it, but all of the text.
 std::optional<long> wholeNumber(const std::string& text) {
-    if (text.empty()) return std::nullopt;
-    char* end = nullptr;
-    errno = 0;
-    const long number = std::strtol(text.c_str(), &end, 0);
-    if (errno != 0 || *end != '\0') return std::nullopt;
-    return number;
+    const settings::NumberReading reading = settings::readNumber(text);
+    if (reading.partial) return std::nullopt;
+    return reading.value;
 }
 
 std::string addressFault(const std::string& node, const std::string& text) {
