@@ -10,7 +10,7 @@
 namespace cli {
 namespace {
 
-bool g_taken[std::size(kEndSignals)] = {};
+bool takenSignals[std::size(kEndSignals)] = {};
 
 /// Every signal waits while it runs, so that no second one comes between, and no terminal stops a
 /// job in the background that puts its settings back.
@@ -35,14 +35,14 @@ bool isIgnored(int signal) {
 
 void endOnSignals() {
     for (std::size_t i = 0; i < std::size(kEndSignals); ++i) {
-        g_taken[i] = !isIgnored(kEndSignals[i]);
+        takenSignals[i] = !isIgnored(kEndSignals[i]);
     }
     retakeEndSignals();
 }
 
 void retakeEndSignals() {
     for (std::size_t i = 0; i < std::size(kEndSignals); ++i) {
-        if (g_taken[i]) take(kEndSignals[i]);
+        if (takenSignals[i]) take(kEndSignals[i]);
     }
 }
 

@@ -35,7 +35,7 @@ std::unique_ptr<sim::Simulator> makeSimulator(const LineOptions& options,
                                               const std::string& configText) {
     if (!options.sim) return nullptr;
     sim::SimulatorOptions simOptions;
-    simOptions.mode = isAscii(configText) ? wire::Mode::ascii : wire::Mode::rtu;
+    simOptions.mode = isAscii(configText) ? wire::Mode::Ascii : wire::Mode::Rtu;
     simOptions.nodes = simNodesFor(configText);
     return std::make_unique<sim::Simulator>(std::move(simOptions));
 }

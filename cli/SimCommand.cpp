@@ -82,7 +82,7 @@ std::vector<sim::NodeOptions> nodesOf(const SimOptions& options) {
 
 std::unique_ptr<sim::Simulator> makeSimulator(CommandContext& context, const SimOptions& options) {
     sim::SimulatorOptions simOptions;
-    simOptions.mode = options.ascii ? wire::Mode::ascii : wire::Mode::rtu;
+    simOptions.mode = options.ascii ? wire::Mode::Ascii : wire::Mode::Rtu;
     simOptions.nodes = nodesOf(options);
     simOptions.link = options.link;
     if (options.trace) {
@@ -125,7 +125,7 @@ void serve(CommandContext& context, const SimOptions& options) {
         throw CommandError(ExitCode::Port, error.what());
     }
     announce(context.out, *simulator, options);
-    if (simulator->wait() == sim::Simulator::End::hungUp) {
+    if (simulator->wait() == sim::Simulator::End::HungUp) {
         throw CommandError(ExitCode::Port, "the line hung up");
     }
 }

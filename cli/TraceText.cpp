@@ -47,7 +47,7 @@ std::string TraceText::frameOf(ByteView bytes) const {
 
 std::string TraceText::meaningOf(const runtime::TraceEvent& event) {
     if (!style_.meaning) return {};
-    const FrameMeaning fresh(style_.ascii ? wire::Mode::ascii : wire::Mode::rtu);
+    const FrameMeaning fresh(style_.ascii ? wire::Mode::Ascii : wire::Mode::Rtu);
     FrameMeaning& port = ports_.try_emplace(event.port, fresh).first->second;
     const bool sent = event.direction == runtime::TraceDirection::Sent;
     return " | " + (sent ? port.ofRequest(event.bytes) : port.ofReply(event.bytes));

@@ -20,14 +20,14 @@ struct FunctionRow {
 };
 
 constexpr std::array kFunctions{
-    FunctionRow{1, Shape::read, Area::coil, 2000},
-    FunctionRow{2, Shape::read, Area::discreteInput, 2000},
-    FunctionRow{3, Shape::read, Area::holdingRegister, 125},
-    FunctionRow{4, Shape::read, Area::inputRegister, 125},
-    FunctionRow{5, Shape::writeOne, Area::coil, 1},
-    FunctionRow{6, Shape::writeOne, Area::holdingRegister, 1},
-    FunctionRow{15, Shape::writeMany, Area::coil, 1968},
-    FunctionRow{16, Shape::writeMany, Area::holdingRegister, 123},
+    FunctionRow{1, Shape::read, Area::Coil, 2000},
+    FunctionRow{2, Shape::read, Area::DiscreteInput, 2000},
+    FunctionRow{3, Shape::read, Area::HoldingRegister, 125},
+    FunctionRow{4, Shape::read, Area::InputRegister, 125},
+    FunctionRow{5, Shape::writeOne, Area::Coil, 1},
+    FunctionRow{6, Shape::writeOne, Area::HoldingRegister, 1},
+    FunctionRow{15, Shape::writeMany, Area::Coil, 1968},
+    FunctionRow{16, Shape::writeMany, Area::HoldingRegister, 123},
 };
 
 /// The 250 data bytes of 125 registers, 4 for each.
@@ -60,12 +60,12 @@ std::uint32_t take(ByteView bytes) {
 }
 
 bool isBit(Area area) {
-    return area == Area::coil || area == Area::discreteInput;
+    return area == Area::Coil || area == Area::DiscreteInput;
 }
 
 /// Bytes of one register on the line.
 std::size_t widthOf(Area area) {
-    return area == Area::longRegister ? 4 : 2;
+    return area == Area::LongRegister ? 4 : 2;
 }
 
 std::size_t dataBytes(Area area, std::uint32_t count) {
@@ -74,14 +74,14 @@ std::size_t dataBytes(Area area, std::uint32_t count) {
 
 /// The area that the request means: Enron registers hide behind functions 3 and 6.
 Area areaOf(const FunctionRow& row, const Memory& memory, std::uint16_t address) {
-    const bool mayBeLong = row.area == Area::holdingRegister && row.shape != Shape::writeMany;
+    const bool mayBeLong = row.area == Area::HoldingRegister && row.shape != Shape::writeMany;
     const bool isLong = mayBeLong && memory.longs() && memory.longs()->contains(address);
-    return isLong ? Area::longRegister : row.area;
+    return isLong ? Area::LongRegister : row.area;
 }
 
 bool inReach(const Memory& memory, Area area, std::uint32_t address, std::uint32_t count) {
     if (!memory.has(area, address, count)) return false;
-    if (area != Area::holdingRegister || !memory.longs()) return true;
+    if (area != Area::HoldingRegister || !memory.longs()) return true;
     const LongRange& longs = *memory.longs();
     return address + count <= longs.base || address >= longs.base + longs.count;
 }
@@ -108,14 +108,14 @@ Bytes packRegisters(const Memory& memory, Area area, std::uint32_t address, std:
 }
 
 Bytes read(const FunctionRow& row, const Memory& memory, ByteView request) {
-    if (request.size() != kHeader) return refuse(request, Exception::illegalDataValue);
+    if (request.size() != kHeader) return refuse(request, Exception::IllegalDataValue);
     const std::uint16_t address = wordAt(request, 1);
     const std::uint16_t count = wordAt(request, 3);
     const Area area = areaOf(row, memory, address);
-    const std::uint32_t limit = area == Area::longRegister ? kMaxReadLongs : row.maxCount;
-    if (count < 1 || count > limit) return refuse(request, Exception::illegalDataValue);
+    const std::uint32_t limit = area == Area::LongRegister ? kMaxReadLongs : row.maxCount;
+    if (count < 1 || count > limit) return refuse(request, Exception::IllegalDataValue);
     if (!inReach(memory, area, address, count)) {
-        return refuse(request, Exception::illegalDataAddress);
+        return refuse(request, Exception::IllegalDataAddress);
     }
     const Bytes data = isBit(area) ? packBits(memory, area, address, count)
                                    : packRegisters(memory, area, address, count);
@@ -125,17 +125,17 @@ Bytes read(const FunctionRow& row, const Memory& memory, ByteView request) {
 }
 
 Bytes writeOne(const FunctionRow& row, Memory& memory, ByteView request) {
-    if (request.size() < kHeader) return refuse(request, Exception::illegalDataValue);
+    if (request.size() < kHeader) return refuse(request, Exception::IllegalDataValue);
     const std::uint16_t address = wordAt(request, 1);
     const Area area = areaOf(row, memory, address);
     if (request.size() != 1 + 2 + widthOf(area)) {
-        return refuse(request, Exception::illegalDataValue);
+        return refuse(request, Exception::IllegalDataValue);
     }
     const std::uint32_t value = take(request.subspan(3));
-    const bool legal = area != Area::coil || value == 0x0000 || value == 0xFF00;
-    if (!legal) return refuse(request, Exception::illegalDataValue);
-    if (!inReach(memory, area, address, 1)) return refuse(request, Exception::illegalDataAddress);
-    memory.set(area, address, area == Area::coil ? value >> 15U : value);
+    const bool legal = area != Area::Coil || value == 0x0000 || value == 0xFF00;
+    if (!legal) return refuse(request, Exception::IllegalDataValue);
+    if (!inReach(memory, area, address, 1)) return refuse(request, Exception::IllegalDataAddress);
+    memory.set(area, address, area == Area::Coil ? value >> 15U : value);
     return {request.begin(), request.end()};
 }
 
@@ -145,16 +145,16 @@ std::uint32_t itemAt(Area area, ByteView data, std::uint32_t index) {
 }
 
 Bytes writeMany(const FunctionRow& row, Memory& memory, ByteView request) {
-    if (request.size() < kHeader + 1) return refuse(request, Exception::illegalDataValue);
+    if (request.size() < kHeader + 1) return refuse(request, Exception::IllegalDataValue);
     const std::uint16_t address = wordAt(request, 1);
     const std::uint16_t count = wordAt(request, 3);
     const ByteView data = request.subspan(kHeader + 1);
     const bool legal = count >= 1 && count <= row.maxCount &&
                        request[kHeader] == dataBytes(row.area, count) &&
                        data.size() == request[kHeader];
-    if (!legal) return refuse(request, Exception::illegalDataValue);
+    if (!legal) return refuse(request, Exception::IllegalDataValue);
     if (!inReach(memory, row.area, address, count)) {
-        return refuse(request, Exception::illegalDataAddress);
+        return refuse(request, Exception::IllegalDataAddress);
     }
     for (std::uint32_t i = 0; i < count; ++i) {
         memory.set(row.area, address + i, itemAt(row.area, data, i));
@@ -175,7 +175,7 @@ bool isWrite(std::uint8_t function) {
 
 Bytes execute(Memory& memory, ByteView request) {
     const FunctionRow* row = rowOf(request[0]);
-    if (row == nullptr) return refuse(request, Exception::illegalFunction);
+    if (row == nullptr) return refuse(request, Exception::IllegalFunction);
     if (row->shape == Shape::read) return read(*row, memory, request);
     if (row->shape == Shape::writeOne) return writeOne(*row, memory, request);
     return writeMany(*row, memory, request);
@@ -193,7 +193,7 @@ std::optional<std::size_t> lengthOfRequest(ByteView firstBytes, bool longAt) {
     if (row == nullptr) return std::nullopt;
     if (row->shape == Shape::read) return kFixed;
     if (row->shape == Shape::writeOne) {
-        return row->area == Area::holdingRegister && longAt ? kFixed + 2 : kFixed;
+        return row->area == Area::HoldingRegister && longAt ? kFixed + 2 : kFixed;
     }
     if (firstBytes.size() <= 1 + kHeader) return std::nullopt;
     return kFixed + 1 + firstBytes[1 + kHeader];

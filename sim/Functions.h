@@ -10,9 +10,9 @@ namespace sim {
 
 /// Source of the codes: Modbus Application Protocol V1.1b3, 7.
 enum class Exception : std::uint8_t {
-    illegalFunction = 1,
-    illegalDataAddress = 2,
-    illegalDataValue = 3,
+    IllegalFunction = 1,
+    IllegalDataAddress = 2,
+    IllegalDataValue = 3,
 };
 
 /// Executes a request.

@@ -22,20 +22,20 @@ std::string characters(ByteView bytes) {
 
 const char* nameOf(LineEvent::Kind kind) {
     switch (kind) {
-        case LineEvent::Kind::request:
+        case LineEvent::Kind::Request:
             return "request";
-        case LineEvent::Kind::damaged:
+        case LineEvent::Kind::Damaged:
             return "damaged";
-        case LineEvent::Kind::reply:
+        case LineEvent::Kind::Reply:
             return "reply";
-        case LineEvent::Kind::hangUp:
+        case LineEvent::Kind::HangUp:
             return "hang-up";
     }
     return "unknown";
 }
 
 std::string describe(const LineEvent& event, Mode mode) {
-    const std::string bytes = mode == Mode::rtu ? wire::hexText(event.raw) : characters(event.raw);
+    const std::string bytes = mode == Mode::Rtu ? wire::hexText(event.raw) : characters(event.raw);
     return nameOf(event.kind) + (bytes.empty() ? "" : " " + bytes);
 }
 

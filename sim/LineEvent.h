@@ -11,12 +11,12 @@ namespace sim {
 /// Something that happened on the line.
 struct LineEvent {
     enum class Kind : std::uint8_t {
-        request,  ///< A frame with a right check, for whatever node.
-        damaged,  ///< Bytes that are no frame; they stay unanswered.
-        reply,    ///< What was sent, faults included.
-        hangUp,   ///< A fault ended the line; no bytes.
+        Request,  ///< A frame with a right check, for whatever node.
+        Damaged,  ///< Bytes that are no frame; they stay unanswered.
+        Reply,    ///< What was sent, faults included.
+        HangUp,   ///< A fault ended the line; no bytes.
     };
-    Kind kind = Kind::request;
+    Kind kind = Kind::Request;
     wire::Bytes raw;  ///< As on the line: RTU bytes or ASCII characters, check included.
     std::chrono::steady_clock::time_point at{};
 };

@@ -21,15 +21,15 @@ std::uint32_t initialValue(Area area, std::uint8_t node, std::uint16_t address) 
     const std::uint32_t n = node;
     const std::uint32_t a = address;
     switch (area) {
-        case Area::coil:
+        case Area::Coil:
             return (a + n) % 3 == 0 ? 1 : 0;
-        case Area::discreteInput:
+        case Area::DiscreteInput:
             return (a + n) % 5 < 2 ? 1 : 0;
-        case Area::holdingRegister:
+        case Area::HoldingRegister:
             return (1000 * n + a) & 0xFFFFU;
-        case Area::inputRegister:
+        case Area::InputRegister:
             return (30000 + 1000 * n + a) & 0xFFFFU;
-        case Area::longRegister:
+        case Area::LongRegister:
             return 100003U * (1000 * n + a);  // Unsigned: wraps at 2^32.
     }
     return 0;
@@ -38,11 +38,11 @@ std::uint32_t initialValue(Area area, std::uint8_t node, std::uint16_t address) 
 Memory::Memory(std::uint8_t node, const AreaSizes& sizes, std::optional<LongRange> longs)
     : longs_(longs) {
     const LongRange range = longs.value_or(LongRange{.base = 0, .count = 0});
-    addArea(Area::coil, node, 0, sizes.coils, 1);
-    addArea(Area::discreteInput, node, 0, sizes.discreteInputs, 1);
-    addArea(Area::holdingRegister, node, 0, sizes.holdingRegisters, 0xFFFF);
-    addArea(Area::inputRegister, node, 0, sizes.inputRegisters, 0xFFFF);
-    addArea(Area::longRegister, node, range.base, range.count, 0xFFFFFFFF);
+    addArea(Area::Coil, node, 0, sizes.coils, 1);
+    addArea(Area::DiscreteInput, node, 0, sizes.discreteInputs, 1);
+    addArea(Area::HoldingRegister, node, 0, sizes.holdingRegisters, 0xFFFF);
+    addArea(Area::InputRegister, node, 0, sizes.inputRegisters, 0xFFFF);
+    addArea(Area::LongRegister, node, range.base, range.count, 0xFFFFFFFF);
 }
 
 void Memory::addArea(Area area, std::uint8_t node, std::uint32_t base, std::uint32_t count,

@@ -9,11 +9,11 @@ namespace sim {
 
 /// Addresses count from 0, as they do on the line.
 enum class Area : std::uint8_t {
-    coil,             ///< 1 bit, functions 1, 5, 15.
-    discreteInput,    ///< 1 bit, function 2.
-    holdingRegister,  ///< 16 bits, functions 3, 6, 16.
-    inputRegister,    ///< 16 bits, function 4.
-    longRegister,     ///< 32 bits (Enron), functions 3 and 6.
+    Coil,             ///< 1 bit, functions 1, 5, 15.
+    DiscreteInput,    ///< 1 bit, function 2.
+    HoldingRegister,  ///< 16 bits, functions 3, 6, 16.
+    InputRegister,    ///< 16 bits, function 4.
+    LongRegister,     ///< 32 bits (Enron), functions 3 and 6.
 };
 
 /// Items of each area, 0..65536.

@@ -91,9 +91,9 @@ void Simulator::requestStop() noexcept {
 
 Simulator::End Simulator::wait() {
     joinServing();
-    if (hungUp_) return End::hungUp;
+    if (hungUp_) return End::HungUp;
     forgetStopRequest();
-    return End::stopped;
+    return End::Stopped;
 }
 
 void Simulator::joinServing() {
@@ -158,8 +158,8 @@ Simulator::Wake Simulator::waitUntil(Clock::time_point deadline, bool bytesToo) 
         pollfd{.fd = bytesToo ? line_->descriptor() : -1, .events = POLLIN, .revents = 0}};
     while (true) {
         const int ready = ::poll(watched.data(), watched.size(), millisecondsTo(deadline));
-        if (ready > 0) return watched[0].revents != 0 ? Wake::stop : Wake::bytes;
-        if (Clock::now() >= deadline) return Wake::time;
+        if (ready > 0) return watched[0].revents != 0 ? Wake::Stop : Wake::Bytes;
+        if (Clock::now() >= deadline) return Wake::Time;
     }
 }
 
@@ -169,9 +169,9 @@ void Simulator::serve() {
     Clock::time_point silence = kForever;
     while (!ended_) {
         const Wake wake = waitUntil(silence, true);
-        if (wake == Wake::stop) ended_ = true;
-        if (wake == Wake::bytes) receive(splitter, silence);
-        if (wake == Wake::time) {
+        if (wake == Wake::Stop) ended_ = true;
+        if (wake == Wake::Bytes) receive(splitter, silence);
+        if (wake == Wake::Time) {
             silence = kForever;
             if (const auto frame = splitter.silence()) handle(*frame);
         }
@@ -189,7 +189,7 @@ void Simulator::receive(FrameSplitter& splitter, Clock::time_point& silence) {
 }
 
 void Simulator::handle(const Received& frame) {
-    record(frame.damaged() ? LineEvent::Kind::damaged : LineEvent::Kind::request, frame.raw);
+    record(frame.damaged() ? LineEvent::Kind::Damaged : LineEvent::Kind::Request, frame.raw);
     if (frame.damaged()) return;
     const std::uint8_t node = frame.message[0];
     const Fault fault = slave_.hasNode(node) ? faults_.take(node).value_or(Fault{}) : Fault{};
@@ -203,7 +203,7 @@ void Simulator::handle(const Received& frame) {
 void Simulator::send(const Transmission& transmission) {
     if (!pause(transmission.delayMs)) return;
     // Noted first: who has read the reply finds it in the log.
-    if (!transmission.bytes.empty()) record(LineEvent::Kind::reply, transmission.bytes);
+    if (!transmission.bytes.empty()) record(LineEvent::Kind::Reply, transmission.bytes);
     const bool inPieces = transmission.dripBytes != 0;
     if (inPieces) sendPieces(transmission);
     if (!inPieces) line_->write(transmission.bytes);
@@ -224,7 +224,7 @@ void Simulator::sendPieces(const Transmission& transmission) {
 
 bool Simulator::pause(std::uint32_t ms) {
     if (ms == 0) return true;
-    ended_ = waitUntil(Clock::now() + std::chrono::milliseconds(ms), false) == Wake::stop;
+    ended_ = waitUntil(Clock::now() + std::chrono::milliseconds(ms), false) == Wake::Stop;
     return !ended_;
 }
 
@@ -232,7 +232,7 @@ void Simulator::hangUp() {
     // Marked and noted first: who has seen the line go may start() at once and finds it in the log.
     hungUp_ = true;
     ended_ = true;
-    record(LineEvent::Kind::hangUp, {});
+    record(LineEvent::Kind::HangUp, {});
     line_->hangUp();
 }
 

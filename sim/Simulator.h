@@ -1,6 +1,6 @@
 // A simulated line with Modbus nodes on a pseudo terminal, with faults on demand.
 //
-//     sim::Simulator simulator({.mode = wire::Mode::rtu, .nodes = {{.address = 1}}});
+//     sim::Simulator simulator({.mode = wire::Mode::Rtu, .nodes = {{.address = 1}}});
 //     simulator.start();
 //     openPort(simulator.path());
 #pragma once
@@ -27,7 +27,7 @@
 namespace sim {
 
 struct SimulatorOptions {
-    wire::Mode mode = wire::Mode::rtu;
+    wire::Mode mode = wire::Mode::Rtu;
     std::vector<NodeOptions> nodes = {NodeOptions{}};
     std::string link{};            ///< Symbolic link to the device, see PtyLine. Empty: none.
     std::uint32_t silenceMs = 20;  ///< Silence that ends an RTU frame of no announced length, 1..
@@ -60,7 +60,7 @@ class Simulator {
     /// before start(), serving ends as soon as it begins.
     void requestStop() noexcept;
 
-    enum class End : std::uint8_t { stopped, hungUp };
+    enum class End : std::uint8_t { Stopped, HungUp };
 
     /// Blocks until requestStop() or a hang-up has ended serving, then cleans up as stop() does.
     End wait();
@@ -87,7 +87,7 @@ class Simulator {
   private:
     using Clock = std::chrono::steady_clock;
 
-    enum class Wake : std::uint8_t { time, bytes, stop };
+    enum class Wake : std::uint8_t { Time, Bytes, Stop };
     Wake waitUntil(Clock::time_point deadline, bool bytesToo) const;
     bool pause(std::uint32_t ms);
     void joinServing();

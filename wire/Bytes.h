@@ -11,6 +11,6 @@ using Bytes = std::vector<std::uint8_t>;
 using ByteView = std::span<const std::uint8_t>;
 
 /// How frames travel. Source: Modbus over Serial Line V1.02, 2.5.
-enum class Mode : std::uint8_t { rtu, ascii };
+enum class Mode : std::uint8_t { Rtu, Ascii };
 
 }  // namespace wire

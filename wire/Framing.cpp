@@ -51,12 +51,12 @@ Bytes decodeAscii(ByteView raw) {
 }  // namespace
 
 Bytes encodeFrame(Mode mode, ByteView message, bool breakCheck) {
-    return mode == Mode::rtu ? encodeRtu(message, breakCheck) : encodeAscii(message, breakCheck);
+    return mode == Mode::Rtu ? encodeRtu(message, breakCheck) : encodeAscii(message, breakCheck);
 }
 
 Received decodeFrame(Mode mode, ByteView raw) {
     return {.raw = Bytes(raw.begin(), raw.end()),
-            .message = mode == Mode::rtu ? decodeRtu(raw) : decodeAscii(raw)};
+            .message = mode == Mode::Rtu ? decodeRtu(raw) : decodeAscii(raw)};
 }
 
 FrameSplitter::FrameSplitter(Mode mode, RequestLength requestLength)
@@ -65,7 +65,7 @@ FrameSplitter::FrameSplitter(Mode mode, RequestLength requestLength)
 std::vector<Received> FrameSplitter::add(ByteView bytes) {
     std::vector<Received> frames;
     for (const std::uint8_t byte : bytes) {
-        auto frame = mode_ == Mode::rtu ? addRtu(byte) : addAscii(byte);
+        auto frame = mode_ == Mode::Rtu ? addRtu(byte) : addAscii(byte);
         if (frame) frames.push_back(*std::move(frame));
     }
     return frames;

@@ -52,7 +52,7 @@ class FrameSplitter {
     std::optional<Received> silence();
 
     /// Whether silence() would return a frame.
-    bool waitsForSilence() const { return mode_ == Mode::rtu && !pending_.empty(); }
+    bool waitsForSilence() const { return mode_ == Mode::Rtu && !pending_.empty(); }
 
   private:
     std::optional<Received> addRtu(std::uint8_t byte);

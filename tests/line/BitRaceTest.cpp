@@ -10,7 +10,7 @@ constexpr int kRounds = 150;
 
 TEST(BitRaceTest, FlippingBitsOfOneRegisterLosesNoUpdateOnALine) {
     DriverLine line;
-    line.simulator.slave().set(1, sim::Area::holdingRegister, 9, 0);
+    line.simulator.slave().set(1, sim::Area::HoldingRegister, 9, 0);
 
     std::atomic<int> lost = 0;
     const auto flip = [&line, &lost](const ITag* bit) {
@@ -29,7 +29,7 @@ TEST(BitRaceTest, FlippingBitsOfOneRegisterLosesNoUpdateOnALine) {
     first.join();
     second.join();
     EXPECT_EQ(0, lost) << line.lastError();
-    EXPECT_EQ(0U, line.simulator.slave().get(1, sim::Area::holdingRegister, 9));
+    EXPECT_EQ(0U, line.simulator.slave().get(1, sim::Area::HoldingRegister, 9));
 }
 
 }  // namespace

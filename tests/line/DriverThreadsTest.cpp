@@ -18,7 +18,7 @@ class DriverThreadsTest : public testing::Test {
   protected:
     DriverThreadsTest() {
         for (unsigned number = 0; number < 20; ++number)
-            line_.simulator.slave().set(1, sim::Area::holdingRegister, number, 1000 + number);
+            line_.simulator.slave().set(1, sim::Area::HoldingRegister, number, 1000 + number);
     }
 
     void repeat(const std::function<void(int)>& work) {

@@ -49,7 +49,7 @@ class SimLibmodbusTest : public testing::Test {
     int lastFunction() const {
         int function = 0;
         for (const auto& event : simulator.log()) {
-            if (event.kind == sim::LineEvent::Kind::request) function = event.raw[1];
+            if (event.kind == sim::LineEvent::Kind::Request) function = event.raw[1];
         }
         return function;
     }
@@ -106,14 +106,14 @@ TEST_F(SimLibmodbusTest, Function4ReadsInputRegisters) {
 TEST_F(SimLibmodbusTest, Function5WritesOneCoil) {
     for (const int on : {1, 0, 1}) {
         ASSERT_EQ(1, modbus_write_bit(client.get(), 9999, on));
-        EXPECT_EQ(static_cast<std::uint32_t>(on), item(Area::coil, 9999));
+        EXPECT_EQ(static_cast<std::uint32_t>(on), item(Area::Coil, 9999));
     }
     EXPECT_EQ(5, lastFunction());
 }
 
 TEST_F(SimLibmodbusTest, Function6WritesOneRegister) {
     ASSERT_EQ(1, modbus_write_register(client.get(), 9999, 0xBEEF));
-    EXPECT_EQ(0xBEEFU, item(Area::holdingRegister, 9999));
+    EXPECT_EQ(0xBEEFU, item(Area::HoldingRegister, 9999));
     EXPECT_EQ(6, lastFunction());
 }
 
@@ -124,7 +124,7 @@ TEST_F(SimLibmodbusTest, Function15WritesManyCoils) {
             bits[i] = (i * i + 1) % 7 < 3 ? 1 : 0;
         ASSERT_EQ(count, modbus_write_bits(client.get(), 11, count, bits.data()));
         for (int i = 0; i < count; ++i) {
-            EXPECT_EQ(bits[static_cast<std::size_t>(i)], item(Area::coil, 11 + i)) << count << i;
+            EXPECT_EQ(bits[static_cast<std::size_t>(i)], item(Area::Coil, 11 + i)) << count << i;
         }
     }
     EXPECT_EQ(15, lastFunction());
@@ -138,10 +138,10 @@ TEST_F(SimLibmodbusTest, Function16WritesManyRegisters) {
     for (const int count : {1, 2, 123}) {
         ASSERT_EQ(count, modbus_write_registers(client.get(), 40, count, words.data()));
         for (int i = 0; i < count; ++i) {
-            EXPECT_EQ(words[static_cast<std::size_t>(i)], item(Area::holdingRegister, 40 + i));
+            EXPECT_EQ(words[static_cast<std::size_t>(i)], item(Area::HoldingRegister, 40 + i));
         }
     }
-    EXPECT_EQ(1000U * kNode + 163U, item(Area::holdingRegister, 163));
+    EXPECT_EQ(1000U * kNode + 163U, item(Area::HoldingRegister, 163));
     EXPECT_EQ(16, lastFunction());
 }
 
@@ -181,7 +181,7 @@ TEST_F(SimLibmodbusTest, BroadcastWritesBothNodes) {
     std::uint16_t word = 0;
     ASSERT_EQ(1, modbus_read_registers(client.get(), 1, 1, &word));
     EXPECT_EQ(4711, word);
-    EXPECT_EQ(4711U, item(Area::holdingRegister, 1));
+    EXPECT_EQ(4711U, item(Area::HoldingRegister, 1));
 }
 
 TEST_F(SimLibmodbusTest, LongRegistersAnswerRawRequests) {

@@ -95,14 +95,14 @@ TEST_F(SimMbpollTest, Function4ReadsInputRegisters) {
 TEST_F(SimMbpollTest, Function5WritesOneCoil) {
     const auto result = mbpoll(kCoil, {"-r", "5"}, {"1"});
     EXPECT_EQ(0, result.exitCode) << result.output;
-    EXPECT_EQ(1U, item(Area::coil, 5));
+    EXPECT_EQ(1U, item(Area::Coil, 5));
     EXPECT_EQ(5, functionOfFirstRequest());
 }
 
 TEST_F(SimMbpollTest, Function6WritesOneRegister) {
     const auto result = mbpoll(kHoldingRegister, {"-r", "5"}, {"4711"});
     EXPECT_EQ(0, result.exitCode) << result.output;
-    EXPECT_EQ(4711U, item(Area::holdingRegister, 5));
+    EXPECT_EQ(4711U, item(Area::HoldingRegister, 5));
     EXPECT_EQ(6, functionOfFirstRequest());
 }
 
@@ -111,7 +111,7 @@ TEST_F(SimMbpollTest, Function15WritesManyCoils) {
     EXPECT_EQ(0, result.exitCode) << result.output;
     const wire::Bytes written{1, 0, 0, 1, 1, 0, 1, 1, 1};
     for (std::uint32_t i = 0; i < written.size(); ++i) {
-        EXPECT_EQ(written[i], item(Area::coil, 8 + i)) << i;
+        EXPECT_EQ(written[i], item(Area::Coil, 8 + i)) << i;
     }
     EXPECT_EQ(15, functionOfFirstRequest());
 }
@@ -119,9 +119,9 @@ TEST_F(SimMbpollTest, Function15WritesManyCoils) {
 TEST_F(SimMbpollTest, Function16WritesManyRegisters) {
     const auto result = mbpoll(kHoldingRegister, {"-r", "5"}, {"1", "65535", "256"});
     EXPECT_EQ(0, result.exitCode) << result.output;
-    EXPECT_EQ(1U, item(Area::holdingRegister, 5));
-    EXPECT_EQ(65535U, item(Area::holdingRegister, 6));
-    EXPECT_EQ(256U, item(Area::holdingRegister, 7));
+    EXPECT_EQ(1U, item(Area::HoldingRegister, 5));
+    EXPECT_EQ(65535U, item(Area::HoldingRegister, 6));
+    EXPECT_EQ(256U, item(Area::HoldingRegister, 7));
     EXPECT_EQ(16, functionOfFirstRequest());
 }
 

@@ -39,16 +39,16 @@ TEST_P(SimPymodbusTest, EveryFunctionCodeAgrees) {
         "back 7200 1 65535 256 7204\n"
         "beyond 2\n",
         result.output);
-    EXPECT_EQ(1U, simulator.slave().get(7, Area::coil, 100));
-    EXPECT_EQ(4711U, simulator.slave().get(7, Area::holdingRegister, 100));
-    EXPECT_EQ(1U, simulator.slave().get(7, Area::coil, 201));
-    EXPECT_EQ(0U, simulator.slave().get(7, Area::coil, 202));
-    EXPECT_EQ(1U, simulator.slave().get(7, Area::coil, 203));
+    EXPECT_EQ(1U, simulator.slave().get(7, Area::Coil, 100));
+    EXPECT_EQ(4711U, simulator.slave().get(7, Area::HoldingRegister, 100));
+    EXPECT_EQ(1U, simulator.slave().get(7, Area::Coil, 201));
+    EXPECT_EQ(0U, simulator.slave().get(7, Area::Coil, 202));
+    EXPECT_EQ(1U, simulator.slave().get(7, Area::Coil, 203));
 }
 
 INSTANTIATE_TEST_SUITE_P(Modes, SimPymodbusTest,
-                         testing::Values(std::pair{wire::Mode::rtu, "rtu"},
-                                         std::pair{wire::Mode::ascii, "ascii"}),
+                         testing::Values(std::pair{wire::Mode::Rtu, "rtu"},
+                                         std::pair{wire::Mode::Ascii, "ascii"}),
                          [](const auto& each) { return std::string(each.param.second); });
 
 }  // namespace

@@ -15,8 +15,8 @@ class EnronTest : public testing::Test {
 };
 
 TEST_F(EnronTest, ReadCountsInLongRegistersMostSignificantByteFirst) {
-    slave.set(1, Area::longRegister, 5001, 0x11223344);
-    slave.set(1, Area::longRegister, 5002, 0x55667788);
+    slave.set(1, Area::LongRegister, 5001, 0x11223344);
+    slave.set(1, Area::LongRegister, 5002, 0x55667788);
     EXPECT_EQ((Bytes{1, 3, 8, 0x11, 0x22, 0x33, 0x44, 0x55, 0x66, 0x77, 0x88}),
               slave.answer(Bytes{1, 3, 0x13, 0x89, 0, 2}));
 }
@@ -24,8 +24,8 @@ TEST_F(EnronTest, ReadCountsInLongRegistersMostSignificantByteFirst) {
 TEST_F(EnronTest, WriteCarriesFourBytesAndIsEchoedWhole) {
     const Bytes request{1, 6, 0x13, 0x88, 0xDE, 0xAD, 0xBE, 0xEF};
     EXPECT_EQ(request, slave.answer(request));
-    EXPECT_EQ(0xDEADBEEFU, slave.get(1, Area::longRegister, 5000));
-    EXPECT_EQ(6000U, slave.get(1, Area::holdingRegister, 5000));
+    EXPECT_EQ(0xDEADBEEFU, slave.get(1, Area::LongRegister, 5000));
+    EXPECT_EQ(6000U, slave.get(1, Area::HoldingRegister, 5000));
 }
 
 TEST_F(EnronTest, SixtyTwoIsTheLargestRead) {
@@ -45,12 +45,12 @@ TEST_F(EnronTest, ReadsDoNotCrossTheRangesBounds) {
 
 TEST_F(EnronTest, ShortWriteIntoTheRangeIsRefused) {
     EXPECT_EQ((Bytes{1, 0x86, 3}), slave.answer(Bytes{1, 6, 0x13, 0x88, 0, 1}));
-    EXPECT_EQ(600018000U, slave.get(1, Area::longRegister, 5000));
+    EXPECT_EQ(600018000U, slave.get(1, Area::LongRegister, 5000));
 }
 
 TEST_F(EnronTest, Function16DoesNotReachTheRange) {
     EXPECT_EQ((Bytes{1, 0x90, 2}), slave.answer(Bytes{1, 16, 0x13, 0x87, 0, 2, 4, 0, 1, 0, 2}));
-    EXPECT_EQ(5999U, slave.get(1, Area::holdingRegister, 4999));
+    EXPECT_EQ(5999U, slave.get(1, Area::HoldingRegister, 4999));
 }
 
 TEST_F(EnronTest, OtherFunctionsAndNodesKnowNoLongRegisters) {
@@ -70,8 +70,8 @@ TEST_F(EnronTest, RequestLengthFollowsNodeAndAddress) {
 
 TEST_F(EnronTest, LongBroadcastReachesTheLongNodeOnly) {
     EXPECT_FALSE(slave.answer(Bytes{0, 6, 0x13, 0x88, 0, 1, 0, 2}));
-    EXPECT_EQ(0x00010002U, slave.get(1, Area::longRegister, 5000));
-    EXPECT_EQ(7000U, slave.get(2, Area::holdingRegister, 5000));
+    EXPECT_EQ(0x00010002U, slave.get(1, Area::LongRegister, 5000));
+    EXPECT_EQ(7000U, slave.get(2, Area::HoldingRegister, 5000));
 }
 
 }  // namespace

@@ -37,9 +37,9 @@ TEST_P(ExceptionTest, IsAnsweredWithItsCode) {
     EXPECT_EQ(expected, slave.answer(GetParam().request));
     for (std::uint32_t i = 0; i < 100; ++i) {
         const auto address = static_cast<std::uint16_t>(i);
-        EXPECT_EQ(initialValue(Area::coil, 1, address), slave.get(1, Area::coil, i));
-        EXPECT_EQ(initialValue(Area::holdingRegister, 1, address),
-                  slave.get(1, Area::holdingRegister, i));
+        EXPECT_EQ(initialValue(Area::Coil, 1, address), slave.get(1, Area::Coil, i));
+        EXPECT_EQ(initialValue(Area::HoldingRegister, 1, address),
+                  slave.get(1, Area::HoldingRegister, i));
     }
 }
 

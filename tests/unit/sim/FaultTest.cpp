@@ -14,11 +14,11 @@ const Bytes kReply{0x02, 0x07};  // Its CRC on the line is 41 12.
 const Bytes kFrame{0x02, 0x07, 0x41, 0x12};
 
 Bytes sentWith(const Fault& fault) {
-    return transmit(Mode::rtu, kReply, fault).bytes;
+    return transmit(Mode::Rtu, kReply, fault).bytes;
 }
 
 TEST(FaultTest, WithoutFaultTheFrameGoesOutInOne) {
-    const Transmission sent = transmit(Mode::rtu, kReply, Fault{});
+    const Transmission sent = transmit(Mode::Rtu, kReply, Fault{});
     EXPECT_EQ(kFrame, sent.bytes);
     EXPECT_EQ(0U, sent.delayMs);
     EXPECT_EQ(0U, sent.dripBytes);
@@ -27,13 +27,13 @@ TEST(FaultTest, WithoutFaultTheFrameGoesOutInOne) {
 
 TEST(FaultTest, WrongCheckSpoilsTheCheckOnly) {
     EXPECT_EQ((Bytes{0x02, 0x07, 0xBE, 0xED}), sentWith({.wrongCheck = true}));
-    const Bytes ascii = transmit(Mode::ascii, kReply, {.wrongCheck = true}).bytes;
+    const Bytes ascii = transmit(Mode::Ascii, kReply, {.wrongCheck = true}).bytes;
     EXPECT_EQ(":020708\r\n", std::string(ascii.begin(), ascii.end()));
 }
 
 TEST(FaultTest, WrongNodeHasARightCheck) {
     EXPECT_EQ((Bytes{0x03, 0x07, 0x40, 0x82}), sentWith({.wrongNode = true}));
-    const Bytes ascii = transmit(Mode::ascii, kReply, {.wrongNode = true}).bytes;
+    const Bytes ascii = transmit(Mode::Ascii, kReply, {.wrongNode = true}).bytes;
     EXPECT_EQ(":0307F6\r\n", std::string(ascii.begin(), ascii.end()));
 }
 
@@ -53,7 +53,7 @@ TEST(FaultTest, ReplacementIsSentAsItIs) {
 
 TEST(FaultTest, TimesArePassedOn) {
     const Transmission sent =
-        transmit(Mode::rtu, kReply, {.delayMs = 200, .dripBytes = 2, .dripGapMs = 50});
+        transmit(Mode::Rtu, kReply, {.delayMs = 200, .dripBytes = 2, .dripGapMs = 50});
     EXPECT_EQ(kFrame, sent.bytes);
     EXPECT_EQ(200U, sent.delayMs);
     EXPECT_EQ(2U, sent.dripBytes);
@@ -61,7 +61,7 @@ TEST(FaultTest, TimesArePassedOn) {
 }
 
 TEST(FaultTest, HangUpSendsWhatIsKeptOrNothing) {
-    const Transmission silent = transmit(Mode::rtu, kReply, {.hangUp = true});
+    const Transmission silent = transmit(Mode::Rtu, kReply, {.hangUp = true});
     EXPECT_TRUE(silent.hangUp);
     EXPECT_TRUE(silent.bytes.empty());
     EXPECT_EQ(Bytes{0x02}, sentWith({.keep = 1, .hangUp = true}));

@@ -31,46 +31,46 @@ class FunctionsTest : public testing::Test {
     }
 
     std::uint32_t word(std::uint32_t address) const {
-        return slave.get(kNode, Area::holdingRegister, address);
+        return slave.get(kNode, Area::HoldingRegister, address);
     }
 
     Slave slave{{NodeOptions{.address = kNode}}};
 };
 
 TEST_F(FunctionsTest, ReadCoils20To38) {
-    setBits(Area::coil, 19, {1, 0, 1, 1, 0, 0, 1, 1, 1, 1, 0, 1, 0, 1, 1, 0, 1, 0, 1});
-    setBits(Area::coil, 38, {1, 1, 1, 1, 1});  // Beyond the request: padding stays zero.
+    setBits(Area::Coil, 19, {1, 0, 1, 1, 0, 0, 1, 1, 1, 1, 0, 1, 0, 1, 1, 0, 1, 0, 1});
+    setBits(Area::Coil, 38, {1, 1, 1, 1, 1});  // Beyond the request: padding stays zero.
     expectReply({0x11, 0x01, 0x00, 0x13, 0x00, 0x13}, {0x11, 0x01, 0x03, 0xCD, 0x6B, 0x05});
 }
 
 TEST_F(FunctionsTest, ReadDiscreteInputs197To218) {
-    setBits(Area::discreteInput, 196,
+    setBits(Area::DiscreteInput, 196,
             {0, 0, 1, 1, 0, 1, 0, 1, 1, 1, 0, 1, 1, 0, 1, 1, 1, 0, 1, 0, 1, 1});
-    setBits(Area::discreteInput, 218, {1, 1});
+    setBits(Area::DiscreteInput, 218, {1, 1});
     expectReply({0x11, 0x02, 0x00, 0xC4, 0x00, 0x16}, {0x11, 0x02, 0x03, 0xAC, 0xDB, 0x35});
 }
 
 TEST_F(FunctionsTest, ReadHoldingRegisters108To110) {
-    setWords(Area::holdingRegister, 107, {0x022B, 0x0000, 0x0064});
+    setWords(Area::HoldingRegister, 107, {0x022B, 0x0000, 0x0064});
     expectReply({0x11, 0x03, 0x00, 0x6B, 0x00, 0x03},
                 {0x11, 0x03, 0x06, 0x02, 0x2B, 0x00, 0x00, 0x00, 0x64});
 }
 
 TEST_F(FunctionsTest, ReadInputRegister9) {
-    setWords(Area::inputRegister, 8, {0x000A});
+    setWords(Area::InputRegister, 8, {0x000A});
     expectReply({0x11, 0x04, 0x00, 0x08, 0x00, 0x01}, {0x11, 0x04, 0x02, 0x00, 0x0A});
 }
 
 TEST_F(FunctionsTest, WriteSingleCoil173OnAndOff) {
-    setBits(Area::coil, 171, {0, 0, 0});
+    setBits(Area::Coil, 171, {0, 0, 0});
     const Bytes on{0x11, 0x05, 0x00, 0xAC, 0xFF, 0x00};
     expectReply(on, on);
-    EXPECT_EQ(0U, slave.get(kNode, Area::coil, 171));
-    EXPECT_EQ(1U, slave.get(kNode, Area::coil, 172));
-    EXPECT_EQ(0U, slave.get(kNode, Area::coil, 173));
+    EXPECT_EQ(0U, slave.get(kNode, Area::Coil, 171));
+    EXPECT_EQ(1U, slave.get(kNode, Area::Coil, 172));
+    EXPECT_EQ(0U, slave.get(kNode, Area::Coil, 173));
     const Bytes off{0x11, 0x05, 0x00, 0xAC, 0x00, 0x00};
     expectReply(off, off);
-    EXPECT_EQ(0U, slave.get(kNode, Area::coil, 172));
+    EXPECT_EQ(0U, slave.get(kNode, Area::Coil, 172));
 }
 
 TEST_F(FunctionsTest, WriteSingleRegister2) {
@@ -82,12 +82,12 @@ TEST_F(FunctionsTest, WriteSingleRegister2) {
 }
 
 TEST_F(FunctionsTest, WriteMultipleCoils20To29) {
-    setBits(Area::coil, 18, {1, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 1});
+    setBits(Area::Coil, 18, {1, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 1});
     expectReply({0x11, 0x0F, 0x00, 0x13, 0x00, 0x0A, 0x02, 0xCD, 0x01},
                 {0x11, 0x0F, 0x00, 0x13, 0x00, 0x0A});
     const Bytes expected{1, 1, 0, 1, 1, 0, 0, 1, 1, 1, 0, 1};  // Coil 18, ten coils, coil 29.
     for (std::uint32_t i = 0; i < expected.size(); ++i) {
-        EXPECT_EQ(expected[i], slave.get(kNode, Area::coil, 18 + i)) << "coil " << 18 + i;
+        EXPECT_EQ(expected[i], slave.get(kNode, Area::Coil, 18 + i)) << "coil " << 18 + i;
     }
 }
 
@@ -117,7 +117,7 @@ TEST_F(FunctionsTest, LargestWrites) {
     coils.resize(7 + 246, 0xFF);
     expectReply(coils, {0x11, 0x0F, 0x00, 0x00, 0x07, 0xB0});
     for (std::uint32_t i = 0; i < 1968; ++i)
-        EXPECT_EQ(1U, slave.get(kNode, Area::coil, i)) << i;
+        EXPECT_EQ(1U, slave.get(kNode, Area::Coil, i)) << i;
 
     Bytes words{0x11, 0x10, 0x00, 0x00, 0x00, 0x7B, 246};
     words.resize(7 + 246);

@@ -24,7 +24,7 @@ class SimulatorFaultTest : public testing::Test {
   protected:
     void SetUp() override { simulator.start(); }
 
-    std::uint32_t register0() const { return simulator.slave().get(1, Area::holdingRegister, 0); }
+    std::uint32_t register0() const { return simulator.slave().get(1, Area::HoldingRegister, 0); }
 
     /// The next request is answered as if nothing had happened.
     void expectRecovery(TestMaster& master) {
@@ -156,8 +156,8 @@ TEST_F(SimulatorFaultTest, HangUpEndsTheLineUntilTheNextStart) {
     master.send(kRead0);
     EXPECT_TRUE(master.seesHangUp());
     EXPECT_FALSE(std::filesystem::exists(simulator.device()));
-    EXPECT_EQ(Simulator::End::hungUp, simulator.wait());
-    EXPECT_EQ(Kind::hangUp, simulator.log().back().kind);
+    EXPECT_EQ(Simulator::End::HungUp, simulator.wait());
+    EXPECT_EQ(Kind::HangUp, simulator.log().back().kind);
     simulator.start();
     TestMaster again(simulator.path());
     expectRecovery(again);

@@ -44,7 +44,7 @@ TEST(SimulatorTest, AnswersRtu) {
 }
 
 TEST(SimulatorTest, AnswersAscii) {
-    Simulator simulator({.mode = Mode::ascii});
+    Simulator simulator({.mode = Mode::Ascii});
     simulator.start();
     TestMaster master(simulator.path());
     master.send(":010300000001FB\r\n");
@@ -77,7 +77,7 @@ TEST(SimulatorTest, DamagedRequestStaysUnanswered) {
     master.send(kRead0);
     EXPECT_EQ(kRead0Reply, master.receive(kRead0Reply.size()));
     const auto events = simulator.log();
-    EXPECT_EQ((std::vector{Kind::damaged, Kind::request, Kind::reply}), kindsOf(events));
+    EXPECT_EQ((std::vector{Kind::Damaged, Kind::Request, Kind::Reply}), kindsOf(events));
     EXPECT_EQ(kRead0Damaged, events[0].raw);
     EXPECT_EQ(kRead0, events[1].raw);
     EXPECT_EQ(kRead0Reply, events[2].raw);
@@ -90,7 +90,7 @@ TEST(SimulatorTest, BroadcastIsExecutedAndStaysUnanswered) {
     master.send(Bytes{0x00, 0x06, 0x00, 0x07, 0x00, 0x2A, 0xB8, 0x05});
     master.send(Bytes{0x01, 0x03, 0x00, 0x07, 0x00, 0x01, 0x35, 0xCB});
     EXPECT_EQ((Bytes{0x01, 0x03, 0x02, 0x00, 0x2A, 0x39, 0x9B}), master.receive(7));
-    EXPECT_EQ(42U, simulator.slave().get(2, Area::holdingRegister, 7));
+    EXPECT_EQ(42U, simulator.slave().get(2, Area::HoldingRegister, 7));
 }
 
 TEST(SimulatorTest, SeveralNodesShareTheLineAndOthersStayQuiet) {
@@ -109,7 +109,7 @@ TEST(SimulatorTest, LongRegisterIsWrittenAtOnce) {
     const Bytes request{0x01, 0x06, 0x13, 0x88, 0xDE, 0xAD, 0xBE, 0xEF, 0x9E, 0x9E};
     master.send(request);
     EXPECT_EQ(request, master.receive(request.size()));
-    EXPECT_EQ(0xDEADBEEFU, simulator.slave().get(1, Area::longRegister, 5000));
+    EXPECT_EQ(0xDEADBEEFU, simulator.slave().get(1, Area::LongRegister, 5000));
 }
 
 TEST(SimulatorTest, MastersComeAndGo) {
@@ -125,7 +125,7 @@ TEST(SimulatorTest, MastersComeAndGo) {
 TEST(SimulatorTest, MemoryMayChangeWhileServing) {
     Simulator simulator({});
     simulator.start();
-    simulator.slave().set(1, Area::holdingRegister, 0, 1005);
+    simulator.slave().set(1, Area::HoldingRegister, 0, 1005);
     TestMaster master(simulator.path());
     master.send(kRead0);
     EXPECT_EQ((Bytes{0x01, 0x03, 0x02, 0x03, 0xED, 0x78, 0xF9}), master.receive(7));
@@ -134,7 +134,7 @@ TEST(SimulatorTest, MemoryMayChangeWhileServing) {
 TEST(SimulatorTest, TraceSeesTheEventsOfTheLog) {
     std::vector<std::string> lines;
     Simulator simulator(
-        {.trace = [&](const LineEvent& event) { lines.push_back(describe(event, Mode::rtu)); }});
+        {.trace = [&](const LineEvent& event) { lines.push_back(describe(event, Mode::Rtu)); }});
     simulator.start();
     TestMaster master(simulator.path());
     master.send(kRead0);
@@ -153,7 +153,7 @@ TEST(SimulatorTest, LogKeepsTheLatestEvents) {
         master.send(kRead0);
         master.receive(kRead0Reply.size());
     }
-    EXPECT_EQ((std::vector{Kind::reply, Kind::request, Kind::reply}), kindsOf(simulator.log()));
+    EXPECT_EQ((std::vector{Kind::Reply, Kind::Request, Kind::Reply}), kindsOf(simulator.log()));
     simulator.clearLog();
     EXPECT_TRUE(simulator.log().empty());
     EXPECT_FALSE(simulator.waitForEvents(1, 0ms));
@@ -163,7 +163,7 @@ TEST(SimulatorTest, StopTakesThePortAwayAndStartBringsItBackWithItsMemory) {
     Simulator simulator({});
     simulator.start();
     TestMaster before(simulator.path());
-    simulator.slave().set(1, Area::holdingRegister, 0, 1005);
+    simulator.slave().set(1, Area::HoldingRegister, 0, 1005);
     simulator.stop();
     EXPECT_TRUE(before.seesHangUp());
     simulator.stop();
@@ -189,7 +189,7 @@ TEST(SimulatorTest, WaitReturnsWhenTheStopIsRequested) {
     TestMaster master(simulator.path());
     auto end = std::async(std::launch::async, [&] { return simulator.wait(); });
     simulator.requestStop();
-    EXPECT_EQ(Simulator::End::stopped, end.get());
+    EXPECT_EQ(Simulator::End::Stopped, end.get());
     EXPECT_TRUE(master.seesHangUp());
     EXPECT_FALSE(std::filesystem::exists(simulator.device()));
 }
@@ -198,7 +198,7 @@ TEST(SimulatorTest, AStopRequestedBeforeTheStartIsNotLost) {
     Simulator simulator({});
     simulator.requestStop();
     simulator.start();
-    EXPECT_EQ(Simulator::End::stopped, simulator.wait());
+    EXPECT_EQ(Simulator::End::Stopped, simulator.wait());
     simulator.start();
     TestMaster master(simulator.path());
     master.send(kRead0);

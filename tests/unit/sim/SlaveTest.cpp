@@ -13,8 +13,8 @@ using wire::Bytes;
 TEST(SlaveTest, EachNodeHasItsOwnMemory) {
     Slave slave({{.address = 1}, {.address = 2}});
     ASSERT_TRUE(slave.answer(Bytes{1, 6, 0, 7, 0x12, 0x34}));
-    EXPECT_EQ(0x1234U, slave.get(1, Area::holdingRegister, 7));
-    EXPECT_EQ(2007U, slave.get(2, Area::holdingRegister, 7));
+    EXPECT_EQ(0x1234U, slave.get(1, Area::HoldingRegister, 7));
+    EXPECT_EQ(2007U, slave.get(2, Area::HoldingRegister, 7));
     EXPECT_EQ((Bytes{2, 3, 2, 0x07, 0xD7}), slave.answer(Bytes{2, 3, 0, 7, 0, 1}));
 }
 
@@ -34,11 +34,11 @@ TEST(SlaveTest, BroadcastWritesReachEveryNodeAndStayUnanswered) {
     EXPECT_FALSE(slave.answer(Bytes{0, 15, 0, 8, 0, 2, 1, 3}));
     EXPECT_FALSE(slave.answer(Bytes{0, 16, 0, 2, 0, 1, 2, 0, 8}));
     for (const std::uint8_t node : {std::uint8_t{1}, std::uint8_t{2}}) {
-        EXPECT_EQ(1U, slave.get(node, Area::coil, 0)) << int{node};
-        EXPECT_EQ(9U, slave.get(node, Area::holdingRegister, 1)) << int{node};
-        EXPECT_EQ(1U, slave.get(node, Area::coil, 8)) << int{node};
-        EXPECT_EQ(1U, slave.get(node, Area::coil, 9)) << int{node};
-        EXPECT_EQ(8U, slave.get(node, Area::holdingRegister, 2)) << int{node};
+        EXPECT_EQ(1U, slave.get(node, Area::Coil, 0)) << int{node};
+        EXPECT_EQ(9U, slave.get(node, Area::HoldingRegister, 1)) << int{node};
+        EXPECT_EQ(1U, slave.get(node, Area::Coil, 8)) << int{node};
+        EXPECT_EQ(1U, slave.get(node, Area::Coil, 9)) << int{node};
+        EXPECT_EQ(8U, slave.get(node, Area::HoldingRegister, 2)) << int{node};
     }
 }
 
@@ -51,8 +51,8 @@ TEST(SlaveTest, BroadcastReadsAndUnknownFunctionsStayUnanswered) {
 TEST(SlaveTest, BroadcastSkipsTheNodeThatLacksTheAddress) {
     Slave slave({{.address = 1, .sizes = {.holdingRegisters = 1}}, {.address = 2}});
     EXPECT_FALSE(slave.answer(Bytes{0, 6, 0, 5, 0, 9}));
-    EXPECT_EQ(1000U, slave.get(1, Area::holdingRegister, 0));
-    EXPECT_EQ(9U, slave.get(2, Area::holdingRegister, 5));
+    EXPECT_EQ(1000U, slave.get(1, Area::HoldingRegister, 0));
+    EXPECT_EQ(9U, slave.get(2, Area::HoldingRegister, 5));
 }
 
 TEST(SlaveTest, RequestLengthIsKnownFromTheHeader) {
@@ -77,10 +77,10 @@ TEST(SlaveTest, RefusesImpossibleNodes) {
 
 TEST(SlaveTest, ItemsOutsideTheMemoryAreRefused) {
     Slave slave({NodeOptions{.address = 1, .sizes = {.coils = 4}}});
-    EXPECT_THROW(slave.get(1, Area::coil, 4), std::out_of_range);
-    EXPECT_THROW(slave.set(1, Area::coil, 4, 1), std::out_of_range);
-    EXPECT_THROW(slave.get(1, Area::longRegister, 5000), std::out_of_range);
-    EXPECT_THROW(slave.get(2, Area::coil, 0), std::out_of_range);
+    EXPECT_THROW(slave.get(1, Area::Coil, 4), std::out_of_range);
+    EXPECT_THROW(slave.set(1, Area::Coil, 4, 1), std::out_of_range);
+    EXPECT_THROW(slave.get(1, Area::LongRegister, 5000), std::out_of_range);
+    EXPECT_THROW(slave.get(2, Area::Coil, 0), std::out_of_range);
 }
 
 TEST(SlaveTest, ARequestIsOneStepForOtherThreads) {
@@ -97,7 +97,7 @@ TEST(SlaveTest, ARequestIsOneStepForOtherThreads) {
         EXPECT_EQ((*reply)[6], (*reply)[4]);
     }
     writer.join();
-    EXPECT_EQ(199U, slave.get(1, Area::holdingRegister, 1));
+    EXPECT_EQ(199U, slave.get(1, Area::HoldingRegister, 1));
 }
 
 }  // namespace

@@ -74,7 +74,7 @@ const Row kRows[] = {
 };
 
 TEST(FrameMeaningTest, OfRequestAndReplyInBothModes) {
-    for (const Mode mode : {Mode::rtu, Mode::ascii}) {
+    for (const Mode mode : {Mode::Rtu, Mode::Ascii}) {
         for (const Row& row : kRows) {
             FrameMeaning meaning(mode);
             EXPECT_EQ(row.asked, meaning.ofRequest(wire::encodeFrame(mode, row.request)));
@@ -85,13 +85,13 @@ TEST(FrameMeaningTest, OfRequestAndReplyInBothModes) {
 }
 
 TEST(FrameMeaningTest, ABroadcastIsForAllNodes) {
-    EXPECT_EQ("all nodes: write coil at 4: on", FrameMeaning(Mode::rtu).ofRequest(wire::encodeFrame(
-                                                    Mode::rtu, Bytes{0, 5, 0, 4, 0xFF, 0})));
+    EXPECT_EQ("all nodes: write coil at 4: on", FrameMeaning(Mode::Rtu).ofRequest(wire::encodeFrame(
+                                                    Mode::Rtu, Bytes{0, 5, 0, 4, 0xFF, 0})));
 }
 
 TEST(FrameMeaningTest, AFrameWithAWrongCheckIsDamaged) {
     const Bytes request{1, 3, 0, 9, 0, 1};
-    for (const Mode mode : {Mode::rtu, Mode::ascii}) {
+    for (const Mode mode : {Mode::Rtu, Mode::Ascii}) {
         FrameMeaning meaning(mode);
         EXPECT_EQ("damaged", meaning.ofRequest(wire::encodeFrame(mode, request, true)));
         EXPECT_EQ("damaged", meaning.ofReply(Bytes{0x01}));
@@ -99,18 +99,18 @@ TEST(FrameMeaningTest, AFrameWithAWrongCheckIsDamaged) {
 }
 
 TEST(FrameMeaningTest, AReplyThatNobodyAskedForIsToldApart) {
-    FrameMeaning meaning(Mode::rtu);
-    const Bytes reply = wire::encodeFrame(Mode::rtu, Bytes{2, 3, 2, 3, 0xF1});
+    FrameMeaning meaning(Mode::Rtu);
+    const Bytes reply = wire::encodeFrame(Mode::Rtu, Bytes{2, 3, 2, 3, 0xF1});
     EXPECT_EQ("node 2: 1009 (not what was asked for)", meaning.ofReply(reply));
-    meaning.ofRequest(wire::encodeFrame(Mode::rtu, Bytes{1, 3, 0, 9, 0, 1}));
+    meaning.ofRequest(wire::encodeFrame(Mode::Rtu, Bytes{1, 3, 0, 9, 0, 1}));
     EXPECT_EQ("node 2: 1009 (not what was asked for)", meaning.ofReply(reply));
 }
 
 TEST(FrameMeaningTest, LongListsAreCut) {
-    FrameMeaning meaning(Mode::rtu);
-    meaning.ofRequest(wire::encodeFrame(Mode::rtu, Bytes{1, 1, 0, 0, 0, 17}));
+    FrameMeaning meaning(Mode::Rtu);
+    meaning.ofRequest(wire::encodeFrame(Mode::Rtu, Bytes{1, 1, 0, 0, 0, 17}));
     EXPECT_EQ("node 1: 1 0 0 0 0 0 0 0 0 0 0 0 0 0 0 0 ...",
-              meaning.ofReply(wire::encodeFrame(Mode::rtu, Bytes{1, 1, 3, 1, 0, 1})));
+              meaning.ofReply(wire::encodeFrame(Mode::Rtu, Bytes{1, 1, 3, 1, 0, 1})));
 }
 
 /// Frames come from outside: any bytes behind node and function have some meaning.
@@ -119,8 +119,8 @@ TEST(FrameMeaningTest, OfEveryTruncationIsHarmless) {
         for (std::size_t size = 2; size < 12; ++size) {
             Bytes message(size, 0x11);
             message[1] = static_cast<std::uint8_t>(function);
-            FrameMeaning meaning(Mode::rtu);
-            const Bytes frame = wire::encodeFrame(Mode::rtu, message);
+            FrameMeaning meaning(Mode::Rtu);
+            const Bytes frame = wire::encodeFrame(Mode::Rtu, message);
             EXPECT_EQ(0U, meaning.ofRequest(frame).find("node 17: ")) << function << ' ' << size;
             EXPECT_EQ(0U, meaning.ofReply(frame).find("node 17: ")) << function << ' ' << size;
         }

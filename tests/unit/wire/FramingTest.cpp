@@ -29,33 +29,33 @@ std::optional<std::size_t> unknownLength(ByteView) {
 }
 
 TEST(FramingTest, EncodedRtuCarriesTheLowByteOfTheCrcFirst) {
-    EXPECT_EQ(kReadRequestRtu, encodeFrame(Mode::rtu, kReadRequest));
+    EXPECT_EQ(kReadRequestRtu, encodeFrame(Mode::Rtu, kReadRequest));
 }
 
 TEST(FramingTest, EncodedAsciiCarriesUpperCaseDigitsAndCrLf) {
-    EXPECT_EQ(kReadRequestAscii, textOf(encodeFrame(Mode::ascii, kReadRequest)));
+    EXPECT_EQ(kReadRequestAscii, textOf(encodeFrame(Mode::Ascii, kReadRequest)));
 }
 
 TEST(FramingTest, EncodedBrokenCheckDiffersInAllItsBitsOnly) {
     const Bytes rtu{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03, 0x89, 0x78};
-    EXPECT_EQ(rtu, encodeFrame(Mode::rtu, kReadRequest, true));
-    EXPECT_EQ(":1103006B000381\r\n", textOf(encodeFrame(Mode::ascii, kReadRequest, true)));
+    EXPECT_EQ(rtu, encodeFrame(Mode::Rtu, kReadRequest, true));
+    EXPECT_EQ(":1103006B000381\r\n", textOf(encodeFrame(Mode::Ascii, kReadRequest, true)));
 }
 
 TEST(FramingTest, DecodedGoodFramesGiveTheMessage) {
-    EXPECT_EQ(kReadRequest, decodeFrame(Mode::rtu, kReadRequestRtu).message);
-    EXPECT_EQ(kReadRequest, decodeFrame(Mode::ascii, bytesOf(kReadRequestAscii)).message);
+    EXPECT_EQ(kReadRequest, decodeFrame(Mode::Rtu, kReadRequestRtu).message);
+    EXPECT_EQ(kReadRequest, decodeFrame(Mode::Ascii, bytesOf(kReadRequestAscii)).message);
 }
 
 TEST(FramingTest, DecodedEveryTruncationIsDamagedAndKeepsItsBytes) {
     for (std::size_t length = 0; length < kReadRequestRtu.size(); ++length) {
-        const auto frame = decodeFrame(Mode::rtu, ByteView(kReadRequestRtu).first(length));
+        const auto frame = decodeFrame(Mode::Rtu, ByteView(kReadRequestRtu).first(length));
         EXPECT_TRUE(frame.damaged()) << length;
         EXPECT_EQ(length, frame.raw.size());
     }
     const Bytes ascii = bytesOf(kReadRequestAscii);
     for (std::size_t length = 0; length < ascii.size(); ++length) {
-        EXPECT_TRUE(decodeFrame(Mode::ascii, ByteView(ascii).first(length)).damaged()) << length;
+        EXPECT_TRUE(decodeFrame(Mode::Ascii, ByteView(ascii).first(length)).damaged()) << length;
     }
 }
 
@@ -69,22 +69,22 @@ TEST(FramingTest, DecodedDamagedAsciiFrames) {
              ":1103006B00037E\n\r",   // ends swapped
              ":11EF\r\n",             // no function
          }) {
-        EXPECT_TRUE(decodeFrame(Mode::ascii, bytesOf(text)).damaged()) << text;
+        EXPECT_TRUE(decodeFrame(Mode::Ascii, bytesOf(text)).damaged()) << text;
     }
 }
 
 TEST(FramingTest, DecodedRtuFrameOf256BytesIsTheLongest) {
-    EXPECT_FALSE(decodeFrame(Mode::rtu, encodeFrame(Mode::rtu, Bytes(254, 0x55))).damaged());
-    EXPECT_TRUE(decodeFrame(Mode::rtu, encodeFrame(Mode::rtu, Bytes(255, 0x55))).damaged());
+    EXPECT_FALSE(decodeFrame(Mode::Rtu, encodeFrame(Mode::Rtu, Bytes(254, 0x55))).damaged());
+    EXPECT_TRUE(decodeFrame(Mode::Rtu, encodeFrame(Mode::Rtu, Bytes(255, 0x55))).damaged());
 }
 
 TEST(FramingTest, DecodedAsciiFrameOf254BytesIsTheLongest) {
-    EXPECT_FALSE(decodeFrame(Mode::ascii, encodeFrame(Mode::ascii, Bytes(254, 0x55))).damaged());
-    EXPECT_TRUE(decodeFrame(Mode::ascii, encodeFrame(Mode::ascii, Bytes(255, 0x55))).damaged());
+    EXPECT_FALSE(decodeFrame(Mode::Ascii, encodeFrame(Mode::Ascii, Bytes(254, 0x55))).damaged());
+    EXPECT_TRUE(decodeFrame(Mode::Ascii, encodeFrame(Mode::Ascii, Bytes(255, 0x55))).damaged());
 }
 
 TEST(FramingTest, RtuSplitterAnnouncedLengthEndsAFrameAtOnce) {
-    FrameSplitter splitter(Mode::rtu, eightBytes);
+    FrameSplitter splitter(Mode::Rtu, eightBytes);
     const auto frames = splitter.add(kReadRequestRtu);
     ASSERT_EQ(1U, frames.size());
     EXPECT_EQ(kReadRequest, frames[0].message);
@@ -92,7 +92,7 @@ TEST(FramingTest, RtuSplitterAnnouncedLengthEndsAFrameAtOnce) {
 }
 
 TEST(FramingTest, RtuSplitterBytesMayArriveOneByOne) {
-    FrameSplitter splitter(Mode::rtu, eightBytes);
+    FrameSplitter splitter(Mode::Rtu, eightBytes);
     for (std::size_t i = 0; i + 1 < kReadRequestRtu.size(); ++i) {
         EXPECT_TRUE(splitter.add(ByteView(kReadRequestRtu).subspan(i, 1)).empty()) << i;
     }
@@ -100,7 +100,7 @@ TEST(FramingTest, RtuSplitterBytesMayArriveOneByOne) {
 }
 
 TEST(FramingTest, RtuSplitterFramesMayFollowOneAnotherInOneRead) {
-    FrameSplitter splitter(Mode::rtu, eightBytes);
+    FrameSplitter splitter(Mode::Rtu, eightBytes);
     Bytes twice = kReadRequestRtu;
     twice.insert(twice.end(), kReadRequestRtu.begin(), kReadRequestRtu.end());
     twice.push_back(0x11);
@@ -109,7 +109,7 @@ TEST(FramingTest, RtuSplitterFramesMayFollowOneAnotherInOneRead) {
 }
 
 TEST(FramingTest, RtuSplitterUnknownLengthEndsAtSilence) {
-    FrameSplitter splitter(Mode::rtu, unknownLength);
+    FrameSplitter splitter(Mode::Rtu, unknownLength);
     EXPECT_TRUE(splitter.add(kReadRequestRtu).empty());
     const auto frame = splitter.silence();
     ASSERT_TRUE(frame);
@@ -118,7 +118,7 @@ TEST(FramingTest, RtuSplitterUnknownLengthEndsAtSilence) {
 }
 
 TEST(FramingTest, RtuSplitterWrongCrcWaitsForSilenceAndTakesAllWithIt) {
-    FrameSplitter splitter(Mode::rtu, eightBytes);
+    FrameSplitter splitter(Mode::Rtu, eightBytes);
     Bytes bad = kReadRequestRtu;
     bad[7] ^= 0x01;
     EXPECT_TRUE(splitter.add(bad).empty());
@@ -131,7 +131,7 @@ TEST(FramingTest, RtuSplitterWrongCrcWaitsForSilenceAndTakesAllWithIt) {
 }
 
 TEST(FramingTest, RtuSplitterEndlessBytesStayBounded) {
-    FrameSplitter splitter(Mode::rtu, unknownLength);
+    FrameSplitter splitter(Mode::Rtu, unknownLength);
     for (int i = 0; i < 100; ++i)
         EXPECT_TRUE(splitter.add(Bytes(1000, 0xAA)).empty());
     const auto frame = splitter.silence();
@@ -141,7 +141,7 @@ TEST(FramingTest, RtuSplitterEndlessBytesStayBounded) {
 }
 
 TEST(FramingTest, AsciiSplitterFrameBeginsAtTheLastColonAndEndsAtCrLf) {
-    FrameSplitter splitter(Mode::ascii, unknownLength);
+    FrameSplitter splitter(Mode::Ascii, unknownLength);
     const auto frames = splitter.add(bytesOf("noise\r\n:1103:1103006B00037E\r\n:11"));
     ASSERT_EQ(1U, frames.size());
     EXPECT_EQ(kReadRequest, frames[0].message);
@@ -149,7 +149,7 @@ TEST(FramingTest, AsciiSplitterFrameBeginsAtTheLastColonAndEndsAtCrLf) {
 }
 
 TEST(FramingTest, AsciiSplitterSilenceDoesNotEndAFrame) {
-    FrameSplitter splitter(Mode::ascii, unknownLength);
+    FrameSplitter splitter(Mode::Ascii, unknownLength);
     EXPECT_TRUE(splitter.add(bytesOf(":1103006B0")).empty());
     EXPECT_FALSE(splitter.waitsForSilence());
     EXPECT_FALSE(splitter.silence());
@@ -157,7 +157,7 @@ TEST(FramingTest, AsciiSplitterSilenceDoesNotEndAFrame) {
 }
 
 TEST(FramingTest, AsciiSplitterWrongLrcIsReportedAndTheNextFrameIsFound) {
-    FrameSplitter splitter(Mode::ascii, unknownLength);
+    FrameSplitter splitter(Mode::Ascii, unknownLength);
     const auto frames = splitter.add(bytesOf(":1103006B000300\r\n:1103006B00037E\r\n"));
     ASSERT_EQ(2U, frames.size());
     EXPECT_TRUE(frames[0].damaged());
@@ -165,7 +165,7 @@ TEST(FramingTest, AsciiSplitterWrongLrcIsReportedAndTheNextFrameIsFound) {
 }
 
 TEST(FramingTest, AsciiSplitterEndlessFrameIsGivenUpAsDamaged) {
-    FrameSplitter splitter(Mode::ascii, unknownLength);
+    FrameSplitter splitter(Mode::Ascii, unknownLength);
     const auto frames = splitter.add(bytesOf(":" + std::string(2000, '0')));
     ASSERT_EQ(1U, frames.size());
     EXPECT_TRUE(frames[0].damaged());
