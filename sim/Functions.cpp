@@ -3,43 +3,44 @@
 #include <algorithm>
 #include <array>
 
+#include "wire/FunctionCodes.h"
+
 namespace sim {
 namespace {
 
 using wire::Bytes;
 using wire::ByteView;
+using wire::Form;
+using wire::FunctionRow;
 
-enum class Shape : std::uint8_t { read, writeOne, writeMany };
-
-/// A function code. Source of the limits: Modbus Application Protocol V1.1b3, 6.1 to 6.12.
-struct FunctionRow {
+struct AreaRow {
     std::uint8_t code;
-    Shape shape;
     Area area;
-    std::uint32_t maxCount;
 };
 
-constexpr std::array kFunctions{
-    FunctionRow{1, Shape::read, Area::Coil, 2000},
-    FunctionRow{2, Shape::read, Area::DiscreteInput, 2000},
-    FunctionRow{3, Shape::read, Area::HoldingRegister, 125},
-    FunctionRow{4, Shape::read, Area::InputRegister, 125},
-    FunctionRow{5, Shape::writeOne, Area::Coil, 1},
-    FunctionRow{6, Shape::writeOne, Area::HoldingRegister, 1},
-    FunctionRow{15, Shape::writeMany, Area::Coil, 1968},
-    FunctionRow{16, Shape::writeMany, Area::HoldingRegister, 123},
+/// The memory that each function works on, row by row as the functions.
+constexpr std::array kAreas{
+    AreaRow{1, Area::Coil},
+    AreaRow{2, Area::DiscreteInput},
+    AreaRow{3, Area::HoldingRegister},
+    AreaRow{4, Area::InputRegister},
+    AreaRow{5, Area::Coil},
+    AreaRow{6, Area::HoldingRegister},
+    AreaRow{15, Area::Coil},
+    AreaRow{16, Area::HoldingRegister},
 };
+static_assert(std::equal(kAreas.begin(), kAreas.end(), wire::kFunctions.begin(),
+                         wire::kFunctions.end(),
+                         [](const AreaRow& a, const FunctionRow& b) { return a.code == b.code; }));
+
+Area areaOf(const FunctionRow& row) {
+    return kAreas[static_cast<std::size_t>(&row - wire::kFunctions.data())].area;
+}
 
 /// The 250 data bytes of 125 registers, 4 for each.
 constexpr std::uint32_t kMaxReadLongs = 125 * 2 / 4;
 
 constexpr std::size_t kHeader = 1 + 2 + 2;  // Function, address, count or value.
-
-const FunctionRow* rowOf(std::uint8_t code) {
-    const auto* row = std::find_if(kFunctions.begin(), kFunctions.end(),
-                                   [&](const FunctionRow& each) { return each.code == code; });
-    return row == kFunctions.end() ? nullptr : row;
-}
 
 std::uint16_t wordAt(ByteView bytes, std::size_t index) {
     return static_cast<std::uint16_t>(bytes[index] << 8U | bytes[index + 1]);
@@ -73,10 +74,11 @@ std::size_t dataBytes(Area area, std::uint32_t count) {
 }
 
 /// The area that the request means: Enron registers hide behind functions 3 and 6.
-Area areaOf(const FunctionRow& row, const Memory& memory, std::uint16_t address) {
-    const bool mayBeLong = row.area == Area::HoldingRegister && row.shape != Shape::writeMany;
+Area areaAt(const FunctionRow& row, const Memory& memory, std::uint16_t address) {
+    const Area area = areaOf(row);
+    const bool mayBeLong = area == Area::HoldingRegister && row.form != Form::WriteWords;
     const bool isLong = mayBeLong && memory.longs() && memory.longs()->contains(address);
-    return isLong ? Area::LongRegister : row.area;
+    return isLong ? Area::LongRegister : area;
 }
 
 bool inReach(const Memory& memory, Area area, std::uint32_t address, std::uint32_t count) {
@@ -111,7 +113,7 @@ Bytes read(const FunctionRow& row, const Memory& memory, ByteView request) {
     if (request.size() != kHeader) return refuse(request, Exception::IllegalDataValue);
     const std::uint16_t address = wordAt(request, 1);
     const std::uint16_t count = wordAt(request, 3);
-    const Area area = areaOf(row, memory, address);
+    const Area area = areaAt(row, memory, address);
     const std::uint32_t limit = area == Area::LongRegister ? kMaxReadLongs : row.maxCount;
     if (count < 1 || count > limit) return refuse(request, Exception::IllegalDataValue);
     if (!inReach(memory, area, address, count)) {
@@ -127,7 +129,7 @@ Bytes read(const FunctionRow& row, const Memory& memory, ByteView request) {
 Bytes writeOne(const FunctionRow& row, Memory& memory, ByteView request) {
     if (request.size() < kHeader) return refuse(request, Exception::IllegalDataValue);
     const std::uint16_t address = wordAt(request, 1);
-    const Area area = areaOf(row, memory, address);
+    const Area area = areaAt(row, memory, address);
     if (request.size() != 1 + 2 + widthOf(area)) {
         return refuse(request, Exception::IllegalDataValue);
     }
@@ -149,15 +151,16 @@ Bytes writeMany(const FunctionRow& row, Memory& memory, ByteView request) {
     const std::uint16_t address = wordAt(request, 1);
     const std::uint16_t count = wordAt(request, 3);
     const ByteView data = request.subspan(kHeader + 1);
+    const Area area = areaOf(row);
     const bool legal = count >= 1 && count <= row.maxCount &&
-                       request[kHeader] == dataBytes(row.area, count) &&
+                       request[kHeader] == dataBytes(area, count) &&
                        data.size() == request[kHeader];
     if (!legal) return refuse(request, Exception::IllegalDataValue);
-    if (!inReach(memory, row.area, address, count)) {
+    if (!inReach(memory, area, address, count)) {
         return refuse(request, Exception::IllegalDataAddress);
     }
     for (std::uint32_t i = 0; i < count; ++i) {
-        memory.set(row.area, address + i, itemAt(row.area, data, i));
+        memory.set(area, address + i, itemAt(area, data, i));
     }
     return {request.begin(), request.begin() + kHeader};
 }
@@ -169,34 +172,16 @@ Bytes exceptionReply(std::uint8_t function, std::uint8_t code) {
 }
 
 bool isWrite(std::uint8_t function) {
-    const FunctionRow* row = rowOf(function);
-    return row != nullptr && row->shape != Shape::read;
+    const FunctionRow* const row = wire::functionRow(function);
+    return row != nullptr && !wire::isRead(row->form);
 }
 
 Bytes execute(Memory& memory, ByteView request) {
-    const FunctionRow* row = rowOf(request[0]);
+    const FunctionRow* const row = wire::functionRow(request[0]);
     if (row == nullptr) return refuse(request, Exception::IllegalFunction);
-    if (row->shape == Shape::read) return read(*row, memory, request);
-    if (row->shape == Shape::writeOne) return writeOne(*row, memory, request);
+    if (wire::isRead(row->form)) return read(*row, memory, request);
+    if (wire::isSingleWrite(row->form)) return writeOne(*row, memory, request);
     return writeMany(*row, memory, request);
-}
-
-std::optional<std::uint16_t> addressOfRequest(ByteView firstBytes) {
-    if (firstBytes.size() < 1 + 1 + 2) return std::nullopt;
-    return wordAt(firstBytes, 2);
-}
-
-std::optional<std::size_t> lengthOfRequest(ByteView firstBytes, bool longAt) {
-    constexpr std::size_t kFixed = 1 + kHeader + 2;  // With node and check.
-    if (!addressOfRequest(firstBytes)) return std::nullopt;
-    const FunctionRow* row = rowOf(firstBytes[1]);
-    if (row == nullptr) return std::nullopt;
-    if (row->shape == Shape::read) return kFixed;
-    if (row->shape == Shape::writeOne) {
-        return row->area == Area::HoldingRegister && longAt ? kFixed + 2 : kFixed;
-    }
-    if (firstBytes.size() <= 1 + kHeader) return std::nullopt;
-    return kFixed + 1 + firstBytes[1 + kHeader];
 }
 
 }  // namespace sim

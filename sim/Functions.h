@@ -1,7 +1,7 @@
 // The function codes of Modbus on one node's memory. Pure.
 #pragma once
 
-#include <optional>
+#include <cstdint>
 
 #include "sim/Memory.h"
 #include "wire/Bytes.h"
@@ -26,13 +26,5 @@ wire::Bytes exceptionReply(std::uint8_t function, std::uint8_t code);
 
 /// Whether the function changes memory, so that it may be broadcast.
 bool isWrite(std::uint8_t function);
-
-/// How long an RTU request is, check included, judged by its first bytes.
-/// @param longAt  Whether the request's node has a 32-bit register at its address.
-/// @return nothing when more bytes are needed or the function is unknown.
-std::optional<std::size_t> lengthOfRequest(wire::ByteView firstBytes, bool longAt);
-
-/// The start address of a request that begins with its node; nothing when it is not there yet.
-std::optional<std::uint16_t> addressOfRequest(wire::ByteView firstBytes);
 
 }  // namespace sim

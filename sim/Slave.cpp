@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "sim/Functions.h"
+#include "wire/Lengths.h"
 
 namespace sim {
 namespace {
@@ -55,9 +56,9 @@ void Slave::broadcast(ByteView request) {
 }
 
 std::optional<std::size_t> Slave::requestLength(ByteView firstBytes) const {
-    const auto address = addressOfRequest(firstBytes);
+    const auto address = wire::addressOfRequest(firstBytes);
     if (!address) return std::nullopt;
-    return lengthOfRequest(firstBytes, isLong(firstBytes[0], *address));
+    return wire::lengthOfRequest(firstBytes, isLong(firstBytes[0], *address));
 }
 
 bool Slave::isLong(std::uint8_t node, std::uint16_t address) const {

@@ -5,6 +5,7 @@
 #include <string_view>
 
 #include "wire/Framing.h"
+#include "wire/FunctionCodes.h"
 #include "wire/Hex.h"
 
 namespace wire {
@@ -14,34 +15,6 @@ constexpr std::uint8_t kExceptionFlag = 0x80;
 /// More values make no line that anybody reads.
 constexpr std::size_t kShownValues = 16;
 constexpr const char* kDamaged = "damaged";
-
-/// How a function's request and reply are laid out behind the function.
-enum class Form : std::uint8_t {
-    ReadBits,    ///< Address, count; reply: byte count, bits.
-    ReadWords,   ///< Address, count; reply: byte count, registers.
-    WriteBit,    ///< Address, FF00 or 0000; reply: the same.
-    WriteWord,   ///< Address, value; reply: the same.
-    WriteBits,   ///< Address, count, byte count, bits; reply: address, count.
-    WriteWords,  ///< Address, count, byte count, registers; reply: address, count.
-};
-
-struct FunctionRow {
-    std::uint8_t function;
-    Form form;
-    std::string_view item;
-};
-
-/// Source: Modbus Application Protocol V1.1b3, 6.1 to 6.6, 6.11, 6.12.
-constexpr std::array kFunctions{
-    FunctionRow{1, Form::ReadBits, "coil"},
-    FunctionRow{2, Form::ReadBits, "discrete input"},
-    FunctionRow{3, Form::ReadWords, "holding register"},
-    FunctionRow{4, Form::ReadWords, "input register"},
-    FunctionRow{5, Form::WriteBit, "coil"},
-    FunctionRow{6, Form::WriteWord, "holding register"},
-    FunctionRow{15, Form::WriteBits, "coil"},
-    FunctionRow{16, Form::WriteWords, "holding register"},
-};
 
 struct ExceptionRow {
     std::uint8_t code;
@@ -65,13 +38,6 @@ constexpr std::array kExceptions{
 /// apart.
 constexpr std::size_t kShort = 2;
 constexpr std::size_t kLong = 4;
-
-const FunctionRow* rowOf(std::uint8_t function) {
-    const auto* const row =
-        std::find_if(kFunctions.begin(), kFunctions.end(),
-                     [function](const FunctionRow& each) { return each.function == function; });
-    return row == kFunctions.end() ? nullptr : row;
-}
 
 /// High byte first. REQUIRES: at most four bytes.
 std::uint32_t numberOf(ByteView bytes) {
@@ -145,7 +111,7 @@ std::string writeText(const FunctionRow& row, std::size_t address, std::size_t c
 /// @param data  What stands behind the function.
 std::string requestText(std::uint8_t function, ByteView data) {
     constexpr std::size_t kAddressAndCount = 2 + 2;
-    const FunctionRow* const row = rowOf(function);
+    const FunctionRow* const row = functionRow(function);
     if (row == nullptr || data.size() < kAddressAndCount) return unknown(function, data);
     const std::uint32_t address = numberOf(data.first(2));
     const ByteView behind = data.subspan(2);
@@ -178,7 +144,7 @@ std::string exceptionText(ByteView data) {
 /// @param count  Items that were asked for; 0 when that is not known.
 std::string replyText(std::uint8_t function, ByteView data, std::size_t count) {
     if ((function & kExceptionFlag) != 0) return exceptionText(data);
-    const FunctionRow* const row = rowOf(function);
+    const FunctionRow* const row = functionRow(function);
     if (row == nullptr || data.empty()) return unknown(function, data);
     const ByteView values = data.subspan(1);
     if (row->form == Form::ReadBits) return bitList(values, count != 0 ? count : ~std::size_t{0});
@@ -193,9 +159,8 @@ std::string FrameMeaning::ofRequest(ByteView frame) {
     const auto [raw, message] = decodeFrame(mode_, frame);
     if (message.empty()) return kDamaged;
     const ByteView data = ByteView(message).subspan(2);
-    const FunctionRow* const row = rowOf(message[1]);
-    const bool reads = row != nullptr && data.size() == 4 &&
-                       (row->form == Form::ReadBits || row->form == Form::ReadWords);
+    const FunctionRow* const row = functionRow(message[1]);
+    const bool reads = row != nullptr && data.size() == 4 && isRead(row->form);
     last_ = Request{message[0], message[1], reads ? numberOf(data.subspan(2)) : 0};
     return whose(message[0]) + requestText(message[1], data);
 }
