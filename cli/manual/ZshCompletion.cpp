@@ -4,7 +4,7 @@
 namespace cli::manual {
 namespace {
 
-/// Text inside a specification of _arguments.
+/// Text inside an entry of _arguments.
 std::string plain(const std::string& text, const std::string& special) {
     std::string result;
     for (const char c : text) {
@@ -27,8 +27,8 @@ std::string argumentOf(const Option& option) {
     return ':' + plain(option.value, "\\:") + ':' + actionFor(option);
 }
 
-/// One specification for each name of the option.
-std::string specifications(const Option& option) {
+/// One entry for each name of the option.
+std::string entries(const Option& option) {
     std::string text;
     for (const std::string& name : option.names) {
         const std::string repeat = option.repeated ? "*" : "";
@@ -61,7 +61,7 @@ std::string function(const Command& command) {
         text += "  local context state state_descr line\n  typeset -A opt_args\n";
     text += std::string("  _arguments") + (command.commands.empty() ? "" : " -C");
     for (const Option& option : command.options)
-        text += specifications(option);
+        text += entries(option);
     for (const Option& each : command.positionals)
         text += " \\\n    " + shellQuoted((each.repeated ? "*" : "") + argumentOf(each));
     if (!command.commands.empty()) text += " \\\n    '1: :->command' '*:: :->arguments'";
