@@ -2,6 +2,7 @@
 #include <algorithm>
 
 #include "cli/Session.h"
+#include "settings/NodeNumbers.h"
 #include "values/ByteOrder.h"
 #include "values/ValueError.h"
 #include "values/ValueTypes.h"
@@ -16,9 +17,6 @@ using values::ByteView;
 constexpr int kGeneralError = -1;
 constexpr int kConversionError = -9;
 constexpr int kNodeRefused = -10;
-
-/// An address of one byte; this one takes a node off the line.
-constexpr int kLargestAddress = 255;
 
 /// No area holds a longer value, or one in front of it; the driver refuses such a tag when it is
 /// used.
@@ -71,8 +69,8 @@ Failure Session::failureOf(const ITag& tag, const runtime::ChannelError& error, 
     const ExitCode code = portGone() ? ExitCode::Port : exitCodeOf(error.code);
     if (asked || code != ExitCode::Other) return {error, code};
     // The line knows the low byte of a node only.
-    const int node = nodeOf(tag) & kLargestAddress;
-    const bool addressable = node > 0 && node < kLargestAddress;
+    const int node = nodeOf(tag) & settings::kNodeOff;
+    const bool addressable = node > 0 && node < settings::kNodeOff;
     if (error.code == kNodeRefused && addressable) return {error, code};
     return {error, ExitCode::Usage};
 }

@@ -9,6 +9,7 @@
 #include "cli/override/OverrideKeys.h"
 #include "cli/override/OverrideWords.h"
 #include "runtime/SqliteStorage.h"
+#include "settings/NodeNumbers.h"
 #include "settings/NumberText.h"
 
 namespace cli {
@@ -28,12 +29,11 @@ std::optional<long> wholeNumber(const std::string& text) {
 }
 
 std::string addressFault(const std::string& node, const std::string& text) {
-    constexpr long kLargestAddress = 255;
     const auto number = wholeNumber(node);
     if (!number || *number < 0) return fmt::format("'{}' is no node", node);
     const auto address = wholeNumber(text);
-    if (address && *address >= 0 && *address <= kLargestAddress) return {};
-    return fmt::format("'{}' is no address from 0 to {}", text, kLargestAddress);
+    if (address && *address >= 0 && *address <= settings::kNodeOff) return {};
+    return fmt::format("'{}' is no address from 0 to {}", text, settings::kNodeOff);
 }
 
 std::string settingFault(const SerialSetting& setting, const std::string& text) {

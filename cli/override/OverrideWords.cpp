@@ -9,6 +9,7 @@
 
 #include "cli/Choices.h"
 #include "cli/ExitCode.h"
+#include "settings/NodeNumbers.h"
 
 namespace cli {
 namespace {
@@ -29,8 +30,6 @@ constexpr std::array kSettings{SerialSetting{"baud", "SP_Baud", "unsignedInt", k
                                SerialSetting{"parity", "SP_Par", "unsignedByte", kParities},
                                SerialSetting{"stop", "SP_Stop", "unsignedByte", kStops},
                                SerialSetting{"mode", "SP_Mode", "unsignedByte", kModes}};
-
-constexpr std::uint8_t kNodeOff = 255;
 
 [[noreturn]] void refuse(std::string_view word, std::string_view why) {
     throw CommandError(ExitCode::Usage, fmt::format("'{}': {}", word, why));
@@ -64,8 +63,8 @@ std::uint32_t codeOf(std::string_view whole, const SerialSetting& setting, std::
 }
 
 std::uint8_t parseAddress(std::string_view whole, std::string_view text) {
-    if (text == "off") return kNodeOff;
-    return static_cast<std::uint8_t>(parseNumber(whole, text, kNodeOff));
+    if (text == "off") return std::uint8_t{settings::kNodeOff};
+    return static_cast<std::uint8_t>(parseNumber(whole, text, settings::kNodeOff));
 }
 
 bool parseOnOff(std::string_view whole, std::string_view text) {
@@ -99,9 +98,11 @@ void addChange(OverrideChanges& changes, const std::string& word, Subject subjec
     if (const SerialSetting* const setting = settingOf(left)) {
         changes.serial.push_back({setting, codeOf(word, *setting, right)});
     } else if (subject == Subject::Node) {
-        changes.nodes.push_back({parseNumber(word, left, kNodeOff), parseAddress(word, right)});
+        changes.nodes.push_back(
+            {parseNumber(word, left, settings::kNodeOff), parseAddress(word, right)});
     } else if (subject == Subject::Modicon) {
-        changes.modicon.push_back({parseNumber(word, left, kNodeOff), parseOnOff(word, right)});
+        changes.modicon.push_back(
+            {parseNumber(word, left, settings::kNodeOff), parseOnOff(word, right)});
     } else {
         refuse(word, "the settings are baud, parity, stop and mode; nodes go as 'node N=M'" +
                          didYouMean(left, subjects()));
@@ -112,9 +113,9 @@ void addRemoval(OverrideRemovals& removals, const std::string& word, Subject sub
     if (const SerialSetting* const setting = settingOf(word)) {
         removals.serial.push_back(setting);
     } else if (subject == Subject::Node) {
-        removals.nodes.push_back(parseNumber(word, word, kNodeOff));
+        removals.nodes.push_back(parseNumber(word, word, settings::kNodeOff));
     } else if (subject == Subject::Modicon) {
-        removals.modicon.push_back(parseNumber(word, word, kNodeOff));
+        removals.modicon.push_back(parseNumber(word, word, settings::kNodeOff));
     } else {
         refuse(word, "expected node N, modicon N, baud, parity, stop, mode or all" +
                          didYouMean(word, subjects()));
@@ -135,7 +136,7 @@ std::string wordOf(const SerialSetting& setting, std::uint32_t code) {
 }
 
 std::string addressWord(std::uint32_t address) {
-    return address == kNodeOff ? "off" : std::to_string(address);
+    return address == settings::kNodeOff ? "off" : std::to_string(address);
 }
 
 OverrideChanges parseChanges(const std::vector<std::string>& words) {
