@@ -2,33 +2,22 @@
 #include "engine/Footprint.h"
 
 #include <algorithm>
-#include <array>
 #include <string>
 #include <string_view>
 
 #include "framework/DataTypes.h"
+#include "framework/Swaps.h"
 
 namespace engine {
 
 namespace {
-
-struct SwapRow {
-    std::string_view name;
-    int width;  // bytes of the run-time form that change places among themselves
-};
-
-constexpr std::array kSwaps{
-    SwapRow{"swap2", 2},
-    SwapRow{"swap4", 4},
-    SwapRow{"swap8", 8},
-};
 
 // Items change places within groups that begin at multiples of the widest swap; the narrower groups
 // lie inside the wider ones.
 int widestSwap(const ProtgenTag& tag) {
     int width = 1;
     for (const std::string& name : tag.conversions()) {
-        for (const SwapRow& row : kSwaps) {
+        for (const ProtUtilsN::Swap& row : ProtUtilsN::kSwaps) {
             if (row.name == name) width = std::max(width, row.width);
         }
     }

@@ -7,6 +7,7 @@
 #include <string_view>
 
 #include "framework/DataTypes.h"
+#include "framework/Swaps.h"
 
 namespace ProtUtilsN {
 
@@ -152,9 +153,9 @@ struct ConversionRow {
 
 constexpr std::array kConversions{
     ConversionRow{"swapnibble", swapNibble},
-    ConversionRow{"swap2", swapGroups<2>},
-    ConversionRow{"swap4", swapGroups<4>},
-    ConversionRow{"swap8", swapGroups<8>},
+    ConversionRow{kSwaps[0].name, swapGroups<kSwaps[0].width>},
+    ConversionRow{kSwaps[1].name, swapGroups<kSwaps[1].width>},
+    ConversionRow{kSwaps[2].name, swapGroups<kSwaps[2].width>},
     ConversionRow{"bcd", bcd},
     ConversionRow{"neg", neg},
     ConversionRow{"inv", inv},
