@@ -3,6 +3,7 @@
 
 #include <fcntl.h>
 #include <gtest/gtest.h>
+#include <poll.h>
 #include <termios.h>
 #include <unistd.h>
 
@@ -37,10 +38,15 @@ class PseudoTerminal {
         ASSERT_EQ(static_cast<ssize_t>(bytes.size()),
                   ::write(far_.get(), bytes.data(), bytes.size()));
     }
+    /// Waits up to a minute for each piece: a program that never sends must not hold a test for
+    /// ever.
     std::vector<std::uint8_t> take(std::size_t count) const {
+        constexpr int kPatienceMs = 60'000;
         std::vector<std::uint8_t> bytes(count);
         std::size_t have = 0;
         while (have < count) {
+            pollfd watched{far_.get(), POLLIN, 0};
+            if (::poll(&watched, 1, kPatienceMs) <= 0) break;
             const ssize_t got = ::read(far_.get(), bytes.data() + have, count - have);
             if (got <= 0) break;
             have += static_cast<std::size_t>(got);

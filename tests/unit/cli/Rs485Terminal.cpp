@@ -13,7 +13,7 @@
 
 namespace {
 
-serial_rs485 g_direction = [] {
+serial_rs485 direction = [] {
     serial_rs485 found{};
     found.flags = SER_RS485_RTS_AFTER_SEND;
     return found;
@@ -35,12 +35,12 @@ extern "C" int ioctl(int fd, unsigned long request, ...) noexcept {
     void* const argument = va_arg(arguments, void*);
     va_end(arguments);
     if (request == TIOCGRS485) {
-        std::memcpy(argument, &g_direction, sizeof g_direction);
+        std::memcpy(argument, &direction, sizeof direction);
         return 0;
     }
     if (request == TIOCSRS485) {
-        std::memcpy(&g_direction, argument, sizeof g_direction);
-        note(g_direction.flags);
+        std::memcpy(&direction, argument, sizeof direction);
+        note(direction.flags);
         return 0;
     }
     using Ioctl = int (*)(int, unsigned long, ...);
