@@ -65,17 +65,23 @@ void ErrorState::publish(const Failure& failure) noexcept {
     last_.store(&failure, std::memory_order_release);
 }
 
-const ErrorState::Failure* ErrorState::find(int code, Parts parts) const noexcept {
+const ErrorState::Failure* ErrorState::find(int code, Parts parts) noexcept {
     const auto isIt = [code, parts](const Failure& known) {
         return known.code == code && equals(known.text, parts);
     };
     const auto end = lasting_.begin() + static_cast<std::ptrdiff_t>(lastingCount_);
     const auto* const lasting = std::find_if(lasting_.begin(), end, isIt);
     if (lasting != end) return lasting;
-    const auto* const passing =
-        std::find_if(passing_.begin(), passing_.end(),
-                     [&isIt](const PassingPlace& place) { return isIt(place.failure); });
-    return passing != passing_.end() ? &passing->failure : nullptr;
+    auto* const passing = std::find_if(
+        passing_.begin(), passing_.end(),
+        [&isIt](const PassingPlace& place) { return place.reported != 0 && isIt(place.failure); });
+    return passing != passing_.end() ? useAgain(*passing) : nullptr;
+}
+
+/// The place takes its turn anew: those reported longer ago are overwritten before it.
+const ErrorState::Failure* ErrorState::useAgain(PassingPlace& place) noexcept {
+    place.reported = ++reports_;
+    return &place.failure;
 }
 
 /// @return null when there is no place left for it.
@@ -94,7 +100,9 @@ const ErrorState::Failure* ErrorState::addLasting(int code, Parts parts) noexcep
 
 /// @return null when the text may not be cut and there is no memory for all of it.
 const ErrorState::Failure* ErrorState::addPassing(int code, Parts parts, bool mayCut) noexcept {
-    PassingPlace& place = passing_[nextPassing_];
+    PassingPlace& place = *std::min_element(
+        passing_.begin(), passing_.end(),
+        [](const PassingPlace& a, const PassingPlace& b) { return a.reported < b.reported; });
     std::size_t length = lengthOf(parts);
     char* text = place.roomFor(length);
     if (text == nullptr && !mayCut) return nullptr;
@@ -102,10 +110,9 @@ const ErrorState::Failure* ErrorState::addPassing(int code, Parts parts, bool ma
         length = PassingPlace::kOwnText;
         text = place.text.data();
     }
-    nextPassing_ = (nextPassing_ + 1) % kPassingFailures;
     join(text, length, parts);
     place.failure = {code, text};
-    return &place.failure;
+    return useAgain(place);
 }
 
 char* error_state::PassingPlace::roomFor(std::size_t length) noexcept {

@@ -4,6 +4,7 @@
 #include <array>
 #include <atomic>
 #include <cstddef>
+#include <cstdint>
 #include <mutex>
 #include <span>
 #include <string_view>
@@ -28,6 +29,7 @@ struct PassingPlace {
     char* roomFor(std::size_t length) noexcept;
 
     Failure failure;
+    std::uint64_t reported = 0;  ///< Number of the last report that used it; 0: none has.
     std::array<char, kOwnText + 1> text{};
     /// Rooms for longer texts, each at least twice as long as the one before it. Outgrown ones
     /// stay, so that whoever still holds one reads old text instead of freed memory.
@@ -72,7 +74,8 @@ class ErrorState {
     static constexpr std::size_t kLastingRoom = 3072;
     static constexpr std::size_t kPassingFailures = 8;
 
-    const Failure* find(int code, Parts parts) const noexcept;
+    const Failure* find(int code, Parts parts) noexcept;
+    const Failure* useAgain(error_state::PassingPlace& place) noexcept;
     const Failure* addLasting(int code, Parts parts) noexcept;
     const Failure* addPassing(int code, Parts parts, bool mayCut) noexcept;
     void publish(const Failure& failure) noexcept;
@@ -86,5 +89,5 @@ class ErrorState {
     std::array<char, kLastingRoom> lastingTexts_{};
     std::size_t lastingUsed_ = 0;
     std::array<error_state::PassingPlace, kPassingFailures> passing_{};
-    std::size_t nextPassing_ = 0;
+    std::uint64_t reports_ = 0;
 };

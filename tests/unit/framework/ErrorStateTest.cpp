@@ -78,6 +78,28 @@ TEST(ErrorStateTest, QuotingTextStaysForEightMoreOfItsKind) {
     EXPECT_STREQ("refused: the first", handedOut);
 }
 
+TEST(ErrorStateTest, QuotingTextReportedAgainTakesItsTurnAnew) {
+    ErrorState state;
+    quote(state, "the first");
+    for (int number = 0; number < 7; ++number)
+        quote(state, numbered("another ", number));
+    quote(state, "the first");
+    const char* handedOut = state.last().text;
+    for (int number = 7; number < 14; ++number)
+        quote(state, numbered("another ", number));
+    EXPECT_STREQ("refused: the first", handedOut);
+}
+
+TEST(ErrorStateTest, FailureLikeTheStateAtTheStartKeepsItsPlace) {
+    ErrorState state;
+    state.set(1, "");
+    const ErrorState::Failure& reported = state.last();
+    for (int number = 0; number < 8; ++number)
+        quote(state, numbered("another ", number));
+    EXPECT_EQ(1, reported.code);
+    EXPECT_STREQ("", reported.text);
+}
+
 TEST(ErrorStateTest, QuotingTextsTakeNoPlaceFromTheLastingOnes) {
     ErrorState state;
     for (int number = 0; number < 1000; ++number)
