@@ -84,8 +84,8 @@ TEST(WriteTest, OneWrongAssignmentAndNothingIsSent) {
         {"1?IREG?300001?short=1", "mrtu: 1?IREG?300001?short: can only be read\n"},
         {"1?HREG?400002?short", "mrtu: '1?HREG?400002?short' is no URI=VALUE\n"},
         {"1?HREG?400002=1",
-         "mrtu: 1?HREG?400002: Tag URI error: 1?HREG?400002 - there must be 4 tag specification "
-         "fields\n"},
+         "mrtu: 1?HREG?400002: Tag URI error: 1?HREG?400002 - there must be 4 tag "
+         "specification fields\n"},
     };
     for (const auto& row : rows) {
         const Outcome outcome = mrtu({"write", "--sim", "--trace", good, row.wrong});

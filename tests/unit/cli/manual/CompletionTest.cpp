@@ -30,7 +30,7 @@ TEST(CompletionTest, BashKnowsTheChoicesOfAnOption) {
                 HasSubstr("'fetch --parity') words='none even odd' ;;\n"));
 }
 
-TEST(CompletionTest, ZshTextsCannotEndTheirSpecification) {
+TEST(CompletionTest, ZshTextsCannotEndTheirEntry) {
     EXPECT_THAT(cli::manual::zshCompletion(sampleProgram()),
                 HasSubstr("'--file=[Where\\: a path]:FILE:_files'"));
     EXPECT_THAT(cli::manual::zshCompletion(sampleProgram()),
