@@ -2,7 +2,6 @@
 #include "framework/ParameterReplacer.h"
 
 #include <charconv>
-#include <cstring>
 #include <utility>
 
 #include "framework/HostServicePointers.h"

@@ -4,9 +4,7 @@
 #include <sys/time.h>
 
 #include <algorithm>
-#include <charconv>
 #include <cstring>
-#include <new>
 #include <string_view>
 
 #include "framework/DataTypes.h"

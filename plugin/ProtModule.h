@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdint>
+
 #include "platform/IProtModule.h"
 
 /// Counts its users: the services are taken by the first Init() and handed back by the last
