@@ -11,7 +11,6 @@
 namespace wire {
 namespace {
 
-constexpr std::uint8_t kExceptionFlag = 0x80;
 /// More values make no line that anybody reads.
 constexpr std::size_t kShownValues = 16;
 constexpr const char* kDamaged = "damaged";
@@ -33,11 +32,6 @@ constexpr std::array kExceptions{
     ExceptionRow{10, "gateway path unavailable"},
     ExceptionRow{11, "gateway target device failed to respond"},
 };
-
-/// Registers of 32 bits share the functions of those of 16; the bytes for each item tell them
-/// apart.
-constexpr std::size_t kShort = 2;
-constexpr std::size_t kLong = 4;
 
 /// High byte first. REQUIRES: at most four bytes.
 std::uint32_t numberOf(ByteView bytes) {
@@ -76,11 +70,12 @@ std::string wordList(ByteView bytes, std::size_t width) {
 }
 
 std::size_t widthOf(ByteView values, std::size_t count) {
-    return count != 0 && values.size() == kLong * count ? kLong : kShort;
+    return count != 0 && values.size() == kLongRegisterBytes * count ? kLongRegisterBytes
+                                                                     : kRegisterBytes;
 }
 
 std::string_view itemOf(const FunctionRow& row, std::size_t width) {
-    return width == kLong ? "32-bit register" : row.item;
+    return width == kLongRegisterBytes ? "32-bit register" : row.item;
 }
 
 std::string bitWord(std::uint32_t value) {
@@ -124,7 +119,8 @@ std::string requestText(std::uint8_t function, ByteView data) {
                    bitWord(numberOf(behind.first(2)));
         case Form::WriteWord:
             return "write " + std::string(itemOf(*row, behind.size())) + placeText(address) + ": " +
-                   std::to_string(numberOf(behind.first(std::min(behind.size(), kLong))));
+                   std::to_string(
+                       numberOf(behind.first(std::min(behind.size(), kLongRegisterBytes))));
         case Form::WriteBits:
         case Form::WriteWords:
             break;

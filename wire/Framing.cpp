@@ -28,24 +28,24 @@ Bytes encodeAscii(ByteView message, bool breakCheck) {
     return frame;
 }
 
-Bytes decodeRtu(ByteView raw) {
-    if (raw.size() < kMinMessage + 2 || raw.size() > kMaxRtuFrame) return {};
+ByteView messageInRtu(ByteView raw) {
+    if (raw.size() < frameLength(Mode::Rtu, kMinMessage) || raw.size() > kMaxRtuFrame) return {};
     const ByteView message = raw.first(raw.size() - 2);
     const unsigned low = raw[raw.size() - 2];
     const unsigned high = raw[raw.size() - 1];
     if (crc16(message) != (high << 8U | low)) return {};
-    return {message.begin(), message.end()};
+    return message;
 }
 
-Bytes decodeAscii(ByteView raw) {
-    if (raw.size() < 1 + 2 * (kMinMessage + 1) + 2 || raw.size() > kMaxAsciiFrame) return {};
+ByteView messageInAscii(ByteView raw, MessageRoom& room) {
+    if (raw.size() < frameLength(Mode::Ascii, kMinMessage) || raw.size() > kMaxAsciiFrame)
+        return {};
     if (raw[0] != ':' || raw[raw.size() - 2] != '\r' || raw[raw.size() - 1] != '\n') return {};
-    auto bytes = fromHex(raw.subspan(1, raw.size() - 3));
-    if (!bytes) return {};
-    const std::uint8_t lrc = bytes->back();
-    bytes->pop_back();
-    if (lrc8(*bytes) != lrc) return {};
-    return *std::move(bytes);
+    const auto count = bytesInHex(raw.subspan(1, raw.size() - 3), room);
+    if (!count) return {};
+    const ByteView message = ByteView(room).first(*count - 1);
+    if (lrc8(message) != room[*count - 1]) return {};
+    return message;
 }
 
 }  // namespace
@@ -54,9 +54,14 @@ Bytes encodeFrame(Mode mode, ByteView message, bool breakCheck) {
     return mode == Mode::Rtu ? encodeRtu(message, breakCheck) : encodeAscii(message, breakCheck);
 }
 
+ByteView messageIn(Mode mode, ByteView raw, MessageRoom& room) {
+    return mode == Mode::Rtu ? messageInRtu(raw) : messageInAscii(raw, room);
+}
+
 Received decodeFrame(Mode mode, ByteView raw) {
-    return {.raw = Bytes(raw.begin(), raw.end()),
-            .message = mode == Mode::Rtu ? decodeRtu(raw) : decodeAscii(raw)};
+    MessageRoom room;
+    const ByteView message = messageIn(mode, raw, room);
+    return {.raw = Bytes(raw.begin(), raw.end()), .message = Bytes(message.begin(), message.end())};
 }
 
 FrameSplitter::FrameSplitter(Mode mode, RequestLength requestLength)

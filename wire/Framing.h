@@ -2,6 +2,7 @@
 // the stream of received bytes. Pure: no port, no clock.
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <functional>
 #include <optional>
@@ -11,14 +12,32 @@
 
 namespace wire {
 
-/// Bytes of the longest RTU frame. Source: Modbus over Serial Line V1.02, 2.5.1.
-inline constexpr std::size_t kMaxRtuFrame = 256;
-/// Characters of the longest ASCII frame: colon, 2 for each of 254 bytes and the LRC, CR, LF.
-inline constexpr std::size_t kMaxAsciiFrame = 1 + 2 * (254 + 1) + 2;
+/// Bytes of the longest message: node, function, data. Source: Modbus over Serial Line
+/// V1.02, 2.5.1.
+inline constexpr std::size_t kMaxMessage = 1 + 1 + 252;
+
+/// How long a frame with a message of `message` bytes is. RTU: with the CRC. ASCII: colon, two
+/// characters for each byte and for the LRC, CR, LF.
+constexpr std::size_t frameLength(Mode mode, std::size_t message) {
+    return mode == Mode::Rtu ? message + 2 : 1 + 2 * (message + 1) + 2;
+}
+
+inline constexpr std::size_t kMaxRtuFrame = frameLength(Mode::Rtu, kMaxMessage);
+inline constexpr std::size_t kMaxAsciiFrame = frameLength(Mode::Ascii, kMaxMessage);
 
 /// @return the message with its check, as it travels in `mode`.
 /// @param breakCheck  The check is spoilt (all its bits inverted), the rest is in order.
 Bytes encodeFrame(Mode mode, ByteView message, bool breakCheck = false);
+
+/// Room for what an ASCII frame says: a message and its LRC.
+using MessageRoom = std::array<std::uint8_t, kMaxMessage + 1>;
+
+/// Takes no memory.
+/// @param room  Where an ASCII frame is decoded.
+/// @return the message in a frame, a part of `raw` (RTU) or of `room` (ASCII). Empty when the frame
+/// is damaged: too short or too long, a wrong check, and in ASCII a character other than 0-9 and
+/// A-F.
+ByteView messageIn(Mode mode, ByteView raw, MessageRoom& room);
 
 /// A frame taken from the line.
 struct Received {
@@ -28,8 +47,7 @@ struct Received {
     bool damaged() const { return message.empty(); }
 };
 
-/// @return the frame read from `raw`. It is damaged when it is too short or too long, when its
-/// check is wrong, and in ASCII when it holds a character other than 0-9 and A-F.
+/// @return the frame read from `raw`, damaged where messageIn() finds no message.
 Received decodeFrame(Mode mode, ByteView raw);
 
 /// Tells from the first bytes of an RTU request how long it is, check included; nothing when more

@@ -3,10 +3,15 @@
 
 #include <algorithm>
 #include <array>
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 
 namespace wire {
+
+/// In the function of a reply: the request was refused. Source: Modbus Application Protocol V1.1b3,
+/// 7.
+inline constexpr std::uint8_t kExceptionFlag = 0x80;
 
 /// How a function's request and reply are laid out behind the function.
 enum class Form : std::uint8_t {
@@ -17,6 +22,11 @@ enum class Form : std::uint8_t {
     WriteBits,   ///< Address, count, byte count, bits; reply: address, count.
     WriteWords,  ///< Address, count, byte count, registers; reply: address, count.
 };
+
+/// Bytes of a register, and of a register of 32 bits (Enron). The latter share the functions of the
+/// holding registers; only the number of bytes tells them apart.
+inline constexpr std::size_t kRegisterBytes = 2;
+inline constexpr std::size_t kLongRegisterBytes = 4;
 
 /// Source: Modbus Application Protocol V1.1b3, 6.1 to 6.6, 6.11, 6.12.
 struct FunctionRow {

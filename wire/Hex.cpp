@@ -3,9 +3,10 @@
 namespace wire {
 
 std::optional<std::uint8_t> hexValue(std::uint8_t character) {
-    const std::size_t value = kHexDigits.find(static_cast<char>(character));
-    if (value == std::string_view::npos) return std::nullopt;
-    return static_cast<std::uint8_t>(value);
+    if (character >= '0' && character <= '9') return static_cast<std::uint8_t>(character - '0');
+    if (character >= 'A' && character <= 'F')
+        return static_cast<std::uint8_t>(character - 'A' + 10);
+    return std::nullopt;
 }
 
 void putHex(Bytes& out, std::uint8_t byte) {
@@ -13,15 +14,21 @@ void putHex(Bytes& out, std::uint8_t byte) {
     out.push_back(static_cast<std::uint8_t>(kHexDigits[byte & 0x0FU]));
 }
 
-std::optional<Bytes> fromHex(ByteView characters) {
-    if (characters.size() % 2 != 0) return std::nullopt;
-    Bytes bytes;
-    for (std::size_t i = 0; i < characters.size(); i += 2) {
-        const auto high = hexValue(characters[i]);
-        const auto low = hexValue(characters[i + 1]);
+std::optional<std::size_t> bytesInHex(ByteView characters, std::span<std::uint8_t> room) {
+    const std::size_t count = characters.size() / 2;
+    if (characters.size() % 2 != 0 || count > room.size()) return std::nullopt;
+    for (std::size_t i = 0; i < count; ++i) {
+        const auto high = hexValue(characters[2 * i]);
+        const auto low = hexValue(characters[2 * i + 1]);
         if (!high || !low) return std::nullopt;
-        bytes.push_back(static_cast<std::uint8_t>(*high << 4U | *low));
+        room[i] = static_cast<std::uint8_t>(*high << 4U | *low);
     }
+    return count;
+}
+
+std::optional<Bytes> fromHex(ByteView characters) {
+    Bytes bytes(characters.size() / 2);
+    if (!bytesInHex(characters, bytes)) return std::nullopt;
     return bytes;
 }
 

@@ -1,7 +1,9 @@
 // Bytes as hexadecimal digits.
 #pragma once
 
+#include <cstddef>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 
@@ -17,6 +19,11 @@ std::optional<std::uint8_t> hexValue(std::uint8_t character);
 
 /// Appends two digits.
 void putHex(Bytes& out, std::uint8_t byte);
+
+/// Stores the bytes of an even number of digits.
+/// @return how many there are; nothing for any other text and for one that `room` does not hold,
+/// which may have been written to by then.
+std::optional<std::size_t> bytesInHex(ByteView characters, std::span<std::uint8_t> room);
 
 /// @return the bytes of an even number of digits; nothing for any other text.
 std::optional<Bytes> fromHex(ByteView characters);

@@ -36,6 +36,18 @@ TEST(FramingTest, EncodedAsciiCarriesUpperCaseDigitsAndCrLf) {
     EXPECT_EQ(kReadRequestAscii, textOf(encodeFrame(Mode::Ascii, kReadRequest)));
 }
 
+TEST(FramingTest, FramesOfTheLongestMessageHaveTheStandardsLengths) {
+    EXPECT_EQ(256U, kMaxRtuFrame);
+    EXPECT_EQ(513U, kMaxAsciiFrame);
+    const Bytes message(kMaxMessage, 0x11);
+    for (const Mode mode : {Mode::Rtu, Mode::Ascii}) {
+        MessageRoom room{};
+        const Bytes frame = encodeFrame(mode, message);
+        EXPECT_EQ(frameLength(mode, message.size()), frame.size());
+        EXPECT_EQ(message.size(), messageIn(mode, frame, room).size());
+    }
+}
+
 TEST(FramingTest, EncodedBrokenCheckDiffersInAllItsBitsOnly) {
     const Bytes rtu{0x11, 0x03, 0x00, 0x6B, 0x00, 0x03, 0x89, 0x78};
     EXPECT_EQ(rtu, encodeFrame(Mode::Rtu, kReadRequest, true));

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <array>
+
 namespace wire {
 namespace {
 
@@ -28,6 +30,15 @@ TEST(HexTest, BytesAreReadFromPairsOfDigits) {
     EXPECT_EQ(Bytes{}, fromHex({}));
     EXPECT_FALSE(fromHex(characters("01F")));
     EXPECT_FALSE(fromHex(characters("01fF")));
+}
+
+TEST(HexTest, BytesGoIntoTheRoomThatThereIs) {
+    std::array<std::uint8_t, 2> room{};
+    EXPECT_EQ(2U, bytesInHex(characters("01FF"), room));
+    EXPECT_EQ(0xFF, room[1]);
+    EXPECT_EQ(0U, bytesInHex({}, {}));
+    EXPECT_FALSE(bytesInHex(characters("01FF02"), room));
+    EXPECT_FALSE(bytesInHex(characters("0G"), room));
 }
 
 TEST(HexTest, TextHasABlankBetweenBytesOrWhatIsAskedFor) {
