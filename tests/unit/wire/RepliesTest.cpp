@@ -1,68 +1,14 @@
-// Golden frames: Modbus Application Protocol V1.1b3, 6.
-#include "wire/Replies.h"
-
 #include <gtest/gtest.h>
 
-#include <string_view>
-#include <vector>
+#include <tuple>
 
-#include "wire/Framing.h"
-#include "wire/Hex.h"
+#include "tests/unit/wire/Exchanges.h"
 
 namespace wire {
 namespace {
 
-constexpr Mode kModes[] = {Mode::Rtu, Mode::Ascii};
-
-struct Exchange {
-    Bytes request;  // Messages, without their checks.
-    Bytes reply;
-};
-
-const Exchange kExchanges[] = {
-    {{1, 1, 0, 0x13, 0, 0x13}, {1, 1, 3, 0xCD, 0x6B, 0x05}},
-    {{1, 2, 0, 0xC4, 0, 0x16}, {1, 2, 3, 0xAC, 0xDB, 0x35}},
-    {{1, 3, 0, 0x6B, 0, 3}, {1, 3, 6, 2, 0x2B, 0, 0, 0, 0x64}},
-    {{1, 4, 0, 8, 0, 1}, {1, 4, 2, 0, 0x0A}},
-    {{1, 5, 0, 0xAC, 0xFF, 0}, {1, 5, 0, 0xAC, 0xFF, 0}},
-    {{1, 6, 0, 1, 0, 3}, {1, 6, 0, 1, 0, 3}},
-    {{1, 15, 0, 0x13, 0, 0x0A, 2, 0xCD, 1}, {1, 15, 0, 0x13, 0, 0x0A}},
-    {{1, 16, 0, 1, 0, 2, 4, 0, 0x0A, 1, 2}, {1, 16, 0, 1, 0, 2}},
-    // 32-bit registers.
-    {{1, 3, 0x13, 0x88, 0, 2}, {1, 3, 8, 0, 1, 2, 3, 4, 5, 6, 7}},
-    {{1, 6, 0x13, 0x88, 0, 1, 2, 3}, {1, 6, 0x13, 0x88, 0, 1, 2, 3}},
-};
-
-const Bytes kRead{1, 3, 0, 0x6B, 0, 3};
-const Bytes kReadReply{1, 3, 6, 2, 0x2B, 0, 0, 0, 0x64};
-
-Request requestOf(Mode mode, const Bytes& message) {
-    return requestIn(encodeFrame(mode, message)).value();
-}
-
 Answering answering(Mode mode, const Bytes& request, const Bytes& reply) {
     return answering(requestOf(mode, request), encodeFrame(mode, reply));
-}
-
-bool confusable(const Bytes& one, const Bytes& other) {
-    const bool result = confusable(requestOf(Mode::Rtu, one), requestOf(Mode::Rtu, other));
-    EXPECT_EQ(result, confusable(requestOf(Mode::Rtu, other), requestOf(Mode::Rtu, one)));
-    EXPECT_EQ(result, confusable(requestOf(Mode::Ascii, one), requestOf(Mode::Ascii, other)));
-    return result;
-}
-
-/// The message with one byte replaced.
-Bytes with(Bytes message, std::size_t at, std::uint8_t byte) {
-    message.at(at) = byte;
-    return message;
-}
-
-std::string nameOf(Mode mode, const Bytes& request) {
-    return (mode == Mode::Rtu ? "RTU " : "ASCII ") + hexText(request);
-}
-
-Bytes exceptionOf(const Bytes& request) {
-    return {request[0], static_cast<std::uint8_t>(request[1] | kExceptionFlag), 2};
 }
 
 TEST(RepliesTest, EveryFunctionsReplyAnswersAndIsWhole) {
@@ -104,49 +50,6 @@ TEST(RepliesTest, NoPrefixOfAReplyIsWholeOrAnswers) {
             }
         }
     }
-}
-
-TEST(RepliesTest, TheLengthGrowsWithWhatHasComeAndNeverExceedsTheReply) {
-    for (const Mode mode : kModes) {
-        for (const auto& [request, reply] : kExchanges) {
-            const Request asked = requestOf(mode, request);
-            const Bytes frame = encodeFrame(mode, reply);
-            std::size_t before = frameLength(mode, 3);
-            for (std::size_t count = 0; count <= frame.size(); ++count) {
-                const std::size_t length = replyLength(asked, ByteView(frame).first(count));
-                EXPECT_LE(before, length) << nameOf(mode, request) << count;
-                EXPECT_GE(frame.size(), length) << nameOf(mode, request) << count;
-                before = length;
-            }
-        }
-    }
-}
-
-TEST(RepliesTest, TheLengthIsKnownAsSoonAsItCanBe) {
-    const Request asked = requestOf(Mode::Rtu, kRead);
-    EXPECT_EQ(5U, replyLength(asked, {}));
-    EXPECT_EQ(5U, replyLength(asked, Bytes{1}));
-    EXPECT_EQ(11U, replyLength(asked, Bytes{1, 3}));  // 17 with long registers.
-    EXPECT_EQ(11U, replyLength(asked, Bytes{1, 3, 6}));
-    EXPECT_EQ(17U, replyLength(asked, Bytes{1, 3, 12}));
-    EXPECT_EQ(5U, replyLength(asked, Bytes{1, 0x83}));
-    const Request inAscii = requestOf(Mode::Ascii, kRead);
-    EXPECT_EQ(11U, replyLength(inAscii, {}));
-    EXPECT_EQ(11U, replyLength(inAscii, Bytes{':', '0', '1', '0'}));
-    EXPECT_EQ(23U, replyLength(inAscii, Bytes{':', '0', '1', '0', '3'}));
-}
-
-TEST(RepliesTest, WhatBeginsOtherwiseHasNoLength) {
-    const Request asked = requestOf(Mode::Rtu, kRead);
-    for (const Bytes& other : {Bytes{2}, Bytes{1, 4}, Bytes{1, 0x84}, Bytes{1, 3, 4}})
-        EXPECT_EQ(0U, replyLength(asked, other)) << hexText(other);
-    const Request inAscii = requestOf(Mode::Ascii, kRead);
-    for (const std::string_view other : {"0103", ":02", ":0g", ":010304", ":0 "})
-        EXPECT_EQ(0U, replyLength(inAscii, Bytes(other.begin(), other.end()))) << other;
-    const Request write = requestOf(Mode::Rtu, {1, 6, 0, 1, 0, 3});
-    EXPECT_EQ(8U, replyLength(write, Bytes{1, 6, 0, 1, 0}));
-    EXPECT_EQ(0U, replyLength(write, Bytes{1, 6, 0, 2}));
-    EXPECT_EQ(0U, replyLength(write, Bytes{1, 6, 0, 1, 0, 4}));
 }
 
 TEST(RepliesTest, AnotherNodeFunctionOrCountDoesNotAnswer) {
@@ -333,9 +236,6 @@ TEST(RepliesTest, OfOtherFunctionsNodeFunctionAndCheckDecide) {
         EXPECT_EQ(Answering::No, answering(mode, request, {1, 44, 14}));
         EXPECT_EQ(Answering::No, answering(asked, encodeFrame(mode, Bytes{1, 43, 14}, true)));
     }
-    EXPECT_TRUE(confusable(request, Bytes{1, 43, 14, 2, 0}));
-    EXPECT_FALSE(confusable(request, Bytes{2, 43, 14, 1, 0}));
-    EXPECT_FALSE(confusable(request, Bytes{1, 44, 14, 1, 0}));
 }
 
 TEST(RepliesTest, ARequestLaidOutOtherwiseIsLikeAnotherFunction) {
@@ -346,77 +246,6 @@ TEST(RepliesTest, ARequestLaidOutOtherwiseIsLikeAnotherFunction) {
         EXPECT_EQ(0U, replyLength(asked, {})) << hexText(request);
         EXPECT_EQ(Answering::Yes, answering(Mode::Rtu, request, exceptionOf(request)));
     }
-}
-
-TEST(RepliesTest, ReadsOfTheSameLengthAtOnePlaceOrAnotherCanBeConfused) {
-    for (const std::uint8_t function : Bytes{1, 2, 3, 4}) {
-        const Bytes read{1, function, 0, 0, 0, 9};
-        EXPECT_TRUE(confusable(read, read)) << +function;
-        EXPECT_TRUE(confusable(read, with(read, 3, 77))) << +function;
-        EXPECT_FALSE(confusable(read, with(read, 0, 2))) << +function;
-        EXPECT_FALSE(confusable(read, with(read, 1, 5))) << +function;
-        EXPECT_FALSE(confusable(read, with(read, 5, 7))) << +function;
-        EXPECT_FALSE(confusable(read, with(read, 1, function % 4 + 1))) << +function;
-    }
-}
-
-TEST(RepliesTest, BitsThatFillTheSameBytesCanBeConfused) {
-    EXPECT_TRUE(confusable({1, 1, 0, 0, 0, 9}, {1, 1, 0, 0, 0, 16}));
-    EXPECT_FALSE(confusable({1, 1, 0, 0, 0, 9}, {1, 1, 0, 0, 0, 8}));
-    EXPECT_FALSE(confusable({1, 2, 0, 0, 0, 16}, {1, 2, 0, 0, 0, 17}));
-}
-
-TEST(RepliesTest, ALongRegisterCanBeConfusedWithTwoShortOnes) {
-    EXPECT_TRUE(confusable({1, 3, 0, 0, 0, 2}, {1, 3, 0x13, 0x88, 0, 1}));
-    EXPECT_TRUE(confusable({1, 3, 0, 0, 0, 6}, {1, 3, 0x13, 0x88, 0, 3}));
-    EXPECT_FALSE(confusable({1, 3, 0, 0, 0, 2}, {1, 3, 0, 0, 0, 3}));
-    EXPECT_FALSE(confusable({1, 4, 0, 0, 0, 2}, {1, 4, 0, 0, 0, 1}));
-}
-
-TEST(RepliesTest, ReadsThatCanBeConfusedShareEveryGoodReply) {
-    const auto couldAnswer = [](std::size_t count, std::size_t values) {
-        return values == 2 * count || values == 4 * count;
-    };
-    for (std::uint8_t one = 1; one <= 62; ++one) {
-        for (std::uint8_t other = 1; other <= 62; ++other) {
-            bool shared = false;
-            for (std::size_t values = 2; values <= 250; ++values)
-                shared |= couldAnswer(one, values) && couldAnswer(other, values);
-            if (shared) {
-                EXPECT_TRUE(confusable({1, 3, 0, 0, 0, one}, {1, 3, 0, 9, 0, other}))
-                    << +one << ' ' << +other;
-            }
-        }
-    }
-}
-
-TEST(RepliesTest, WritesCanBeConfusedWhenTheSameComesBack) {
-    const Bytes coil{1, 5, 0, 4, 0xFF, 0};
-    EXPECT_TRUE(confusable(coil, coil));
-    EXPECT_FALSE(confusable(coil, with(coil, 3, 5)));
-    EXPECT_FALSE(confusable(coil, with(coil, 4, 0)));
-    const Bytes word{1, 6, 0, 4, 1, 2};
-    EXPECT_TRUE(confusable(word, word));
-    EXPECT_FALSE(confusable(word, with(word, 5, 3)));
-    EXPECT_FALSE(confusable(word, with(word, 0, 2)));
-    const Bytes words{1, 16, 0, 4, 0, 1, 2, 7, 7};
-    EXPECT_TRUE(confusable(words, with(words, 8, 8)));  // Values do not come back.
-    EXPECT_FALSE(confusable(words, with(words, 3, 5)));
-    EXPECT_FALSE(confusable(words, {1, 16, 0, 4, 0, 2, 4, 0, 0, 0, 0}));
-    EXPECT_TRUE(confusable({1, 15, 0, 4, 0, 9, 2, 1, 1}, {1, 15, 0, 4, 0, 9, 2, 0, 0}));
-    EXPECT_FALSE(confusable({1, 15, 0, 4, 0, 9, 2, 1, 1}, {1, 15, 0, 4, 0, 10, 2, 1, 1}));
-}
-
-// A master may look at no more of the value than two bytes.
-TEST(RepliesTest, WritesOfLongRegistersCanBeConfusedByTheirFirstTwoBytes) {
-    const Bytes write{1, 6, 0x13, 0x88, 0, 1, 0, 0};
-    EXPECT_TRUE(confusable(write, with(write, 7, 1)));
-    EXPECT_FALSE(confusable(write, with(write, 5, 2)));
-    EXPECT_TRUE(confusable(write, {1, 6, 0x13, 0x88, 0, 1}));
-}
-
-TEST(RepliesTest, FramingsAreNotConfused) {
-    EXPECT_FALSE(confusable(requestOf(Mode::Rtu, kRead), requestOf(Mode::Ascii, kRead)));
 }
 
 }  // namespace
