@@ -1,4 +1,4 @@
-// Reception and sending against one deadline.
+// Sending against one deadline.
 #include "runtime/LineTransfer.h"
 
 #include <algorithm>
@@ -8,29 +8,22 @@ namespace {
 
 using std::chrono::nanoseconds;
 
-Milliseconds notNegative(Milliseconds time) {
-    return std::max(time, Milliseconds{0});
-}
-
-Transfer failedWait(WaitResult wait) {
-    return wait == WaitResult::Gone ? Transfer::Gone : Transfer::TimedOut;
-}
-
-/// Hands all bytes to the line.
+/// Asks for room only when the line has not taken everything.
 Transfer handOver(Line& line, std::span<const std::uint8_t> data, Line::TimePoint deadline) {
     while (!data.empty()) {
-        const WaitResult wait = line.waitWritable(deadline);
-        if (wait != WaitResult::Ready) return failedWait(wait);
         const Moved written = line.write(data);
         if (written.gone) return Transfer::Gone;
         data = data.subspan(written.count);
-        if (written.count == 0 && line.now() >= deadline) return Transfer::TimedOut;
+        if (data.empty()) break;
+        const WaitResult wait = line.waitWritable(deadline);
+        if (wait == WaitResult::Gone) return Transfer::Gone;
+        if (wait == WaitResult::TimedOut || line.now() >= deadline) return Transfer::TimedOut;
     }
     return Transfer::Complete;
 }
 
 /// Sleeps for as long as the line's own queue needs, instead of asking it all the time.
-Transfer drain(Line& line, Line::TimePoint deadline, nanoseconds character) {
+Transfer untilSent(Line& line, Line::TimePoint deadline, nanoseconds character) {
     constexpr nanoseconds kShortestSleep = std::chrono::milliseconds{1};
     while (const std::size_t unsent = line.unsent()) {
         const Line::TimePoint now = line.now();
@@ -41,52 +34,19 @@ Transfer drain(Line& line, Line::TimePoint deadline, nanoseconds character) {
     return Transfer::Complete;
 }
 
+Transfer orDiscarded(Line& line, Transfer how) {
+    if (how == Transfer::TimedOut) line.discardOutput();
+    return how;
+}
+
 }  // namespace
 
-Transfer receiveOne(Line& line, std::uint8_t& byte, Milliseconds timeout) {
-    const Line::TimePoint deadline = line.now() + notNegative(timeout);
-    for (;;) {
-        const WaitResult wait = line.waitReadable(deadline);
-        if (wait != WaitResult::Ready) return failedWait(wait);
-        std::uint8_t arrived = 0;
-        const Moved read = line.read({&arrived, 1});
-        if (read.gone) return Transfer::Gone;
-        if (read.count == 1) {
-            byte = arrived;
-            return Transfer::Complete;
-        }
-        if (line.now() >= deadline) return Transfer::TimedOut;
-    }
+Transfer sendAll(Line& line, std::span<const std::uint8_t> data, Line::TimePoint deadline) {
+    return orDiscarded(line, handOver(line, data, deadline));
 }
 
-FrameEnd receiveRest(Line& line, std::span<std::uint8_t> buffer, Milliseconds timeout,
-                     Milliseconds gap) {
-    const Line::TimePoint start = line.now();
-    const Line::TimePoint deadline = start + notNegative(timeout);
-    Line::TimePoint silentAt = start + notNegative(gap);
-    std::size_t count = 0;
-    while (count < buffer.size()) {
-        const WaitResult wait = line.waitReadable(std::min(deadline, silentAt));
-        if (wait == WaitResult::Gone) return {Transfer::Gone, count};
-        if (wait == WaitResult::TimedOut) break;
-        const Moved read = line.read(buffer.subspan(count));
-        if (read.gone) return {Transfer::Gone, count};
-        count += read.count;
-        const Line::TimePoint now = line.now();
-        if (now >= deadline) return {Transfer::TimedOut, count};
-        if (read.count > 0) silentAt = now + notNegative(gap);
-    }
-    const bool outOfTime = count < buffer.size() && deadline < silentAt;
-    return {outOfTime ? Transfer::TimedOut : Transfer::Complete, count};
-}
-
-Transfer sendAll(Line& line, std::span<const std::uint8_t> data, nanoseconds allowed,
-                 nanoseconds character) {
-    const Line::TimePoint deadline = line.now() + allowed;
-    Transfer result = handOver(line, data, deadline);
-    if (result == Transfer::Complete) result = drain(line, deadline, character);
-    if (result == Transfer::TimedOut) line.discardOutput();
-    return result;
+Transfer drain(Line& line, Line::TimePoint deadline, nanoseconds characterTime) {
+    return orDiscarded(line, untilSent(line, deadline, characterTime));
 }
 
 }  // namespace runtime

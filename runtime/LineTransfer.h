@@ -1,4 +1,4 @@
-// How bytes and frames travel over a serial line: every wait has one absolute deadline.
+// How bytes leave over a serial line: every wait has one absolute deadline.
 #pragma once
 
 #include <chrono>
@@ -13,34 +13,19 @@ namespace runtime {
 using Milliseconds = std::chrono::milliseconds;
 
 /// How a transfer ended.
-enum class Transfer {
+enum class Transfer : std::uint8_t {
     Complete,  ///< The byte came; the frame ended; everything was sent.
     TimedOut,  ///< The deadline passed first.
     Gone,      ///< The line is no more.
 };
 
-/// Waits for one byte.
-/// @param byte  Receives it; untouched unless Complete.
-/// @param timeout  From the call; 0 and below only look.
-Transfer receiveOne(Line& line, std::uint8_t& byte, Milliseconds timeout);
+/// Hands all of `data` to the line, which sends it by itself. When it does not take everything by
+/// the deadline, what has not been sent is thrown away, so that no half frame leaves later.
+Transfer sendAll(Line& line, std::span<const std::uint8_t> data, Line::TimePoint deadline);
 
-/// What receiveRest() found.
-struct FrameEnd {
-    Transfer how;       ///< Complete: ended by silence or by its maximum.
-    std::size_t count;  ///< Bytes stored, whatever the end was.
-};
-
-/// Reads until the line has been silent for `gap`, the buffer is full or `timeout` has passed
-/// since the call, whichever is first. Silence counts from the call and from every piece that
-/// arrives; arriving bytes never move the deadline.
-FrameEnd receiveRest(Line& line, std::span<std::uint8_t> buffer, Milliseconds timeout,
-                     Milliseconds gap);
-
-/// Writes all of `data` and waits until it is on the wire. When that can't be done by the deadline,
-/// what has not been sent is thrown away, so that no half frame leaves later.
-/// @param allowed  From the call; see sendingTime().
-Transfer sendAll(Line& line, std::span<const std::uint8_t> data, std::chrono::nanoseconds allowed,
-                 std::chrono::nanoseconds characterTime);
+/// Waits until the line has sent what it took; a line that can't tell has. What is left at the
+/// deadline is thrown away.
+Transfer drain(Line& line, Line::TimePoint deadline, std::chrono::nanoseconds characterTime);
 
 /// The time that one character of `bits` bits (start, data, parity and stop bits) takes on the
 /// wire. REQUIRES: baud > 0.

@@ -51,7 +51,37 @@ std::string PosixSerialFactory::deviceOf(const std::string& name) const {
 
 void PosixSerialFactory::setGapFloor(int ms) {
     const std::lock_guard guard(mutex_);
-    gapFloorMs_ = std::max(0, ms);
+    exchange_.gapFloor = Milliseconds{std::max(0, ms)};
+}
+
+void PosixSerialFactory::setFrameEnd(FrameEndBy frameEnd) {
+    const std::lock_guard guard(mutex_);
+    exchange_.frameEnd = frameEnd;
+}
+
+void PosixSerialFactory::setReplyRules(std::shared_ptr<const ReplyRules> rules) {
+    const std::lock_guard guard(mutex_);
+    exchange_.rules = std::move(rules);
+}
+
+void PosixSerialFactory::setReport(std::function<void(const std::string&)> report) {
+    const std::lock_guard guard(mutex_);
+    exchange_.report = std::move(report);
+}
+
+void PosixSerialFactory::setThrownAway(
+    std::function<void(const std::string&, ByteView)> thrownAway) {
+    const std::lock_guard guard(mutex_);
+    thrownAway_ = std::move(thrownAway);
+}
+
+ExchangeOptions PosixSerialFactory::exchangeOf(const std::string& port) const {
+    ExchangeOptions options = exchange_;
+    options.port = port;
+    if (thrownAway_) {
+        options.thrownAway = [port, show = thrownAway_](ByteView frame) { show(port, frame); };
+    }
+    return options;
 }
 
 ISerialPort* PosixSerialFactory::openPort(const char* name) {
@@ -63,7 +93,7 @@ ISerialPort* PosixSerialFactory::openPort(const char* name) {
                                                   : ": not a port name (com1 .. com16)"));
         return nullptr;
     }
-    auto opened = PosixSerialPort::open({wanted, row->second, gapFloorMs_}, errors_);
+    auto opened = PosixSerialPort::open({row->second, exchangeOf(wanted)}, errors_);
     if (!opened) {
         errors_->set(opened.error());
         return nullptr;

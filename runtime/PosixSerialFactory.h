@@ -2,12 +2,14 @@
 #pragma once
 
 #include <atomic>
+#include <functional>
 #include <map>
 #include <memory>
 #include <mutex>
 #include <string>
 
 #include "platform/ISerialFactory.h"
+#include "runtime/LineExchange.h"
 
 namespace runtime {
 
@@ -59,6 +61,15 @@ class PosixSerialFactory final : public ISerialFactory {
     /// USB adapters hand over what they receive in chunks, with pauses that the line did not have.
     void setGapFloor(int ms);
 
+    // For ports opened from now on, see ExchangeOptions.
+    void setFrameEnd(FrameEndBy frameEnd);
+    /// @param rules  Null (the default): the ports know nothing of what passes.
+    void setReplyRules(std::shared_ptr<const ReplyRules> rules);
+    /// @param report  Must be safe to call on every thread that uses a port.
+    void setReport(std::function<void(const std::string&)> report);
+    /// @param thrownAway  Gets the port's name and the frame; as `report`.
+    void setThrownAway(std::function<void(const std::string&, ByteView)> thrownAway);
+
     ISerialPort* openPort(const char* name) override;
     /// Null and ports of others are ignored.
     void releasePort(ISerialPort* port) override;
@@ -77,11 +88,14 @@ class PosixSerialFactory final : public ISerialFactory {
     int GetImpVersion() const override { return 100; }
 
   private:
+    ExchangeOptions exchangeOf(const std::string& port) const;
+
     mutable std::mutex mutex_;
     std::map<std::string, std::string> devices_;
     std::map<ISerialPort*, std::unique_ptr<PosixSerialPort>> open_;
     std::shared_ptr<SerialErrors> errors_;
-    int gapFloorMs_ = 0;
+    ExchangeOptions exchange_;
+    std::function<void(const std::string&, ByteView)> thrownAway_;
 };
 
 /// True for "com1" .. "com16", exactly so written.

@@ -73,7 +73,7 @@ void FoundTerminal::putBack() const noexcept {
 Result<std::unique_ptr<PosixSerialPort>, std::string> PosixSerialPort::open(
     const PortRequest& request, std::shared_ptr<SerialErrors> errors) {
     const auto refusal = [&request](const char* why) {
-        return request.name + ": " + request.device + ": " + why;
+        return request.exchange.port + ": " + request.device + ": " + why;
     };
     FileDescriptor fd = openTerminal(request.device);
     if (!fd) return refusal(errno == EBUSY ? kInUse : std::strerror(errno));
@@ -93,24 +93,33 @@ Result<std::unique_ptr<PosixSerialPort>, std::string> PosixSerialPort::open(
     return port;
 }
 
-PosixSerialPort::PosixSerialPort(const PortRequest& request, std::shared_ptr<SerialErrors> errors,
+PosixSerialPort::PosixSerialPort(PortRequest request, std::shared_ptr<SerialErrors> errors,
                                  FileDescriptor fd, const termios& found)
-    : label_(request.name + ": " + request.device + ": "),
-      gapFloorMs_(request.gapFloorMs),
+    : label_(request.exchange.port + ": " + request.device + ": "),
       errors_(std::move(errors)),
       fd_(std::move(fd)),
       line_(fd_.get()),
+      exchange_(line_, std::move(request.exchange)),
       found_{fd_.get(), found, directionOf(fd_.get())},
       putBackAtTheEnd_(putBackFound, &found_),
       direction_(found_.direction),
       pseudo_(isPseudoTerminal(fd_.get())) {}
 
 PosixSerialPort::~PosixSerialPort() {
+    awaitSent();
     found_.putBack();
+}
+
+/// What was sent leaves whole before its settings go.
+void PosixSerialPort::awaitSent() {
+    if (!speedOf(settings_.baud)) return;
+    const auto character = characterTime(settings_.baud, characterBits(settings_));
+    drain(line_, line_.now() + sendingTime(line_.unsent(), character), character);
 }
 
 int PosixSerialPort::configure(int baud, int parity, int dataBits, int stopBits, int mode) {
     const std::lock_guard guard(sendMutex_);
+    awaitSent();
     settings_ = {baud, parity, dataBits, stopBits, mode};
     std::string fault = settingsFault(settings_);
     if (fault.empty()) fault = applyFormat();
@@ -121,6 +130,8 @@ int PosixSerialPort::configure(int baud, int parity, int dataBits, int stopBits,
     }
     line_.discardInput();
     line_.discardOutput();
+    exchange_.forgetInput();
+    exchange_.setFormat(settings_.baud, characterBits(settings_));
     errors_->set({});
     return 1;
 }
@@ -156,28 +167,28 @@ bool PosixSerialPort::noted(Transfer end) {
 }
 
 void PosixSerialPort::purge() {
-    line_.discardInput();
+    exchange_.purge();
 }
 
 int PosixSerialPort::receiveByte(unsigned char* byte, int timeoutMs, int /*reserved*/) {
-    return noted(receiveOne(line_, *byte, Milliseconds{timeoutMs})) ? 1 : 0;
+    return noted(exchange_.receiveByte(*byte, Milliseconds{timeoutMs})) ? 1 : 0;
 }
 
 int PosixSerialPort::send(const unsigned char* data, int length) {
+    if (length < 0) return 0;
+    const ByteView request(data, static_cast<std::size_t>(length));
+    if (!exchange_.clearToSend(request)) return 0;
     const std::lock_guard guard(sendMutex_);
     // Without a rate there is no time that sending may take.
-    if (length < 0 || !speedOf(settings_.baud)) return 0;
-    const auto count = static_cast<std::size_t>(length);
-    const auto character = characterTime(settings_.baud, characterBits(settings_));
-    const Transfer end = sendAll(line_, {data, count}, sendingTime(count, character), character);
-    return noted(end) ? 1 : 0;
+    if (!speedOf(settings_.baud)) return 0;
+    return noted(exchange_.transmit(request, isHalfDuplex(settings_.mode))) ? 1 : 0;
 }
 
 int PosixSerialPort::receiveFrame(unsigned char* data, int maxLength, int timeoutMs, int gapMs,
                                   int* received, int /*reserved*/) {
     const auto room = static_cast<std::size_t>(std::max(0, maxLength));
-    const FrameEnd end = receiveRest(line_, {data, room}, Milliseconds{timeoutMs},
-                                     Milliseconds{std::max(gapMs, gapFloorMs_)});
+    const FrameEnd end =
+        exchange_.receiveFrame({data, room}, Milliseconds{timeoutMs}, Milliseconds{gapMs});
     *received = static_cast<int>(end.count);
     noted(end.how);
     return end.count > 0 && end.how != Transfer::Gone ? 1 : 0;

@@ -12,7 +12,7 @@
 #include "platform/ISerialFactory.h"
 #include "posix/FileDescriptor.h"
 #include "runtime/LastAct.h"
-#include "runtime/LineTransfer.h"
+#include "runtime/LineExchange.h"
 #include "runtime/PosixLine.h"
 #include "runtime/PosixSerialFactory.h"
 #include "runtime/Result.h"
@@ -22,9 +22,8 @@ namespace runtime {
 
 /// What a port is opened with.
 struct PortRequest {
-    std::string name;    ///< "com1" ..
-    std::string device;  ///< "/dev/ttyS0" ..
-    int gapFloorMs = 0;  ///< The shortest silence that ends a frame.
+    std::string device;        ///< "/dev/ttyS0" ..
+    ExchangeOptions exchange;  ///< `port` is its name.
 };
 
 /// What a terminal was like when it was opened.
@@ -61,8 +60,10 @@ class PosixSerialPort final : public ISerialPort {
     int configure(int baud, int parity, int dataBits, int stopBits, int mode) override;
     void purge() override;
     int receiveByte(unsigned char* byte, int timeoutMs, int reserved) override;
-    /// Returns when the bytes are on the wire. Fails when that takes a second longer than the
-    /// characters themselves do; what is left is thrown away then.
+    /// Returns when the port has taken the bytes, in the half duplex modes when they are on the
+    /// wire. Fails when that takes a second longer than the characters themselves do; what is left
+    /// is thrown away then. Fails also, and sends nothing, when the reply could not be told from
+    /// others (LineExchange::clearToSend()).
     int send(const unsigned char* data, int length) override;
     int receiveFrame(unsigned char* data, int maxLength, int timeoutMs, int gapMs, int* received,
                      int reserved) override;
@@ -71,18 +72,19 @@ class PosixSerialPort final : public ISerialPort {
     int descriptor() const { return fd_.get(); }
 
   private:
-    PosixSerialPort(const PortRequest& request, std::shared_ptr<SerialErrors> errors,
+    PosixSerialPort(PortRequest request, std::shared_ptr<SerialErrors> errors,
                     posix::FileDescriptor fd, const termios& found);
+    void awaitSent();
     std::string applyFormat();
     std::string applyDirection();
     bool changeDirection(serial_rs485 wanted);
     bool noted(Transfer end);
 
     std::string label_;
-    int gapFloorMs_;
     std::shared_ptr<SerialErrors> errors_;
     posix::FileDescriptor fd_;
     PosixLine line_;
+    LineExchange exchange_;
     const FoundTerminal found_;
     LastAct putBackAtTheEnd_;
     std::optional<serial_rs485> direction_;  ///< In force now.

@@ -1,4 +1,4 @@
-#include "runtime/LineTransfer.h"
+#include "runtime/LineExchange.h"
 
 #include <gmock/gmock.h>
 
@@ -17,13 +17,14 @@ constexpr Milliseconds kForEver{std::numeric_limits<int>::max()};
 
 struct LineReceptionTest : ::testing::Test {
     FrameEnd receive(std::size_t most, Milliseconds timeout, Milliseconds gap) {
-        return receiveRest(line, std::span(buffer).first(most), timeout, gap);
+        return port.receiveFrame(std::span(buffer).first(most), timeout, gap);
     }
     std::vector<std::uint8_t> received(const FrameEnd& end) const {
         return {buffer.begin(), buffer.begin() + static_cast<std::ptrdiff_t>(end.count)};
     }
 
     FakeLine line;
+    LineExchange port{line, {}};
     std::array<std::uint8_t, 512> buffer{};
 };
 
@@ -142,32 +143,32 @@ TEST_F(LineReceptionTest, EndFoundByTheReadItselfIsGone) {
 TEST_F(LineReceptionTest, FirstByteArrivesInTime) {
     line.arrive(40, {0xAB, 0xCD});
     std::uint8_t byte = 0;
-    EXPECT_EQ(Transfer::Complete, receiveOne(line, byte, 2000ms));
+    EXPECT_EQ(Transfer::Complete, port.receiveByte(byte, 2000ms));
     EXPECT_EQ(0xAB, byte);
     EXPECT_EQ(40, line.elapsedMs());
-    EXPECT_EQ(Transfer::Complete, receiveOne(line, byte, 0ms));
+    EXPECT_EQ(Transfer::Complete, port.receiveByte(byte, 0ms));
     EXPECT_EQ(0xCD, byte);
 }
 
 TEST_F(LineReceptionTest, TimeoutLeavesTheFirstByteUntouched) {
     line.arrive(41, {0xAB});
     std::uint8_t byte = 0x11;
-    EXPECT_EQ(Transfer::TimedOut, receiveOne(line, byte, 40ms));
+    EXPECT_EQ(Transfer::TimedOut, port.receiveByte(byte, 40ms));
     EXPECT_EQ(0x11, byte);
     EXPECT_EQ(40, line.elapsedMs());
 }
 
 TEST_F(LineReceptionTest, TimeoutOfZeroOnlyLooksForTheFirstByte) {
     std::uint8_t byte = 0;
-    EXPECT_EQ(Transfer::TimedOut, receiveOne(line, byte, 0ms));
-    EXPECT_EQ(Transfer::TimedOut, receiveOne(line, byte, -3ms));
+    EXPECT_EQ(Transfer::TimedOut, port.receiveByte(byte, 0ms));
+    EXPECT_EQ(Transfer::TimedOut, port.receiveByte(byte, -3ms));
     EXPECT_EQ(0, line.elapsedMs());
 }
 
 TEST_F(LineReceptionTest, VanishedLineFailsTheFirstByteAtOnce) {
     line.vanish(10);
     std::uint8_t byte = 0x11;
-    EXPECT_EQ(Transfer::Gone, receiveOne(line, byte, kForEver));
+    EXPECT_EQ(Transfer::Gone, port.receiveByte(byte, kForEver));
     EXPECT_EQ(0x11, byte);
     EXPECT_EQ(10, line.elapsedMs());
 }

@@ -12,7 +12,12 @@ using namespace std::chrono_literals;
 
 struct LineSendingTest : ::testing::Test {
     LineSendingTest() { std::iota(data.begin(), data.end(), std::uint8_t{0}); }
-    Transfer send() { return sendAll(line, data, sendingTime(data.size(), 1ms), 1ms); }
+    Line::TimePoint deadline() { return line.now() + sendingTime(data.size(), 1ms); }
+    Transfer send() { return sendAll(line, data, deadline()); }
+    Transfer sendAndDrain() {
+        const Transfer sent = send();
+        return sent == Transfer::Complete ? drain(line, deadline(), 1ms) : sent;
+    }
 
     FakeLine line;
     std::vector<std::uint8_t> data = std::vector<std::uint8_t>(100);
@@ -24,6 +29,22 @@ TEST_F(LineSendingTest, SendsTheWholeBuffer) {
     EXPECT_EQ(0, line.elapsedMs());
 }
 
+TEST_F(LineSendingTest, RoomIsAskedForOnlyAfterAShortWrite) {
+    EXPECT_EQ(Transfer::Complete, send());
+    EXPECT_EQ(0, line.waits());
+}
+
+TEST_F(LineSendingTest, OneByteAtATimeIsEnough) {
+    line.takeSlowly(1, 1);
+    EXPECT_EQ(Transfer::Complete, send());
+    EXPECT_EQ(data, line.sent());
+}
+
+TEST_F(LineSendingTest, LineThatCannotTellWhatIsUnsentHasSentIt) {
+    EXPECT_EQ(Transfer::Complete, drain(line, deadline(), 1ms));
+    EXPECT_EQ(0, line.elapsedMs());
+}
+
 TEST_F(LineSendingTest, ShortWritesAreContinued) {
     line.takeSlowly(7, 3);
     EXPECT_EQ(Transfer::Complete, send());
@@ -31,9 +52,9 @@ TEST_F(LineSendingTest, ShortWritesAreContinued) {
     EXPECT_FALSE(line.outputDiscarded());
 }
 
-TEST_F(LineSendingTest, ReturnsWhenTheLastByteIsOnTheWire) {
+TEST_F(LineSendingTest, DrainedWhenTheLastByteIsOnTheWire) {
     line.transmitSlowly(2);
-    EXPECT_EQ(Transfer::Complete, send());
+    EXPECT_EQ(Transfer::Complete, sendAndDrain());
     EXPECT_EQ(200, line.elapsedMs());
 }
 
@@ -46,7 +67,7 @@ TEST_F(LineSendingTest, DeadlineIsTheCharactersTimeAndAMargin) {
 
 TEST_F(LineSendingTest, QueueThatDoesNotDrainInTimeFailsAndIsThrownAway) {
     line.transmitSlowly(50);
-    EXPECT_EQ(Transfer::TimedOut, send());
+    EXPECT_EQ(Transfer::TimedOut, sendAndDrain());
     EXPECT_EQ(100 + 1000, line.elapsedMs());
     EXPECT_TRUE(line.outputDiscarded());
 }
