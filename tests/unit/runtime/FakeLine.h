@@ -42,6 +42,8 @@ class FakeLine final : public runtime::Line {
     const std::vector<std::uint8_t>& sent() const { return sent_; }
     bool outputDiscarded() const { return outputDiscarded_; }
     int waits() const { return waits_; }
+    /// What a line with a descriptor would ask its system for; the clock costs nothing.
+    int calls() const { return calls_; }
 
     TimePoint now() override { return now_; }
 
@@ -60,6 +62,7 @@ class FakeLine final : public runtime::Line {
 
     runtime::Moved read(std::span<std::uint8_t> buffer) override {
         EXPECT_FALSE(buffer.empty());
+        ++calls_;
         now_ += readCost_;
         if (isGone()) return {0, true};
         std::size_t count = 0;
@@ -72,6 +75,7 @@ class FakeLine final : public runtime::Line {
         return {count, false};
     }
     runtime::Moved write(std::span<const std::uint8_t> data) override {
+        ++calls_;
         if (isGone()) return {0, true};
         const std::size_t count = std::min(data.size(), writeLimit_);
         sent_.insert(sent_.end(), data.begin(), data.begin() + static_cast<std::ptrdiff_t>(count));
@@ -80,6 +84,7 @@ class FakeLine final : public runtime::Line {
         return {count, false};
     }
     std::size_t unsent() override {
+        ++calls_;
         if (emptyAt_ <= now_ || perByte_ == Ms{0}) return 0;
         return static_cast<std::size_t>((emptyAt_ - now_ + perByte_ - Ms{1}) / perByte_);
     }
@@ -122,6 +127,7 @@ class FakeLine final : public runtime::Line {
 
     void countWait() {
         ++waits_;
+        ++calls_;
         ASSERT_LT(waits_, 100'000) << "the caller spins";
     }
 
@@ -140,4 +146,5 @@ class FakeLine final : public runtime::Line {
     std::vector<std::uint8_t> sent_;
     bool outputDiscarded_ = false;
     int waits_ = 0;
+    int calls_ = 0;
 };
