@@ -1,29 +1,26 @@
 // What every sub-command of `mrtu` shares, and how sub-commands are added.
 //
-// A sub-command is one function `void addXyCommand(CLI::App& app, CommandContext& context)`. It
-// calls app.add_subcommand(), declares its options and sets a callback. The callback runs after
-// the whole command line was accepted; it prints results on context.out, complaints on
-// context.err, and either stores context.exitCode or throws CommandError.
+// A sub-command is one function `CommandSpec xyCommand(CommandContext& context)`, which names its
+// options and its action. The action runs after the whole command line was accepted; it prints
+// results on context.out, complaints on context.err, and either stores context.exitCode or throws
+// CommandError.
 #pragma once
 
 #include <iosfwd>
-#include <memory>
 #include <string>
 #include <vector>
 
 #include "cli/ExitCode.h"
 
-namespace CLI {
-class App;
-}  // namespace CLI
-
 namespace cli {
 
-/// Lives from before the command line is parsed until after the callback.
+struct CommandSpec;
+
+/// Lives from before the command line is parsed until after the action.
 struct CommandContext {
     std::ostream& out;
     std::ostream& err;
-    /// The callback's verdict.
+    /// The action's verdict.
     ExitCode exitCode = ExitCode::Done;
     /// What --plugin said; empty for the default places. Ask pluginFile() instead.
     std::string pluginOption;
@@ -32,7 +29,7 @@ struct CommandContext {
 };
 
 /// Declares `--plugin FILE` on a sub-command that loads the driver.
-void addPluginOption(CLI::App& command, CommandContext& context);
+void addPluginOption(CommandSpec& command, CommandContext& context);
 
 /// @return the plug-in to load: what --plugin named, else the first that exists of "libmrtu.so"
 /// beside the executable and "../lib/mrtu/libmrtu.so" relative to the executable's folder.
@@ -42,8 +39,9 @@ std::string pluginFile(const CommandContext& context);
 /// Prints "mrtu: " and the text as one line on context.err.
 void complain(CommandContext& context, const std::string& text);
 
-/// @return the parser of the whole command line. Its callbacks use `context`: it must outlive it.
-std::unique_ptr<CLI::App> makeCommandLine(CommandContext& context);
+/// @return what the whole command line may hold. Its actions use `context`, which must outlive
+/// them.
+CommandSpec commandLine(CommandContext& context);
 
 /// Runs a whole command line, also `--help` and `--version`. With `--json` among the words, `out`
 /// gets one JSON document in every case: what the command printed, or, when it ended before,

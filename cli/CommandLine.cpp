@@ -1,13 +1,12 @@
 // The whole command line: which sub-commands there are, and how a failure becomes an exit code.
 #include <fmt/format.h>
 
-#include <CLI/CLI.hpp>
 #include <algorithm>
-#include <memory>
 #include <ostream>
 #include <sstream>
 #include <string_view>
 
+#include "cli/CommandParser.h"
 #include "cli/Commands.h"
 #include "cli/UsageErrors.h"
 #include "cli/UsageText.h"
@@ -40,43 +39,22 @@ Exit codes:
   128 + n  ended by signal n: 130 Ctrl-C, 143 SIGTERM, 129 SIGHUP
 Of several failing URIs the first one's code counts.)";
 
-void addCommands(CLI::App& app, CommandContext& context) {
-    addReadCommand(app, context);
-    addWriteCommand(app, context);
-    addConsoleCommand(app, context);
-    addOverrideCommand(app, context);
-    addInfoCommand(app, context);
-    addDescribeCommand(app, context);
-    addCheckCommand(app, context);
-    addInspectCommand(app, context);
-    addSimCommand(app, context);
+/// @return the exit code of a command line that was taken.
+ExitCode act(const Accepted& line, const CommandContext& context) {
+    // CLI11's own demand comes before its complaint about a misspelt command.
+    if (line.path.size() == 1) throw CommandError(ExitCode::Usage, kNoCommand);
+    withUsageErrors([&] { line.path.back()->action(); });
+    return context.exitCode;
 }
 
-/// @return the exit code of a command line that was not accepted, or was a question only.
-ExitCode answerParser(const CLI::App& app, const CLI::ParseError& error, CommandContext& context) {
-    if (error.get_exit_code() != 0) {
-        complain(context, usageText(app, error));
-        return ExitCode::Usage;
+ExitCode actOrAnswer(const ParsedLine& line, CommandContext& context) {
+    if (const auto* const accepted = std::get_if<Accepted>(&line)) return act(*accepted, context);
+    if (const auto* const answered = std::get_if<Answered>(&line)) {
+        context.out << answered->text;
+        return ExitCode::Done;
     }
-    app.exit(error, context.out, context.err);
-    return ExitCode::Done;
-}
-
-ExitCode run(CLI::App& app, int argc, const char* const* argv, CommandContext& context) {
-    try {
-        withUsageErrors([&] { app.parse(argc, argv); });
-        // CLI11's own demand comes before its complaint about a misspelt command.
-        if (app.get_subcommands().empty()) throw CommandError(ExitCode::Usage, kNoCommand);
-        return context.exitCode;
-    } catch (const CLI::ParseError& error) {
-        return answerParser(app, error, context);
-    } catch (const CommandError& error) {
-        complain(context, error.what());
-        return error.code();
-    } catch (const std::exception& error) {
-        complain(context, error.what());
-        return ExitCode::Other;
-    }
+    complain(context, usageText(std::get<Refused>(line)));
+    return ExitCode::Usage;
 }
 
 }  // namespace
@@ -89,22 +67,31 @@ void complain(CommandContext& context, const std::string& text) {
     context.err.flush();
 }
 
-std::unique_ptr<CLI::App> makeCommandLine(CommandContext& context) {
-    auto app = std::make_unique<CLI::App>(
-        "Reads and writes tags of Modbus RTU and ASCII devices through a driver plug-in.", "mrtu");
-    app->set_version_flag("--version", "mrtu " MRTU_VERSION);
-    app->footer(kFooter);
-    // At most one, or the word "read" behind "console" would be a command of its own.
-    app->require_subcommand(0, 1);
-    addCommands(*app, context);
-    return app;
+CommandSpec commandLine(CommandContext& context) {
+    return {.name = "mrtu",
+            .summary =
+                "Reads and writes tags of Modbus RTU and ASCII devices through a driver plug-in.",
+            .footer = kFooter,
+            .version = "mrtu " MRTU_VERSION,
+            .commands = {readCommand(context), writeCommand(context), consoleCommand(context),
+                         overrideCommand(context), infoCommand(context), describeCommand(context),
+                         checkCommand(context), inspectCommand(context), simCommand(context)}};
 }
 
 namespace {
 
 ExitCode runCommand(int argc, const char* const* argv, CommandContext& context) {
-    const auto app = makeCommandLine(context);
-    return run(*app, argc, argv, context);
+    const CommandSpec program = commandLine(context);
+    try {
+        return actOrAnswer(parseCommandLine(program, {argv + std::min(argc, 1), argv + argc}),
+                           context);
+    } catch (const CommandError& error) {
+        complain(context, error.what());
+        return error.code();
+    } catch (const std::exception& error) {
+        complain(context, error.what());
+        return ExitCode::Other;
+    }
 }
 
 bool wantsJson(int argc, const char* const* argv) {

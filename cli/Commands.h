@@ -2,17 +2,18 @@
 #pragma once
 
 #include "cli/Command.h"
+#include "cli/CommandSpec.h"
 
 namespace cli {
 
-void addReadCommand(CLI::App& app, CommandContext& context);
-void addWriteCommand(CLI::App& app, CommandContext& context);
-void addSimCommand(CLI::App& app, CommandContext& context);
-void addInfoCommand(CLI::App& app, CommandContext& context);
-void addConsoleCommand(CLI::App& app, CommandContext& context);
-void addOverrideCommand(CLI::App& app, CommandContext& context);
-void addDescribeCommand(CLI::App& app, CommandContext& context);
-void addCheckCommand(CLI::App& app, CommandContext& context);
-void addInspectCommand(CLI::App& app, CommandContext& context);
+CommandSpec readCommand(CommandContext& context);
+CommandSpec writeCommand(CommandContext& context);
+CommandSpec simCommand(CommandContext& context);
+CommandSpec infoCommand(CommandContext& context);
+CommandSpec consoleCommand(CommandContext& context);
+CommandSpec overrideCommand(CommandContext& context);
+CommandSpec describeCommand(CommandContext& context);
+CommandSpec checkCommand(CommandContext& context);
+CommandSpec inspectCommand(CommandContext& context);
 
 }  // namespace cli

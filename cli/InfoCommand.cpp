@@ -1,7 +1,6 @@
 // The sub-command `mrtu info`.
 #include <fmt/format.h>
 
-#include <CLI/CLI.hpp>
 #include <array>
 #include <memory>
 #include <ostream>
@@ -76,16 +75,19 @@ void info(CommandContext& context, const InfoOptions& options) {
 
 }  // namespace
 
-void addInfoCommand(CLI::App& app, CommandContext& context) {
+CommandSpec infoCommand(CommandContext& context) {
     const auto options = std::make_shared<InfoOptions>();
-    CLI::App* const command = app.add_subcommand("info", "Tell what the driver says of itself");
-    command->add_option("--protocol", options->protocol, "Protocol of the plug-in")
-        ->type_name("NAME")
-        ->check(notEmpty())
-        ->capture_default_str();
-    addPluginOption(*command, context);
-    command->footer(kFooter);
-    command->callback([options, &context] { info(context, *options); });
+    CommandSpec command{
+        .name = "info", .summary = "Tell what the driver says of itself", .footer = kFooter};
+    command.options.push_back({.names = "--protocol",
+                               .target = &options->protocol,
+                               .help = "Protocol of the plug-in",
+                               .valueName = "NAME",
+                               .check = notEmpty(),
+                               .showsDefault = true});
+    addPluginOption(command, context);
+    command.action = [options, &context] { info(context, *options); };
+    return command;
 }
 
 }  // namespace cli

@@ -3,8 +3,6 @@
 
 #include <fmt/format.h>
 
-#include <CLI/CLI.hpp>
-
 #include "cli/UsageErrors.h"
 #include "cli/Validators.h"
 #include "cli/override/OverrideWords.h"
@@ -23,34 +21,117 @@ std::vector<std::string> baudRates() {
     return rates;
 }
 
+void addGroup(CommandSpec& command, const char* group, std::vector<OptionSpec> options) {
+    for (OptionSpec& option : options) {
+        option.group = group;
+        command.options.push_back(std::move(option));
+    }
+}
+
 constexpr long kLargestNode = 254;
 constexpr long kLongestTimeoutMs = 3600000;
 
-void addShortForms(CLI::App& command, LineOptions& options) {
-    struct Row {
-        const char* name;
-        std::string LineOptions::*member;
-        CLI::Validator accepts;
-        const char* help;
-    };
-    const Row rows[] = {
-        {"--baud", &LineOptions::baud, oneOf(baudRates()), "Same as --set baudrate=N"},
-        {"--parity", &LineOptions::parity, oneOf({"none", "even", "odd", "mark"}),
-         "Same as --set parity=none|even|odd|mark"},
-        {"--stopbits", &LineOptions::stopBits, oneOf({"1", "2"}), "Same as --set stopbits=1|2"},
-        {"--node", &LineOptions::node, numberUpTo(kLargestNode), "Same as --set defNodeId=N"},
-        {"--model", &LineOptions::model, oneOf({"1", "2", "3", "4"}),
-         "Same as --set model=1|2|3|4 (1-based, 0-based, Enron 1-based, Enron 0-based)"},
-        {"--timeout", &LineOptions::timeout, numberUpTo(kLongestTimeoutMs),
-         "Same as --set timeout=MS"},
-    };
-    for (const Row& row : rows) {
-        command.add_option(row.name, options.*row.member, row.help)
-            ->transform(row.accepts)
-            ->group("Configuration");
-    }
-    command.add_flag("--ascii", options.ascii, "Same as --set txMode=ASCII")
-        ->group("Configuration");
+void addShortForms(CommandSpec& command, LineOptions& options) {
+    addGroup(
+        command, "Configuration",
+        {
+            {.names = "--baud",
+             .target = &options.baud,
+             .help = "Same as --set baudrate=N",
+             .check = oneOf(baudRates())},
+            {.names = "--parity",
+             .target = &options.parity,
+             .help = "Same as --set parity=none|even|odd|mark",
+             .choices = {"none", "even", "odd", "mark"}},
+            {.names = "--stopbits",
+             .target = &options.stopBits,
+             .help = "Same as --set stopbits=1|2",
+             .choices = {"1", "2"}},
+            {.names = "--node",
+             .target = &options.node,
+             .help = "Same as --set defNodeId=N",
+             .check = numberUpTo(kLargestNode)},
+            {.names = "--model",
+             .target = &options.model,
+             .help = "Same as --set model=1|2|3|4 (1-based, 0-based, Enron 1-based, Enron 0-based)",
+             .choices = {"1", "2", "3", "4"}},
+            {.names = "--timeout",
+             .target = &options.timeout,
+             .help = "Same as --set timeout=MS",
+             .check = numberUpTo(kLongestTimeoutMs)},
+            {.names = "--ascii", .target = &options.ascii, .help = "Same as --set txMode=ASCII"},
+        });
+}
+
+void addPortOptions(CommandSpec& command, LineOptions& options) {
+    addGroup(
+        command, "Line",
+        {
+            {.names = "--port",
+             .target = &options.ports,
+             .help = "Device of a port, com1=/dev/ttyUSB0; a device alone serves the "
+                     "configuration's port. Can be repeated",
+             .valueName = "[NAME=]DEVICE",
+             .oneWordEach = true},
+            {.names = "--sim",
+             .target = &options.sim,
+             .help = "Talk to a simulated line instead of a port",
+             .excludes = {"--port"}},
+            {.names = "--trace",
+             .target = &options.trace,
+             .help = "Show every frame on standard error, ASCII ones as characters"},
+            {.names = "--trace-hex",
+             .target = &options.traceHex,
+             .help = "--trace with ASCII frames as bytes, too"},
+            {.names = "--trace-meaning",
+             .target = &options.traceMeaning,
+             .help = "--trace with what each frame means, e.g. 'read 1 holding register at 9'"},
+            {.names = "--min-gap",
+             .target = &options.minGapMs,
+             .help =
+                 "Shortest silence in ms that ends a reply, for USB adapters that pause, e.g. 20",
+             .valueName = "MS",
+             .range = NumberRange{0, 1000}},
+        });
+}
+
+void addConfigOptions(CommandSpec& command, LineOptions& options) {
+    addGroup(command, "Configuration",
+             {
+                 {.names = "--config",
+                  .target = &options.configFile,
+                  .help = "Configuration text of the driver",
+                  .valueName = "FILE",
+                  .check = notEmpty()},
+                 {.names = "--set",
+                  .target = &options.settings,
+                  .help = "Add an item to the configuration or replace one, e.g. timeout=500 or "
+                          "Node5::model=2. Can be repeated",
+                  .valueName = "KEY=VALUE",
+                  .oneWordEach = true},
+             });
+}
+
+void addDriverOptions(CommandSpec& command, LineOptions& options) {
+    addGroup(command, "Driver",
+             {
+                 {.names = "--storage",
+                  .target = &options.storage,
+                  .help = "Where overrides are kept, or 'none'. With --sim the default is 'none'",
+                  .valueName = "FILE",
+                  .check = notEmpty()},
+                 {.names = "--ident",
+                  .target = &options.ident,
+                  .help = "Whose overrides: the section of the storage",
+                  .valueName = "NAME",
+                  .check = notEmpty()},
+                 {.names = "--protocol",
+                  .target = &options.protocol,
+                  .help = "Protocol of the plug-in",
+                  .valueName = "NAME",
+                  .check = notEmpty(),
+                  .showsDefault = true},
+             });
 }
 
 std::vector<ConfigItem> itemsOf(const LineOptions& options) {
@@ -76,61 +157,11 @@ bool namesPort(const std::string& text) {
 
 }  // namespace
 
-void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& context) {
-    command
-        .add_option("--port", options.ports,
-                    "Device of a port, com1=/dev/ttyUSB0; a device alone serves the "
-                    "configuration's port. Can be repeated")
-        ->type_name("[NAME=]DEVICE")
-        ->allow_extra_args(false)
-        ->group("Line");
-    command.add_flag("--sim", options.sim, "Talk to a simulated line instead of a port")
-        ->excludes("--port")
-        ->group("Line");
-    command
-        .add_flag("--trace", options.trace,
-                  "Show every frame on standard error, ASCII ones as characters")
-        ->group("Line");
-    command.add_flag("--trace-hex", options.traceHex, "--trace with ASCII frames as bytes, too")
-        ->group("Line");
-    command
-        .add_flag("--trace-meaning", options.traceMeaning,
-                  "--trace with what each frame means, e.g. 'read 1 holding register at 9'")
-        ->group("Line");
-    command
-        .add_option(
-            "--min-gap", options.minGapMs,
-            "Shortest silence in ms that ends a reply, for USB adapters that pause, e.g. 20")
-        ->type_name("MS")
-        ->check(CLI::Range(0, 1000))
-        ->group("Line");
-    command.add_option("--config", options.configFile, "Configuration text of the driver")
-        ->type_name("FILE")
-        ->check(notEmpty())
-        ->group("Configuration");
-    command
-        .add_option("--set", options.settings,
-                    "Add an item to the configuration or replace one, e.g. timeout=500 or "
-                    "Node5::model=2. Can be repeated")
-        ->type_name("KEY=VALUE")
-        ->allow_extra_args(false)
-        ->group("Configuration");
+void addLineOptions(CommandSpec& command, LineOptions& options, CommandContext& context) {
+    addPortOptions(command, options);
+    addConfigOptions(command, options);
     addShortForms(command, options);
-    command
-        .add_option("--storage", options.storage,
-                    "Where overrides are kept, or 'none'. With --sim the default is 'none'")
-        ->type_name("FILE")
-        ->check(notEmpty())
-        ->group("Driver");
-    command.add_option("--ident", options.ident, "Whose overrides: the section of the storage")
-        ->type_name("NAME")
-        ->check(notEmpty())
-        ->group("Driver");
-    command.add_option("--protocol", options.protocol, "Protocol of the plug-in")
-        ->type_name("NAME")
-        ->check(notEmpty())
-        ->capture_default_str()
-        ->group("Driver");
+    addDriverOptions(command, options);
     addPluginOption(command, context);
 }
 

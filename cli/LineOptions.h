@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "cli/Command.h"
+#include "cli/CommandSpec.h"
 
 namespace cli {
 
@@ -31,8 +32,8 @@ struct PortMapping {
 };
 
 /// Declares the options, `--plugin` included.
-/// @param options  Must live until the callback has run.
-void addLineOptions(CLI::App& command, LineOptions& options, CommandContext& context);
+/// @param options  Must live until the action has run.
+void addLineOptions(CommandSpec& command, LineOptions& options, CommandContext& context);
 
 /// @return the configuration text: the file's or the default one, with the options in front.
 /// Errors: CommandError (Usage) when the file can't be read or an option is malformed.

@@ -1,11 +1,11 @@
 // Where the plug-in is looked for when the command line does not say.
 #include <fmt/format.h>
 
-#include <CLI/CLI.hpp>
 #include <filesystem>
 #include <system_error>
 
 #include "cli/Command.h"
+#include "cli/CommandSpec.h"
 #include "cli/Validators.h"
 
 namespace cli {
@@ -20,13 +20,14 @@ std::filesystem::path executableFolder() {
 
 }  // namespace
 
-void addPluginOption(CLI::App& command, CommandContext& context) {
-    command
-        .add_option("--plugin", context.pluginOption,
-                    "The driver; default is libmrtu.so beside mrtu or in ../lib/mrtu")
-        ->type_name("FILE")
-        ->check(notEmpty())
-        ->group("Driver");
+void addPluginOption(CommandSpec& command, CommandContext& context) {
+    command.options.push_back(
+        {.names = "--plugin",
+         .target = &context.pluginOption,
+         .help = "The driver; default is libmrtu.so beside mrtu or in ../lib/mrtu",
+         .valueName = "FILE",
+         .group = "Driver",
+         .check = notEmpty()});
 }
 
 std::string pluginFile(const CommandContext& context) {

@@ -1,5 +1,4 @@
 // The sub-command `mrtu read`.
-#include <CLI/CLI.hpp>
 #include <algorithm>
 #include <memory>
 
@@ -74,14 +73,17 @@ void read(CommandContext& context, const ReadOptions& options) {
 
 }  // namespace
 
-void addReadCommand(CLI::App& app, CommandContext& context) {
+CommandSpec readCommand(CommandContext& context) {
     const auto options = std::make_shared<ReadOptions>();
-    CLI::App* const command = app.add_subcommand("read", "Read tags and print their values");
-    addLineOptions(*command, options->line, context);
-    command->add_flag("--json", options->json, "Print one JSON array");
-    command->add_option("URI", options->uris, "Tags to read")->required();
-    command->footer(kFooter);
-    command->callback([options, &context] { read(context, *options); });
+    CommandSpec command{
+        .name = "read", .summary = "Read tags and print their values", .footer = kFooter};
+    addLineOptions(command, options->line, context);
+    command.options.push_back(
+        {.names = "--json", .target = &options->json, .help = "Print one JSON array"});
+    command.options.push_back(
+        {.names = "URI", .target = &options->uris, .help = "Tags to read", .required = true});
+    command.action = [options, &context] { read(context, *options); };
+    return command;
 }
 
 }  // namespace cli

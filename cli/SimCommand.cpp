@@ -2,7 +2,6 @@
 #include <fmt/format.h>
 #include <signal.h>
 
-#include <CLI/CLI.hpp>
 #include <array>
 #include <atomic>
 #include <iterator>
@@ -132,24 +131,34 @@ void serve(CommandContext& context, const SimOptions& options) {
 
 }  // namespace
 
-void addSimCommand(CLI::App& app, CommandContext& context) {
+CommandSpec simCommand(CommandContext& context) {
     const auto options = std::make_shared<SimOptions>();
-    CLI::App* const command = app.add_subcommand("sim", "Serve a simulated line");
-    command->add_flag("--ascii", options->ascii, "ASCII frames instead of RTU");
-    command->add_option("--node", options->nodes, "A node of the line; default is 1 to 10")
-        ->type_name("N")
-        ->check(CLI::Range(1, 247))
-        ->allow_extra_args(false);
-    command->add_flag("--plain", options->plain, "Nodes without 32-bit registers");
-    command->add_option("--link", options->link, "Symbolic link to the device")
-        ->type_name("PATH")
-        ->check(notEmpty());
-    command->add_option("--fault", options->faults, "What goes wrong with the next answers")
-        ->type_name("TEXT")
-        ->allow_extra_args(false);
-    command->add_flag("--trace", options->trace, "Show every frame on standard error");
-    command->footer(kFooter);
-    command->callback([options, &context] { serve(context, *options); });
+    CommandSpec command{.name = "sim", .summary = "Serve a simulated line", .footer = kFooter};
+    command.options = {
+        {.names = "--ascii", .target = &options->ascii, .help = "ASCII frames instead of RTU"},
+        {.names = "--node",
+         .target = &options->nodes,
+         .help = "A node of the line; default is 1 to 10",
+         .valueName = "N",
+         .range = NumberRange{1, 247},
+         .oneWordEach = true},
+        {.names = "--plain", .target = &options->plain, .help = "Nodes without 32-bit registers"},
+        {.names = "--link",
+         .target = &options->link,
+         .help = "Symbolic link to the device",
+         .valueName = "PATH",
+         .check = notEmpty()},
+        {.names = "--fault",
+         .target = &options->faults,
+         .help = "What goes wrong with the next answers",
+         .valueName = "TEXT",
+         .oneWordEach = true},
+        {.names = "--trace",
+         .target = &options->trace,
+         .help = "Show every frame on standard error"},
+    };
+    command.action = [options, &context] { serve(context, *options); };
+    return command;
 }
 
 }  // namespace cli

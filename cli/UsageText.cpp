@@ -4,70 +4,57 @@
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 
-#include <CLI/CLI.hpp>
-
 #include "cli/Choices.h"
 
 namespace cli {
 namespace {
 
-/// @return the command whose words hold one that nobody took, else the innermost one.
-const CLI::App& commandAtFault(const CLI::App& app) {
-    const CLI::App* command = &app;
-    while (command->remaining().empty() && !command->get_subcommands().empty())
-        command = command->get_subcommands().front();
-    return *command;
-}
-
-std::vector<std::string> optionNames(const CLI::App& command) {
+std::vector<std::string> optionNames(const CommandSpec& command) {
     std::vector<std::string> names;
-    for (const CLI::Option* const option : command.get_options()) {
-        for (const std::string& name : option->get_lnames())
-            names.push_back("--" + name);
-    }
+    for (const OptionSpec& option : command.allOptions())
+        for (const std::string& name : option.nameList())
+            if (name.starts_with("--")) names.push_back(name);
     return names;
 }
 
-std::vector<std::string> commandNames(const CLI::App& command) {
+std::vector<std::string> commandNames(const CommandSpec& command) {
     std::vector<std::string> names;
-    for (const CLI::App* const each : command.get_subcommands({}))
-        names.push_back(each->get_name());
+    for (const CommandSpec& each : command.commands)
+        names.push_back(each.name);
     return names;
 }
 
-std::string unknownWord(const CLI::App& command) {
-    const std::string word = command.remaining().front();
+std::string unknownWord(const std::string& word, const Refused& line) {
+    const CommandSpec& command = *line.path.back();
     if (word.starts_with('-')) {
         const std::string name = word.substr(0, word.find('='));
         const std::string meant = didYouMean(name, optionNames(command));
         return fmt::format("unknown option '{}'{}", name,
-                           meant.empty() ? "; " + helpHint(command) : meant);
+                           meant.empty() ? "; " + helpHint(line.path) : meant);
     }
     const std::vector<std::string> names = commandNames(command);
-    if (names.empty() || !command.get_subcommands().empty())
-        return fmt::format("'{}' was not expected; {}", word, helpHint(command));
+    if (names.empty() || line.commandNamed)
+        return fmt::format("'{}' was not expected; {}", word, helpHint(line.path));
     return fmt::format("unknown command: {}", notOneOf(word, names));
 }
 
 }  // namespace
 
-std::string helpHint(const CLI::App& command) {
-    std::string words = command.get_name();
-    for (const CLI::App* each = command.get_parent(); each != nullptr; each = each->get_parent())
-        words = each->get_name() + ' ' + words;
-    return fmt::format("'{} --help' tells more", words);
+std::string helpHint(const CommandPath& path) {
+    std::vector<std::string> words;
+    for (const CommandSpec* each : path)
+        words.push_back(each->name);
+    return fmt::format("'{} --help' tells more", fmt::join(words, " "));
 }
 
-std::string usageText(const CLI::App& app, const CLI::ParseError& error) {
-    const CLI::App& command = commandAtFault(app);
+std::string usageText(const Refused& line) {
     // A misspelt word explains more than what is missing in its place.
-    if (!command.remaining().empty()) return unknownWord(command);
-    const std::vector<std::string> names = commandNames(command);
-    const bool noneChosen = command.get_subcommands().empty();
-    std::string text = noneChosen && !names.empty()
+    if (line.strayWord) return unknownWord(*line.strayWord, line);
+    const std::vector<std::string> names = commandNames(*line.path.back());
+    std::string text = !line.commandNamed && !names.empty()
                            ? fmt::format("one of {} must follow", fmt::join(names, ", "))
-                           : error.what();
-    if (!text.ends_with('?')) text += "; " + helpHint(command);
+                           : line.reason;
+    if (!text.ends_with('?')) text += "; " + helpHint(line.path);
     return text;
 }
 

@@ -3,19 +3,15 @@
 
 #include <string>
 
-namespace CLI {
-class App;
-class ParseError;
-}  // namespace CLI
+#include "cli/CommandParser.h"
 
 namespace cli {
 
-/// @param app  The program, after app.parse() threw `error`.
 /// @return one line: the word that is unknown and the nearest known one, or what is missing, and
 /// where to read on.
-std::string usageText(const CLI::App& app, const CLI::ParseError& error);
+std::string usageText(const Refused& line);
 
-/// @return "'mrtu override set --help' tells more".
-std::string helpHint(const CLI::App& command);
+/// @return "'mrtu override set --help' tells more". REQUIRES: `path` is not empty.
+std::string helpHint(const CommandPath& path);
 
 }  // namespace cli

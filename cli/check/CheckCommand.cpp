@@ -1,7 +1,6 @@
 // The sub-command `mrtu check`.
 #include <fmt/format.h>
 
-#include <CLI/CLI.hpp>
 #include <memory>
 #include <ostream>
 
@@ -126,30 +125,39 @@ Exit codes: 0 no errors, 1 warnings with --strict, 2 errors.)";
 
 }  // namespace
 
-void addCheckCommand(CLI::App& app, CommandContext& context) {
-    auto options = std::make_shared<Options>();
-    CLI::App* command =
-        app.add_subcommand("check", "Check a configuration and tags without touching a port");
-    command->add_option("--config", options->configFile, "The configuration's file")
-        ->type_name("FILE")
-        ->required();
-    CLI::Option* uris = command->add_option("uri", options->uris, "Tags to check");
-    command->add_option("--tags", options->tagsFile, "A file with one tag URI a line")
-        ->type_name("FILE")
-        ->excludes(uris);
-    command->add_flag("--json", options->json, "Print JSON");
-    command->add_flag("--strict", options->strict, "Warnings make the exit code 1");
-    command->add_option("--protocol", options->protocol, "The protocol's name in the plug-in")
-        ->type_name("NAME")
-        ->capture_default_str()
-        ->group("Driver");
-    addPluginOption(*command, context);
-    command->footer(kFooter);
-    command->callback([options, &context] {
+CommandSpec checkCommand(CommandContext& context) {
+    const auto options = std::make_shared<Options>();
+    CommandSpec command{.name = "check",
+                        .summary = "Check a configuration and tags without touching a port",
+                        .footer = kFooter};
+    command.options = {
+        {.names = "--config",
+         .target = &options->configFile,
+         .help = "The configuration's file",
+         .valueName = "FILE",
+         .required = true},
+        {.names = "uri", .target = &options->uris, .help = "Tags to check"},
+        {.names = "--tags",
+         .target = &options->tagsFile,
+         .help = "A file with one tag URI a line",
+         .valueName = "FILE",
+         .excludes = {"uri"}},
+        {.names = "--json", .target = &options->json, .help = "Print JSON"},
+        {.names = "--strict", .target = &options->strict, .help = "Warnings make the exit code 1"},
+        {.names = "--protocol",
+         .target = &options->protocol,
+         .help = "The protocol's name in the plug-in",
+         .valueName = "NAME",
+         .group = "Driver",
+         .showsDefault = true},
+    };
+    addPluginOption(command, context);
+    command.action = [options, &context] {
         const Report report = check(*options, pluginFile(context));
         print(report, options->json, context.out);
         context.exitCode = verdictOf(report.findings, options->strict);
-    });
+    };
+    return command;
 }
 
 }  // namespace cli

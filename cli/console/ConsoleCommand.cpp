@@ -2,7 +2,6 @@
 #include <fmt/format.h>
 #include <unistd.h>
 
-#include <CLI/CLI.hpp>
 #include <memory>
 #include <ostream>
 #include <sstream>
@@ -141,13 +140,15 @@ void console(CommandContext& context, const ConsoleOptions& options) {
 
 }  // namespace
 
-void addConsoleCommand(CLI::App& app, CommandContext& context) {
+CommandSpec consoleCommand(CommandContext& context) {
     const auto options = std::make_shared<ConsoleOptions>();
-    CLI::App* const command = app.add_subcommand("console", "Talk to the driver's text console");
-    addLineOptions(*command, options->line, context);
-    command->add_option("COMMAND", options->words, "A console command and its words");
-    command->footer(kFooter);
-    command->callback([options, &context] { console(context, *options); });
+    CommandSpec command{
+        .name = "console", .summary = "Talk to the driver's text console", .footer = kFooter};
+    addLineOptions(command, options->line, context);
+    command.options.push_back(
+        {.names = "COMMAND", .target = &options->words, .help = "A console command and its words"});
+    command.action = [options, &context] { console(context, *options); };
+    return command;
 }
 
 }  // namespace cli

@@ -1,5 +1,4 @@
 // The sub-command `mrtu describe`.
-#include <CLI/CLI.hpp>
 #include <array>
 #include <memory>
 #include <ostream>
@@ -62,25 +61,32 @@ void describe(const Options& options, const CommandContext& context) {
 
 }  // namespace
 
-void addDescribeCommand(CLI::App& app, CommandContext& context) {
-    auto options = std::make_shared<Options>();
-    CLI::App* command = app.add_subcommand(
-        "describe", "Show what a configuration may say and what the models offer");
-    CLI::Option* section =
-        command->add_option("section", options->section, "Only this part of the description")
-            ->transform(oneOf({"models", "memory", "parameters", "conversions"}));
-    CLI::Option* json = command->add_flag("--json", options->json, "Print JSON");
-    command->add_flag("--xml", options->xml, "Print the document itself, byte for byte")
-        ->excludes(json)
-        ->excludes(section);
-    command->add_option("--protocol", options->protocol, "The protocol's name in the plug-in")
-        ->type_name("NAME")
-        ->check(notEmpty())
-        ->capture_default_str()
-        ->group("Driver");
-    addPluginOption(*command, context);
-    command->footer(kFooter);
-    command->callback([options, &context] { describe(*options, context); });
+CommandSpec describeCommand(CommandContext& context) {
+    const auto options = std::make_shared<Options>();
+    CommandSpec command{.name = "describe",
+                        .summary = "Show what a configuration may say and what the models offer",
+                        .footer = kFooter};
+    command.options = {
+        {.names = "section",
+         .target = &options->section,
+         .help = "Only this part of the description",
+         .check = oneOf({"models", "memory", "parameters", "conversions"})},
+        {.names = "--json", .target = &options->json, .help = "Print JSON"},
+        {.names = "--xml",
+         .target = &options->xml,
+         .help = "Print the document itself, byte for byte",
+         .excludes = {"--json", "section"}},
+        {.names = "--protocol",
+         .target = &options->protocol,
+         .help = "The protocol's name in the plug-in",
+         .valueName = "NAME",
+         .group = "Driver",
+         .check = notEmpty(),
+         .showsDefault = true},
+    };
+    addPluginOption(command, context);
+    command.action = [options, &context] { describe(*options, context); };
+    return command;
 }
 
 }  // namespace cli

@@ -2,7 +2,6 @@
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 
-#include <CLI/CLI.hpp>
 #include <filesystem>
 #include <memory>
 #include <optional>
@@ -167,19 +166,28 @@ void run(CommandContext& context, const InspectOptions& options) {
 
 }  // namespace
 
-void addInspectCommand(CLI::App& app, CommandContext& context) {
+CommandSpec inspectCommand(CommandContext& context) {
     const auto options = std::make_shared<InspectOptions>();
-    CLI::App* const command =
-        app.add_subcommand("inspect", "Tell what a plug-in file is and what it needs");
-    command->add_option("FILE", options->file, "The plug-in, of any architecture")->required();
-    command->add_flag("--json", options->json, "Print JSON");
-    command->add_flag("--load", options->load,
-                      "Run the file's start-up code and ask it for its names");
-    command->add_option("--protocol", options->protocol, "Protocol of the plug-in")
-        ->type_name("NAME")
-        ->capture_default_str();
-    command->footer(kFooter);
-    command->callback([options, &context] { run(context, *options); });
+    CommandSpec command{.name = "inspect",
+                        .summary = "Tell what a plug-in file is and what it needs",
+                        .footer = kFooter};
+    command.options = {
+        {.names = "FILE",
+         .target = &options->file,
+         .help = "The plug-in, of any architecture",
+         .required = true},
+        {.names = "--json", .target = &options->json, .help = "Print JSON"},
+        {.names = "--load",
+         .target = &options->load,
+         .help = "Run the file's start-up code and ask it for its names"},
+        {.names = "--protocol",
+         .target = &options->protocol,
+         .help = "Protocol of the plug-in",
+         .valueName = "NAME",
+         .showsDefault = true},
+    };
+    command.action = [options, &context] { run(context, *options); };
+    return command;
 }
 
 }  // namespace cli

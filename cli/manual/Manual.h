@@ -5,9 +5,7 @@
 #include <string>
 #include <vector>
 
-namespace CLI {
-class App;
-}
+#include "cli/CommandSpec.h"
 
 namespace cli::manual {
 
@@ -45,8 +43,8 @@ struct Command {
     std::string path() const;
 };
 
-/// What the program's command line accepts. Options and commands that --help hides are left out.
-Command describe(const CLI::App& program);
+/// What the program's command line accepts.
+Command describe(const CommandSpec& program);
 
 /// The commands from `top` down, each in front of its own commands.
 std::vector<const Command*> withSubcommands(const Command& top);

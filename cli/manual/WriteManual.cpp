@@ -1,7 +1,6 @@
 // Writes the man pages and the completions of the command; a step of the build, not installed.
 //
 //     mrtu_manual FOLDER     man1/*.1, completions/mrtu.bash, _mrtu, mrtu.fish
-#include <CLI/CLI.hpp>
 #include <filesystem>
 #include <fstream>
 #include <iostream>
@@ -22,8 +21,7 @@ void write(const std::filesystem::path& file, const std::string& text) {
 void writeAll(const std::filesystem::path& folder) {
     cli::CommandContext context{
         .out = std::cout, .err = std::cerr, .exitCode = cli::ExitCode::Done, .pluginOption = {}};
-    const auto app = cli::makeCommandLine(context);
-    const cli::manual::Command program = cli::manual::describe(*app);
+    const cli::manual::Command program = cli::manual::describe(cli::commandLine(context));
 
     const auto writePage = [&](const cli::manual::Command& command) {
         write(folder / "man1" / (command.joined("-") + ".1"),

@@ -1,7 +1,6 @@
 // The sub-command `mrtu override`.
 #include <fmt/format.h>
 
-#include <CLI/CLI.hpp>
 #include <memory>
 #include <ostream>
 
@@ -116,27 +115,29 @@ void clear(CommandContext& context, const OverrideOptions& options) {
 
 using Action = void (*)(CommandContext&, const OverrideOptions&);
 
-CLI::App* addAction(CLI::App& parent, CommandContext& context, const char* name, const char* help,
-                    Action action, const char* words) {
+CommandSpec actionCommand(CommandContext& context, const char* name, const char* summary,
+                          Action action, const char* words) {
     const auto options = std::make_shared<OverrideOptions>();
-    CLI::App* const command = parent.add_subcommand(name, help);
-    addLineOptions(*command, options->line, context);
-    if (words != nullptr) command->add_option(words, options->words, "See below")->required();
-    command->footer(kFooter);
-    command->callback([options, &context, action] { action(context, *options); });
+    CommandSpec command{.name = name, .summary = summary};
+    addLineOptions(command, options->line, context);
+    if (words != nullptr)
+        command.options.push_back(
+            {.names = words, .target = &options->words, .help = "See below", .required = true});
+    command.action = [options, &context, action] { action(context, *options); };
     return command;
 }
 
 }  // namespace
 
-void addOverrideCommand(CLI::App& app, CommandContext& context) {
-    CLI::App* const command =
-        app.add_subcommand("override", "Look at and change what replaces the configuration");
-    command->require_subcommand(1);
-    command->footer(kFooter);
-    addAction(*command, context, "list", "Print the values in force", list, nullptr);
-    addAction(*command, context, "set", "Replace values", set, "WORDS");
-    addAction(*command, context, "clear", "Go back to the configuration", clear, "WORDS");
+CommandSpec overrideCommand(CommandContext& context) {
+    return {.name = "override",
+            .summary = "Look at and change what replaces the configuration",
+            .footer = kFooter,
+            .commands = {actionCommand(context, "list", "Print the values in force", list, nullptr),
+                         actionCommand(context, "set", "Replace values", set, "WORDS"),
+                         actionCommand(context, "clear", "Go back to the configuration", clear,
+                                       "WORDS")},
+            .needsCommand = true};
 }
 
 }  // namespace cli

@@ -1,7 +1,6 @@
 // The sub-command `mrtu write`.
 #include <fmt/format.h>
 
-#include <CLI/CLI.hpp>
 #include <memory>
 
 #include "cli/Commands.h"
@@ -145,15 +144,21 @@ void write(CommandContext& context, const WriteOptions& options) {
 
 }  // namespace
 
-void addWriteCommand(CLI::App& app, CommandContext& context) {
+CommandSpec writeCommand(CommandContext& context) {
     const auto options = std::make_shared<WriteOptions>();
-    CLI::App* const command = app.add_subcommand("write", "Write values into tags");
-    addLineOptions(*command, options->line, context);
-    command->add_flag("--json", options->json, "Print one JSON array");
-    command->add_flag("--verify", options->verify, "Read back what was written and compare");
-    command->add_option("URI=VALUE", options->assignments, "Tags and their values")->required();
-    command->footer(kFooter);
-    command->callback([options, &context] { write(context, *options); });
+    CommandSpec command{.name = "write", .summary = "Write values into tags", .footer = kFooter};
+    addLineOptions(command, options->line, context);
+    command.options.push_back(
+        {.names = "--json", .target = &options->json, .help = "Print one JSON array"});
+    command.options.push_back({.names = "--verify",
+                               .target = &options->verify,
+                               .help = "Read back what was written and compare"});
+    command.options.push_back({.names = "URI=VALUE",
+                               .target = &options->assignments,
+                               .help = "Tags and their values",
+                               .required = true});
+    command.action = [options, &context] { write(context, *options); };
+    return command;
 }
 
 }  // namespace cli

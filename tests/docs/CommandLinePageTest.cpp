@@ -1,7 +1,6 @@
 // docs/command-line.md against what `--help` knows of commands and options.
 #include <gtest/gtest.h>
 
-#include <CLI/CLI.hpp>
 #include <iostream>
 #include <map>
 #include <regex>
@@ -24,8 +23,7 @@ using Options = std::map<std::string, Names>;
 const cli::manual::Command& program() {
     static cli::CommandContext context{
         .out = std::cout, .err = std::cerr, .exitCode = cli::ExitCode::Done, .pluginOption = {}};
-    static const cli::manual::Command declared =
-        cli::manual::describe(*cli::makeCommandLine(context));
+    static const cli::manual::Command declared = cli::manual::describe(cli::commandLine(context));
     return declared;
 }
 

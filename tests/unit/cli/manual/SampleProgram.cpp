@@ -1,32 +1,54 @@
 #include "SampleProgram.h"
 
-#include <CLI/CLI.hpp>
 #include <string>
 #include <vector>
 
 namespace manual_test {
+namespace {
+
+cli::CommandSpec fetchCommand(bool& flag, std::string& text, std::vector<std::string>& texts) {
+    return {
+        .name = "fetch",
+        .summary = "Fetch it's [all]",
+        .footer = "Reads on.\n\nExamples:\n  tool fetch '1?A.-2' \\\n  .dotted",
+        .options = {
+            {.names = "-q,--quiet", .target = &flag, .help = "Say nothing"},
+            {.names = "--colour", .target = &text, .help = "Which one", .choices = {"red", "blue"}},
+            {.names = "--parity",
+             .target = &text,
+             .help = "Same as --set parity=none|even|odd",
+             .group = "Line",
+             .choices = {"none", "even", "odd"}},
+            {.names = "--file",
+             .target = &text,
+             .help = "Where: a path",
+             .valueName = "FILE",
+             .group = "Line"},
+            {.names = "URI", .target = &texts, .help = "What to fetch", .required = true}}};
+}
+
+cli::CommandSpec storeCommand(std::string& text) {
+    return {.name = "store",
+            .summary = "Look at what is kept",
+            .commands = {
+                {.name = "set",
+                 .summary = "Keep",
+                 .options =
+                     {{.names = "--file", .target = &text, .help = "Where", .valueName = "FILE"}}},
+                {.name = "list", .summary = "List"}}};
+}
+
+}  // namespace
 
 cli::manual::Command sampleProgram() {
     std::string text;
     std::vector<std::string> texts;
     bool flag = false;
-    CLI::App app("Does things. And more.", "tool");
-    app.footer("Exit codes:\n  0  done\n  2  wrong");
-
-    CLI::App* const fetch = app.add_subcommand("fetch", "Fetch it's [all]");
-    fetch->add_flag("-q,--quiet", flag, "Say nothing");
-    fetch->add_option("--colour", text, "Which one")->check(CLI::IsMember({"red", "blue"}));
-    fetch->add_option("--parity", text, "Same as --set parity=none|even|odd")->group("Line");
-    fetch->add_option("--file", text, "Where: a path")->type_name("FILE")->group("Line");
-    fetch->add_option("--hidden", text, "Nobody's business")->group("");
-    fetch->add_option("URI", texts, "What to fetch")->required();
-    fetch->footer("Reads on.\n\nExamples:\n  tool fetch '1?A.-2' \\\n  .dotted");
-
-    CLI::App* const store = app.add_subcommand("store", "Look at what is kept");
-    store->add_subcommand("set", "Keep")->add_option("--file", text, "Where")->type_name("FILE");
-    store->add_subcommand("list", "List");
-    app.add_subcommand("secret", "Hidden")->group("");
-    return cli::manual::describe(app);
+    return cli::manual::describe(
+        {.name = "tool",
+         .summary = "Does things. And more.",
+         .footer = "Exit codes:\n  0  done\n  2  wrong",
+         .commands = {fetchCommand(flag, text, texts), storeCommand(text)}});
 }
 
 const cli::manual::Command& commandOf(const cli::manual::Command& program,
