@@ -53,8 +53,7 @@ struct OptionSpec {
 struct CommandSpec {
     std::string name;
     std::string summary;
-    std::string
-        footer{};  ///< Stands under the options in --help; empty: that of the command above.
+    std::string footer{};   ///< The text under the options; empty: that of the command above.
     std::string version{};  ///< What --version prints; empty: no such option.
     std::vector<OptionSpec> options{};
     std::vector<CommandSpec> commands{};  ///< At most one of them can be named.
