@@ -7,79 +7,36 @@
 
 #include <array>
 #include <memory>
-#include <stdexcept>
-#include <string>
-#include <vector>
 
-#include "mrtu/Protocol_MRTU.h"
+#include "bench/StartedDriver.h"
 #include "mrtu/Tag_MRTU.h"
-#include "plugin/ProtModule.h"
 #include "runtime/PosixSerialFactory.h"
 #include "sim/Simulator.h"
-#include "tests/support/FakeHost.h"
 #include "tests/support/FixedReplyPort.h"
 #include "tests/support/Replies.h"
 
 namespace {
 
 using testing_support::Bytes;
-using testing_support::FakeHost;
 using testing_support::FixedReplyPort;
 
 constexpr int kRegisters = 125;
 
-/// Hands out one port for ever.
-class OnePort final : public ISerialFactory {
+/// Reads the registers without the engine above.
+class Reader {
   public:
-    explicit OnePort(ISerialPort& port) : port_(port) {}
-    void* ConvertTo(const char* name) override {
-        return CompareInterface(name, "ISerialFactory") ? static_cast<ISerialFactory*>(this)
-                                                        : nullptr;
-    }
-    const char* GetImpName() const override { return "OnePort"; }
-    int GetImpVersion() const override { return 1; }
-    ISerialPort* openPort(const char*) override { return &port_; }
-    void releasePort(ISerialPort*) override {}
-
-  private:
-    ISerialPort& port_;
-};
-
-std::string configuration(bool ascii) {
-    return std::string(
-               "CfgVer=1 defNodeId=1 uart=com1 baudrate=115200 parity=none bits=8 "
-               "stopbits=1 mode=RS-232 txMode=") +
-           (ascii ? "ASCII" : "RTU");
-}
-
-/// The driver, started on the serial ports that `serial` offers.
-class Driver {
-  public:
-    Driver(ISerialFactory& serial, bool ascii) {
-        host_.offer("ISerialFactory", serial);
-        if (module_.Init(&host_) == 0) throw std::runtime_error(module_.GetLastError());
-        protocol_ = std::make_unique<Protocol_MRTU>();
-        if (!protocol_->Config(configuration(ascii).c_str()) || !protocol_->Start())
-            throw std::runtime_error(protocol_->GetLastErrorString());
-        tag_ = protocol_->CreateTag("1?HREG?400001?unsignedShort-125");
-    }
-    ~Driver() {
-        protocol_->Stop();
-        protocol_.reset();
-        module_.Close();
-    }
-    Driver(const Driver&) = delete;
-    Driver& operator=(const Driver&) = delete;
+    Reader(ISerialFactory& serial, bool ascii)
+        : driver_(serial, bench::configuration(ascii ? "ASCII" : "RTU")),
+          tag_(driver_.tag("1?HREG?400001?unsignedShort-125")) {}
 
     bool read(unsigned char* data) {
-        return protocol_->doReadBlock(static_cast<const Tag_MRTU*>(tag_), 0, data, kRegisters);
+        return driver_.protocol().doReadBlock(static_cast<const Tag_MRTU*>(tag_), 0, data,
+                                              kRegisters);
     }
 
   private:
-    FakeHost host_;
-    ProtModule module_;
-    std::unique_ptr<Protocol_MRTU> protocol_;
-    ITag* tag_ = nullptr;
+    bench::StartedDriver driver_;
+    const ITag* tag_;
 };
 
 Bytes replyMessage() {
@@ -97,8 +54,8 @@ Bytes replyFrame(bool ascii) {
 /// The driver on a port that answers at once: what is left is the driver's own work.
 void driverOnScriptedPort(benchmark::State& state, bool ascii) {
     FixedReplyPort port(replyFrame(ascii));
-    OnePort factory(port);
-    Driver driver(factory, ascii);
+    bench::OnePort factory(port);
+    Reader driver(factory, ascii);
     std::array<unsigned char, 2 * kRegisters> data{};
     for (auto _ : state)
         if (!driver.read(data.data())) return state.SkipWithError("read failed");
@@ -138,7 +95,7 @@ void driverOnSimulatedLine(benchmark::State& state) {
     simulator.start();
     runtime::PosixSerialFactory serial;
     serial.mapPort("com1", simulator.path());
-    Driver driver(serial, false);
+    Reader driver(serial, false);
     std::array<unsigned char, 2 * kRegisters> data{};
     for (auto _ : state)
         if (!driver.read(data.data())) return state.SkipWithError("read failed");
