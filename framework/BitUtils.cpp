@@ -1,8 +1,9 @@
-// Moves single bits between packed buffers and buffers of one byte per bit.
+// Moves bits between packed buffers and buffers of one byte per bit.
 #include "framework/BitUtils.h"
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 
 #include "framework/DataTypes.h"
 
@@ -10,35 +11,81 @@ namespace ProtUtilsN {
 
 namespace {
 
+constexpr int kByteBits = 8;
+
 // A running position in a packed buffer. It touches a byte only when one of its bits is asked for,
 // so it may stand behind the buffer's end after the last bit.
 template <class Byte>
 class BitCursor {
   public:
     BitCursor(Byte* buffer, int bit)
-        : byte_(buffer + bit / 8), mask_(1U << (static_cast<unsigned>(bit) % 8U)) {}
+        : byte_(buffer + bit / kByteBits), bit_(static_cast<unsigned>(bit) % kByteBits) {}
 
-    bool get() const { return (*byte_ & mask_) != 0; }
-
+    bool atByte() const { return bit_ == 0; }
+    bool take() {
+        const bool on = (*byte_ >> bit_ & 1U) != 0;
+        advance();
+        return on;
+    }
     void put(bool on) {
-        *byte_ = static_cast<unsigned char>(on ? *byte_ | mask_ : *byte_ & ~mask_);
+        const unsigned mask = 1U << bit_;
+        *byte_ = static_cast<unsigned char>(on ? *byte_ | mask : *byte_ & ~mask);
+        advance();
     }
 
-    void advance() {
-        mask_ <<= 1;
-        if (mask_ > 0x80U) {
-            mask_ = 1;
-            ++byte_;
-        }
+    // The next eight bits, which may lie in two bytes.
+    unsigned takeEight() {
+        const unsigned low = *byte_++;
+        return atByte() ? low : (low | unsigned{*byte_} << kByteBits) >> bit_ & 0xFFU;
     }
+    // REQUIRES: atByte().
+    void putEight(unsigned eight) { *byte_++ = static_cast<unsigned char>(eight); }
 
   private:
+    void advance() {
+        bit_ = (bit_ + 1) % kByteBits;
+        if (bit_ == 0) ++byte_;
+    }
+
     Byte* byte_;
-    unsigned mask_;
+    unsigned bit_;
 };
 
 using Reader = BitCursor<const unsigned char>;
 using Writer = BitCursor<unsigned char>;
+
+// The bytes that a copy touches in one of its buffers.
+struct Extent {
+    const unsigned char* begin;
+    const unsigned char* end;
+};
+
+Extent packed(const unsigned char* buffer, int bit, int count) {
+    const unsigned char* begin = buffer + bit / kByteBits;
+    return {begin, begin + GetLenOfBits(bit % kByteBits, count)};
+}
+
+Extent unpacked(const unsigned char* buffer, int count) {
+    return {buffer, buffer + count};
+}
+
+bool areApart(const Extent& one, const Extent& other) {
+    const std::less_equal<> before;
+    return before(one.end, other.begin) || before(other.end, one.begin);
+}
+
+// Moves bits in order: singly until `cursor` stands at a byte, then by eights, then the rest. Where
+// the buffers overlap, all go singly: what was just written may be what is read next.
+template <class Byte, class MoveOne, class MoveEight>
+void moveBits(const BitCursor<Byte>& cursor, int count, bool apart, MoveOne moveOne,
+              MoveEight moveEight) {
+    for (; apart && count > 0 && !cursor.atByte(); --count)
+        moveOne();
+    for (; apart && count >= kByteBits; count -= kByteBits)
+        moveEight();
+    for (; count > 0; --count)
+        moveOne();
+}
 
 }  // namespace
 
@@ -52,25 +99,42 @@ void CopyBits(unsigned char* dst, const unsigned char* src, int srcBit, int bitC
 }
 
 void UnpackBits(unsigned char* dst, const unsigned char* src, int srcBit, int bitCount) {
+    if (bitCount < 1) return;
     Reader from(src, srcBit);
-    for (int i = 0; i < bitCount; ++i, from.advance()) {
-        dst[i] = from.get() ? 1 : 0;
-    }
+    const auto one = [&] { *dst++ = from.take() ? 1 : 0; };
+    const auto eight = [&] {
+        const unsigned bits = from.takeEight();
+        for (int bit = 0; bit < kByteBits; ++bit)
+            dst[bit] = static_cast<unsigned char>(bits >> bit & 1U);
+        dst += kByteBits;
+    };
+    moveBits(from, bitCount, areApart(unpacked(dst, bitCount), packed(src, srcBit, bitCount)), one,
+             eight);
 }
 
 void PackBits(unsigned char* dst, const unsigned char* src, int dstBit, int bitCount) {
+    if (bitCount < 1) return;
     Writer to(dst, dstBit);
-    for (int i = 0; i < bitCount; ++i, to.advance()) {
-        to.put(src[i] != 0);
-    }
+    const auto one = [&] { to.put(*src++ != 0); };
+    const auto eight = [&] {
+        unsigned bits = 0;
+        for (int bit = 0; bit < kByteBits; ++bit)
+            bits |= (src[bit] != 0 ? 1U : 0U) << bit;
+        src += kByteBits;
+        to.putEight(bits);
+    };
+    moveBits(to, bitCount, areApart(packed(dst, dstBit, bitCount), unpacked(src, bitCount)), one,
+             eight);
 }
 
 void shiftBits(unsigned char* dst, int dstBit, const unsigned char* src, int srcBit, int bitCount) {
+    if (bitCount < 1) return;
     Writer to(dst, dstBit);
     Reader from(src, srcBit);
-    for (int i = 0; i < bitCount; ++i, to.advance(), from.advance()) {
-        to.put(from.get());
-    }
+    const auto one = [&] { to.put(from.take()); };
+    const auto eight = [&] { to.putEight(from.takeEight()); };
+    moveBits(to, bitCount, areApart(packed(dst, dstBit, bitCount), packed(src, srcBit, bitCount)),
+             one, eight);
 }
 
 int getStartingBit(const ITag* tag) {
