@@ -39,6 +39,13 @@ void appendHex(Frame& frame, std::uint8_t byte) {
     append(frame, static_cast<std::uint8_t>(kDigits[byte & 0x0F]));
 }
 
+void turnRegisters(unsigned char* to, const unsigned char* from, int count) {
+    for (int byte = 0; byte < 2 * count; byte += 2) {
+        to[byte] = from[byte + 1];
+        to[byte + 1] = from[byte];
+    }
+}
+
 bool isHexDigit(std::uint8_t character) {
     return (character >= '0' && character <= '9') || (character >= 'A' && character <= 'F');
 }
@@ -56,8 +63,8 @@ void Message::putWord(std::uint16_t word) {
 
 Frame frameRtu(ByteView message) {
     Frame frame;
-    for (const std::uint8_t byte : message)
-        append(frame, byte);
+    std::copy(message.begin(), message.end(), frame.bytes.begin());
+    frame.length = static_cast<int>(message.size());
     const std::uint16_t crc = crcRegister(message);
     append(frame, low(crc));
     append(frame, high(crc));
@@ -73,6 +80,12 @@ Frame frameAscii(ByteView message) {
     append(frame, '\r');
     append(frame, '\n');
     return frame;
+}
+
+void turnItems(unsigned char* to, const unsigned char* from, int count, int itemLength) {
+    if (itemLength == 2) return turnRegisters(to, from, count);
+    for (; count > 0; --count, to += itemLength, from += itemLength)
+        std::reverse_copy(from, from + itemLength, to);
 }
 
 std::uint8_t calcLrc(ByteView data) {

@@ -24,6 +24,12 @@ class Message {
     /// REQUIRES: room for the byte, see fits().
     void put(std::uint8_t byte) { bytes_[static_cast<std::size_t>(length_++)] = byte; }
     void putWord(std::uint16_t word);
+    /// Appends `count` zeros for the caller to write over; valid as long as the message.
+    /// REQUIRES: room for them, see fits().
+    std::uint8_t* extend(int count) {
+        length_ += count;
+        return bytes_.data() + length_ - count;
+    }
     bool fits(long long count) const { return count >= 0 && count <= kMaxMessage - length_; }
 
     ByteView view() const { return {bytes_.data(), static_cast<std::size_t>(length_)}; }
@@ -45,6 +51,10 @@ struct Frame {
 
 Frame frameRtu(ByteView message);
 Frame frameAscii(ByteView message);
+
+/// Copies items from the host's byte order, least significant byte first, to the line's, most
+/// significant byte first, or back. A count below 1 copies nothing.
+void turnItems(unsigned char* to, const unsigned char* from, int count, int itemLength);
 
 /// The two's complement of the 8-bit sum.
 std::uint8_t calcLrc(ByteView data);

@@ -14,15 +14,6 @@ namespace {
 
 constexpr std::size_t kDataStart = 1 + 1 + 1;  // node, function, byte count
 
-/// Turns items that came most significant byte first into host (little-endian) order.
-void copyItems(unsigned char* data, const std::uint8_t* items, int count, int itemLength) {
-    for (int item = 0; item < count; ++item) {
-        std::reverse_copy(items, items + itemLength, data);
-        items += itemLength;
-        data += itemLength;
-    }
-}
-
 }  // namespace
 
 int Protocol_MRTU::getMaxItemCount(const ProtgenTag* tag, bool write) const {
@@ -74,6 +65,6 @@ Fault Protocol_MRTU::readItems(const Tag_MRTU& tag, int index, unsigned char* da
     if (bits)
         ProtUtilsN::shiftBits(data, index % 8, received, 0, count);
     else
-        copyItems(data, received, count, itemLength);
+        _MRTU::turnItems(data, received, count, itemLength);
     return _MRTU::kNoFault;
 }

@@ -1,6 +1,4 @@
 // Writes of the device's areas.
-#include <array>
-
 #include "framework/BitUtils.h"
 #include "framework/DataTypes.h"
 #include "mrtu/LineLock.h"
@@ -32,20 +30,15 @@ void putCoil(Message& request, bool on) {
 
 bool putBits(Message& request, const unsigned char* data, int index, int count) {
     const long long length = (static_cast<long long>(count) + 7) / 8;
-    std::array<unsigned char, _MRTU::kMaxMessage> packed{};
     if (count < 0 || !request.fits(length)) return false;
-    ProtUtilsN::shiftBits(packed.data(), 0, data, index % 8, count);
-    for (std::size_t byte = 0; byte < static_cast<std::size_t>(length); ++byte)
-        request.put(packed[byte]);
+    ProtUtilsN::shiftBits(request.extend(static_cast<int>(length)), 0, data, index % 8, count);
     return true;
 }
 
-/// Host (little-endian) items, each most significant byte first.
+/// Host items, each most significant byte first.
 bool putItems(Message& request, const unsigned char* data, int count, int itemLength) {
     if (count < 0 || !request.fits(static_cast<long long>(count) * itemLength)) return false;
-    for (int item = 0; item < count; ++item, data += itemLength)
-        for (int byte = itemLength - 1; byte >= 0; --byte)
-            request.put(data[byte]);
+    _MRTU::turnItems(request.extend(count * itemLength), data, count, itemLength);
     return true;
 }
 
