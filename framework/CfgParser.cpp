@@ -5,8 +5,8 @@
 #include <array>
 #include <cstddef>
 #include <optional>
+#include <set>
 #include <string_view>
-#include <unordered_set>
 
 #include "framework/TextUtils.h"
 
@@ -74,7 +74,7 @@ CfgParser::CfgParser(const char* text) : text_(text == nullptr ? "" : text) {
 }
 
 void CfgParser::collectNodes() {
-    std::unordered_set<int> known;
+    std::set<int> known;
     std::size_t at = text_.find(kNode);
     while (at != std::string::npos) {
         const std::size_t digits = at + kNode.size();

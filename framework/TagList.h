@@ -2,7 +2,7 @@
 #pragma once
 
 #include <list>
-#include <unordered_map>
+#include <map>
 
 #include "platform/ITag.h"
 
@@ -25,5 +25,5 @@ class TagList {
 
   private:
     std::list<ITag*> tags_;
-    std::unordered_multimap<const ITag*, std::list<ITag*>::const_iterator> places_;
+    std::multimap<const ITag*, std::list<ITag*>::const_iterator> places_;
 };
