@@ -1,6 +1,7 @@
 // Linked into a library that carries the C++ run time inside: what that run time needs to feel at
 // home in a library that is loaded on old panels, and unloaded again.
 #include <cstdlib>
+#include <new>
 
 // The flag by which the C++ run time asks the C library whether atomic operations can be spared.
 // The C library has it since 2.32 only. Defined here, out of sight, it keeps that version out of
@@ -21,6 +22,33 @@ void __verbose_terminate_handler() {
 // Source: libsupc++/eh_alloc.cc, where it serves memory checkers.
 void __freeres();
 }  // namespace __gnu_cxx
+
+// What the standard library's templates call to throw. A guard at the library's border catches
+// everything alike, so one exception does for all of them; the run time's own bring a text
+// formatter and a family of exceptions with their strings along, 4 KiB that nobody can tell apart.
+// Source: libstdc++-v3/src/c++11/functexcept.cc, system_error.cc.
+namespace std {
+
+[[noreturn, gnu::visibility("hidden")]] void __throw_bad_alloc() {
+    throw bad_alloc();
+}
+[[noreturn, gnu::visibility("hidden")]] void __throw_bad_array_new_length() {
+    throw bad_alloc();
+}
+[[noreturn, gnu::visibility("hidden")]] void __throw_length_error(const char* /*where*/) {
+    throw bad_alloc();
+}
+[[noreturn, gnu::visibility("hidden")]] void __throw_logic_error(const char* /*where*/) {
+    throw bad_alloc();
+}
+[[noreturn, gnu::visibility("hidden")]] void __throw_out_of_range_fmt(const char* /*where*/, ...) {
+    throw bad_alloc();
+}
+[[noreturn, gnu::visibility("hidden")]] void __throw_system_error(int /*code*/) {
+    throw bad_alloc();
+}
+
+}  // namespace std
 
 namespace {
 
