@@ -28,9 +28,9 @@ Transfer sendAll(Line& line, std::span<const std::uint8_t> data, Line::TimePoint
 Transfer drain(Line& line, Line::TimePoint deadline, std::chrono::nanoseconds characterTime);
 
 /// The time that one character of `bits` bits (start, data, parity and stop bits) takes on the
-/// wire. REQUIRES: baud > 0.
+/// wire, rounded up: who looks that much later finds it. REQUIRES: baud > 0.
 constexpr std::chrono::nanoseconds characterTime(int baud, int bits) {
-    return std::chrono::nanoseconds(std::int64_t{bits} * 1'000'000'000 / baud);
+    return std::chrono::nanoseconds((std::int64_t{bits} * 1'000'000'000 + baud - 1) / baud);
 }
 
 /// How long sending may take: the characters' own time plus a margin for a busy system.

@@ -86,9 +86,9 @@ TEST_F(LineSendingTest, NothingToSendIsDone) {
 }
 
 TEST_F(LineSendingTest, TimeFollowsFromRateAndFormat) {
-    EXPECT_EQ(1041666ns, characterTime(9600, 10));
+    EXPECT_EQ(1041667ns, characterTime(9600, 10));
     EXPECT_EQ(80ms, characterTime(150, 12));
-    EXPECT_EQ(256 * 66666666ns + 1s, sendingTime(256, characterTime(150, 10)));
+    EXPECT_EQ(256 * 66666667ns + 1s, sendingTime(256, characterTime(150, 10)));
 }
 
 }  // namespace
