@@ -198,7 +198,7 @@ bool LineExchange::frontIsForLatest() {
 
 /// Books what has come while nobody waited, to its end, and throws it away.
 void LineExchange::bookStrays() {
-    if (book_->mustSeeWhole() && !input_.bytes().empty()) {
+    if (book_->expectsAny() && !input_.bytes().empty()) {
         const TimePoint now = line_.now();
         untilFrameEnd(LineInput::kRoom, now + kLongestStray, input_.lastArrival() + gap_);
     }

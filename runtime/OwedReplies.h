@@ -75,6 +75,9 @@ class OwedReplies {
     /// that it must be seen whole before anybody gets a byte of it.
     bool mustSeeWhole() const;
 
+    /// Whether anything may still come that the book wants to see.
+    bool expectsAny() const { return latest_.owed > 0 || mustSeeWhole(); }
+
     enum class Verdict : std::uint8_t { Deliver, ThrowAway };
     /// Books a frame that has come while the latest request waits.
     Verdict arrived(ByteView frame, TimePoint now);
