@@ -159,6 +159,8 @@ void OwedReplies::forgetExpired(TimePoint now) {
         }
         const std::uint8_t node = older_[i].node;
         counts_.forgotten += older_[i].owed;
+        // Not heard since: it is not there, and nobody waits for it again.
+        if (nodes_[node].history.lastHeard() <= older_[i].first) nodes_[node].awaited = false;
         older_.erase(older_.begin() + static_cast<std::ptrdiff_t>(i));
         if (owesNothing(node)) {
             nodes_[node].history.dismiss();

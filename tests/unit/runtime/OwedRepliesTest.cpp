@@ -157,6 +157,15 @@ TEST_F(OwedRepliesTest, NodeThatHasDiedIsWaitedForOnce) {
     EXPECT_EQ(Kind::Now, before(kA, 320ms));
 }
 
+TEST_F(OwedRepliesTest, NodeThatHasDiedIsWaitedForNoMoreAlsoWhenOthersTookTheTime) {
+    nodeAnswers(0ms);
+    send(kA, 20ms);
+    send(kOther, 120ms);
+    ASSERT_EQ(Kind::Now, before(kB, 250ms));
+    send(kB, 250ms);
+    EXPECT_EQ(Kind::Now, before(kA, 350ms));
+}
+
 TEST_F(OwedRepliesTest, NodeThatComesBackIsWaitedForAgain) {
     nodeAnswers(0ms);
     send(kA, 20ms);
