@@ -182,11 +182,21 @@ bool LineExchange::endsByLength() const {
     return book_->mustSeeWhole() && book_->frontFrame(input_.bytes()) > 0;
 }
 
+/// The frame that the input begins with. Where silence ends frames, what it has ended is one frame
+/// unless it is replies from end to end: an echo, too, may begin with a valid reply.
+ByteView LineExchange::front() const {
+    const ByteView all = input_.bytes();
+    const std::size_t known = book_->frontFrame(all);
+    if (known == 0) return all;
+    const bool split =
+        options_.frameEnd == FrameEndBy::Length || book_->areFrames(all.subspan(known));
+    return split ? all.first(known) : all;
+}
+
 /// Books the frame that the input begins with. @return whether it may be handed out; else it is
 /// thrown away.
 bool LineExchange::frontIsForLatest() {
-    const std::size_t known = book_->frontFrame(input_.bytes());
-    const ByteView frame = known > 0 ? input_.bytes().first(known) : input_.bytes();
+    const ByteView frame = front();
     const bool deliver = !completesCutReply(frame) && book_->arrived(frame, input_.lastArrival()) ==
                                                           OwedReplies::Verdict::Deliver;
     whole_ = frame.size();

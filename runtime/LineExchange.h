@@ -105,6 +105,7 @@ class LineExchange {
     std::size_t missing() const;
     bool endsByLength() const;
 
+    ByteView front() const;
     bool frontIsForLatest();
     void bookStrays();
     void closeFrame();

@@ -107,6 +107,15 @@ std::size_t OwedReplies::frontFrame(ByteView received) const {
     return length > 0 ? length : lengthFor(answered_);
 }
 
+bool OwedReplies::areFrames(ByteView received) const {
+    while (!received.empty()) {
+        const std::size_t length = frontFrame(received);
+        if (length == 0) return false;
+        received = received.subspan(length);
+    }
+    return true;
+}
+
 std::optional<LateNode> OwedReplies::takeLateNode() {
     return std::exchange(lateNode_, std::nullopt);
 }

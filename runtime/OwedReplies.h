@@ -87,6 +87,8 @@ class OwedReplies {
     /// @return the bytes at the front of `received` that are a whole frame for one of the owed;
     /// 0 when they begin with none.
     std::size_t frontFrame(ByteView received) const;
+    /// Whether `received` is such frames from end to end, or empty.
+    bool areFrames(ByteView received) const;
 
     /// @return a node whose late replies nobody was told of; each node once, when all that it owed
     /// has come or been given up.

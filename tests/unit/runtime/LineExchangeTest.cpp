@@ -101,6 +101,21 @@ TEST_F(LineExchangeTest, OneExchangeByLengthTakesFourCallsAndTheSilence) {
     EXPECT_EQ(4 + 5, line.calls());
 }
 
+// An echo may begin with a valid reply, and a retry finds the first attempt's reply still owed.
+TEST_F(LineExchangeTest, WhatSilenceEndsIsHandedOutWholeAlsoWhenItBeginsWithAReply) {
+    Bytes echo = kReplyA;
+    echo.push_back(0);
+    arrive(10, echo);
+    EXPECT_EQ(echo, exchange(kA));
+    arrive(60, echo);
+    EXPECT_EQ(echo, exchange(kA));
+    Bytes withReply = echo;
+    withReply.insert(withReply.end(), kReplyA.begin(), kReplyA.end());
+    arrive(110, withReply);
+    EXPECT_EQ(withReply, exchange(kA));
+    EXPECT_THAT(thrownAway, ::testing::IsEmpty());
+}
+
 TEST_F(LineExchangeTest, SilenceIsKeptBeforeTheNextRequest) {
     options.frameEnd = FrameEndBy::Length;
     arrive(20, kReplyA);
