@@ -92,6 +92,13 @@ void addPortOptions(CommandSpec& command, LineOptions& options) {
                  "Shortest silence in ms that ends a reply, for USB adapters that pause, e.g. 20",
              .valueName = "MS",
              .range = NumberRange{0, 1000}},
+            {.names = "--frame-end",
+             .target = &options.frameEnd,
+             .help = "What ends a reply. With length none is cut by a pause and no silence is "
+                     "waited for; not for lines that return what is sent",
+             .valueName = "BY",
+             .choices = {"silence", "length"},
+             .showsDefault = true},
         });
 }
 

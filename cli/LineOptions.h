@@ -19,8 +19,9 @@ struct LineOptions {
     bool trace = false;
     bool traceHex = false;      ///< A trace that shows ASCII frames as bytes, too.
     bool traceMeaning = false;  ///< A trace that says what each frame means.
-    int minGapMs = 0;     ///< 0..1000, the shortest silence that ends a reply; 0: the driver's own.
-    std::string storage;  ///< A file, "none", or empty for the default.
+    int minGapMs = 0;  ///< 0..1000, the shortest silence that ends a reply; 0: the driver's own.
+    std::string frameEnd = "silence";  ///< What ends a reply; or "length".
+    std::string storage;               ///< A file, "none", or empty for the default.
     std::string ident;
     std::string protocol = "MRTU";
 };

@@ -9,6 +9,7 @@
 #include "cli/ConfigWarnings.h"
 #include "cli/SimNodes.h"
 #include "cli/TraceText.h"
+#include "runtime/ModbusReplies.h"
 #include "runtime/PosixMultiTask.h"
 #include "runtime/PosixSerialFactory.h"
 #include "runtime/ServiceFactory.h"
@@ -52,6 +53,11 @@ runtime::TracingSerialFactory::Callback watcher(bool& portGone, std::ostream& er
     };
 }
 
+runtime::FrameEndBy frameEndOf(const LineOptions& options) {
+    return options.frameEnd == "length" ? runtime::FrameEndBy::Length
+                                        : runtime::FrameEndBy::Silence;
+}
+
 runtime::ProtocolObject makeProtocol(const std::string& plugin, IInterfaceFactory& host,
                                      const std::string& name) {
     const auto library = valueOr(runtime::PluginLibrary::load(plugin), ExitCode::Other);
@@ -74,6 +80,9 @@ struct Session::Parts {
           host(multiTask, tracing, storage.get()),
           channel(makeProtocol(plugin, host, options.protocol)) {
         serial.setGapFloor(options.minGapMs);
+        serial.setFrameEnd(frameEndOf(options));
+        serial.setReplyRules(std::make_shared<runtime::ModbusReplies>());
+        serial.setReport([this](const std::string& text) { complain(context, text); });
         for (const PortMapping& port : ports)
             mapPort(port);
     }
