@@ -35,7 +35,9 @@ Departure OwedReplies::before(ByteView request, TimePoint now) {
     if (!isRepetition(request) && !couldMistake(request, *addressee)) return {};
     const TimePoint silentAt = node.history.silentAt();
     if (node.returning && now < silentAt) return {Departure::Kind::Not, silentAt};
-    if (isRepetition(request) || !(node.awaited || node.returning)) return {};
+    const bool sendsOnce = node.repeats == 0;
+    if (sendsOnce && isRepetition(request)) return {};
+    if (sendsOnce && !node.awaited && !node.returning) return {};
     if (now < silentAt) return {Departure::Kind::Later, silentAt};
     giveUp(*addressee);
     return {};
@@ -59,7 +61,7 @@ void OwedReplies::awaits(Duration timeout) {
 }
 
 bool OwedReplies::mustSeeWhole() const {
-    return !older_.empty() || latest_.owed > 1 || nodes_[latest_.node].repeats;
+    return !older_.empty() || latest_.owed > 1 || nodes_[latest_.node].repeats > 0;
 }
 
 OwedReplies::Verdict OwedReplies::arrived(ByteView frame, TimePoint now) {
@@ -129,7 +131,7 @@ bool OwedReplies::couldMistake(ByteView request, std::uint8_t node) const {
     const auto mistakable = [&](const Request& owing) {
         return owing.node == node && owing.owed > 0 && rules_.confusable(owing.frame(), request);
     };
-    return nodes_[node].repeats || mistakable(latest_) ||
+    return nodes_[node].repeats > 0 || mistakable(latest_) ||
            std::any_of(older_.begin(), older_.end(), mistakable);
 }
 
@@ -216,7 +218,7 @@ void OwedReplies::giveUp(std::uint8_t number) {
     older_.erase(std::remove_if(older_.begin(), older_.end(), forget), older_.end());
     forget(latest_);
     node.awaited = answeredSince || node.returning;
-    node.repeats = false;
+    if (node.repeats > 0) --node.repeats;
     node.history.dismiss();
     settle(number);
 }
@@ -277,12 +279,19 @@ void OwedReplies::late(Request& request, TimePoint now, bool ambiguous) {
 
 /// A reply that was delivered comes once more: from now on each reply of that node may.
 bool OwedReplies::surplus(ByteView frame, TimePoint now) {
-    if (rules_.answers(answered_.frame(), frame) != Answer::Yes) return false;
+    const bool repeated = rules_.answers(answered_.frame(), frame) == Answer::Yes;
+    if (!repeated && !holdsTwo(frame)) return false;
     Node& node = nodes_[answered_.node];
     node.history.heard(now, Duration{0}, Duration{0});
-    node.repeats = true;
+    node.repeats = kSilencesOfTrust;
     ++counts_.surplus;
-    return true;
+    return repeated;
+}
+
+/// Whether two replies came without a pause, one of them asked for.
+bool OwedReplies::holdsTwo(ByteView frame) const {
+    const std::size_t front = frontFrame(frame);
+    return front > 0 && front < frame.size() && frontFrame(frame.subspan(front)) > 0;
 }
 
 }  // namespace runtime

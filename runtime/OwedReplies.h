@@ -58,6 +58,9 @@ class OwedReplies {
 
     /// Unanswered requests that are remembered; beyond it the oldest is forgotten.
     static constexpr std::size_t kMostRequests = 128;
+    /// A node that has sent a reply twice is believed not to do so any more after so many silences
+    /// in a row in which nothing came.
+    static constexpr unsigned kSilencesOfTrust = 16;
     /// Longer requests are not followed. The longest of serial Modbus has 513 characters.
     static constexpr std::size_t kLongestRequest = 520;
 
@@ -114,7 +117,7 @@ class OwedReplies {
         NodeHistory history;
         bool awaited = false;    // Others wait for its replies.
         bool returning = false;  // Heard for the first time, with a reply to who knows what.
-        bool repeats = false;    // Has sent a reply twice.
+        unsigned repeats = 0;    // Has sent a reply twice; silences until that is forgotten.
         bool told = false;
     };
 
@@ -133,6 +136,7 @@ class OwedReplies {
     void damaged(TimePoint now);
     void late(Request& request, TimePoint now, bool ambiguous);
     bool surplus(ByteView frame, TimePoint now);
+    bool holdsTwo(ByteView frame) const;
 
     const ReplyRules& rules_;
     Request latest_;    // Owes nothing when nobody answers it.

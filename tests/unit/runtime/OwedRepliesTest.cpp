@@ -206,6 +206,32 @@ TEST_F(OwedRepliesTest, NodeThatAnswersTwiceIsWaitedForAfterEveryReply) {
     EXPECT_EQ(Kind::Now, before(kA, 15ms + 2 * kTimeout));
 }
 
+TEST_F(OwedRepliesTest, NodeWhoseRepliesComeTogetherIsWaitedForBeforeARepetitionToo) {
+    nodeAnswers(0ms);
+    send(kA, 20ms);
+    Bytes both = kLongReply;
+    both.insert(both.end(), kReply.begin(), kReply.end());
+    EXPECT_EQ(Verdict::Deliver, arrive(both, 30ms));
+    EXPECT_EQ(1u, book.counts().surplus);
+    EXPECT_EQ(Kind::Later, before(kA, 31ms));
+    EXPECT_EQ(Kind::Now, before(kA, 30ms + 2 * kTimeout));
+}
+
+TEST_F(OwedRepliesTest, NodeThatAnsweredTwiceIsTrustedAfterManySilences) {
+    nodeAnswers(0ms);
+    book.arrivedLate(kLongReply, at(15ms));
+    auto now = 20ms;
+    for (unsigned i = 0; i < OwedReplies::kSilencesOfTrust; ++i) {
+        EXPECT_EQ(Kind::Later, before(kA, now));
+        ASSERT_EQ(Kind::Now, before(kA, now + 3 * kTimeout));
+        now += 3 * kTimeout;
+        send(kA, now);
+        ASSERT_EQ(Verdict::Deliver, arrive(kReply, now + 10ms));
+        now += 20ms;
+    }
+    EXPECT_EQ(Kind::Now, before(kA, now));
+}
+
 TEST_F(OwedRepliesTest, BroadcastOwesNothing) {
     nodeAnswers(0ms);
     send(FakeRules::request(0, 2, 'x'), 20ms);
