@@ -82,7 +82,7 @@ Area areaAt(const FunctionRow& row, const Memory& memory, std::uint16_t address)
 }
 
 bool inReach(const Memory& memory, Area area, std::uint32_t address, std::uint32_t count) {
-    if (!memory.has(area, address, count)) return false;
+    if (!memory.has(area, address, count) || memory.refuses(area, address, count)) return false;
     if (area != Area::HoldingRegister || !memory.longs()) return true;
     const LongRange& longs = *memory.longs();
     return address + count <= longs.base || address >= longs.base + longs.count;

@@ -1,5 +1,6 @@
 #include "sim/Memory.h"
 
+#include <algorithm>
 #include <stdexcept>
 #include <string>
 #include <utility>
@@ -35,8 +36,9 @@ std::uint32_t initialValue(Area area, std::uint8_t node, std::uint16_t address) 
     return 0;
 }
 
-Memory::Memory(std::uint8_t node, const AreaSizes& sizes, std::optional<LongRange> longs)
-    : longs_(longs) {
+Memory::Memory(std::uint8_t node, const AreaSizes& sizes, std::optional<LongRange> longs,
+               std::vector<RefusedRange> refused)
+    : longs_(longs), refused_(std::move(refused)) {
     const LongRange range = longs.value_or(LongRange{.base = 0, .count = 0});
     addArea(Area::Coil, node, 0, sizes.coils, 1);
     addArea(Area::DiscreteInput, node, 0, sizes.discreteInputs, 1);
@@ -61,6 +63,13 @@ bool Memory::has(Area area, std::uint32_t address, std::uint32_t count) const {
     if (address < own.base) return false;
     const std::size_t index = address - own.base;
     return index <= own.values.size() && count <= own.values.size() - index;
+}
+
+bool Memory::refuses(Area area, std::uint32_t address, std::uint32_t count) const {
+    const Area named = area == Area::LongRegister ? Area::HoldingRegister : area;
+    return std::any_of(refused_.begin(), refused_.end(), [&](const RefusedRange& range) {
+        return range.area == named && address <= range.last && address + count > range.first;
+    });
 }
 
 std::uint32_t Memory::get(Area area, std::uint32_t address) const {

@@ -33,6 +33,16 @@ struct LongRange {
     bool contains(std::uint32_t address) const { return address >= base && address - base < count; }
 };
 
+/// Addresses that a node has and yet refuses. A range of holding registers holds for the 32-bit
+/// registers of the same addresses, too.
+struct RefusedRange {
+    Area area = Area::HoldingRegister;
+    std::uint32_t first = 0;
+    std::uint32_t last = 0;  ///< Refused as well.
+
+    bool operator==(const RefusedRange&) const = default;
+};
+
 /// What an item holds at first; every area is a formula of node n and address a:
 ///   coil             1 when (a + n) mod 3 is 0
 ///   discrete input   1 when (a + n) mod 5 is 0 or 1
@@ -45,10 +55,14 @@ std::uint32_t initialValue(Area area, std::uint8_t node, std::uint16_t address);
 class Memory {
   public:
     /// Errors: std::invalid_argument when a size or the range exceeds 65536.
-    Memory(std::uint8_t node, const AreaSizes& sizes, std::optional<LongRange> longs);
+    Memory(std::uint8_t node, const AreaSizes& sizes, std::optional<LongRange> longs,
+           std::vector<RefusedRange> refused = {});
 
     /// Whether `count` items from `address` on exist.
     bool has(Area area, std::uint32_t address, std::uint32_t count) const;
+
+    /// Whether a request for these items is refused although they exist.
+    bool refuses(Area area, std::uint32_t address, std::uint32_t count) const;
 
     /// REQUIRES: has(area, address, 1).
     std::uint32_t get(Area area, std::uint32_t address) const;
@@ -72,6 +86,7 @@ class Memory {
     const Cells& cells(Area area) const;
 
     std::optional<LongRange> longs_;
+    std::vector<RefusedRange> refused_;
     std::vector<Cells> areas_;  // One for each Area, in its order.
 };
 
