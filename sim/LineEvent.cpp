@@ -28,6 +28,8 @@ const char* nameOf(LineEvent::Kind kind) {
             return "damaged";
         case LineEvent::Kind::Reply:
             return "reply";
+        case LineEvent::Kind::Lost:
+            return "lost";
         case LineEvent::Kind::HangUp:
             return "hang-up";
     }

@@ -14,6 +14,7 @@ struct LineEvent {
         Request,  ///< A frame with a right check, for whatever node.
         Damaged,  ///< Bytes that are no frame; they stay unanswered.
         Reply,    ///< What was sent, faults included.
+        Lost,     ///< A request to a node that was busy, see SimulatorOptions::losesWhileBusy.
         HangUp,   ///< A fault ended the line; no bytes.
     };
     Kind kind = Kind::Request;
@@ -21,7 +22,7 @@ struct LineEvent {
     std::chrono::steady_clock::time_point at{};
 };
 
-/// @return the kind's name: "request", "damaged", "reply", "hang-up".
+/// @return the kind's name: "request", "damaged", "reply", "lost", "hang-up".
 const char* nameOf(LineEvent::Kind kind);
 
 /// @return one line of text: the kind's name, then the bytes in hexadecimal (RTU) or the characters

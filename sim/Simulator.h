@@ -10,7 +10,6 @@
 #include <condition_variable>
 #include <cstdint>
 #include <deque>
-#include <functional>
 #include <memory>
 #include <mutex>
 #include <string>
@@ -20,28 +19,18 @@
 #include "sim/Fault.h"
 #include "sim/LineEvent.h"
 #include "sim/PtyLine.h"
+#include "sim/Serving.h"
+#include "sim/SimulatorOptions.h"
 #include "sim/Slave.h"
 #include "wire/Bytes.h"
-#include "wire/Framing.h"
 
 namespace sim {
-
-struct SimulatorOptions {
-    wire::Mode mode = wire::Mode::Rtu;
-    std::vector<NodeOptions> nodes = {NodeOptions{}};
-    std::string link{};            ///< Symbolic link to the device, see PtyLine. Empty: none.
-    std::uint32_t silenceMs = 20;  ///< Silence that ends an RTU frame of no announced length, 1..
-    std::size_t logLimit = 10000;  ///< Events that log() keeps; older ones are dropped.
-    /// Called for each event on the serving thread, before the next byte is looked at. It must not
-    /// throw and not call start(), stop() or wait().
-    std::function<void(const LineEvent&)> trace{};
-};
 
 /// Serves one line on a thread of its own. Memory, faults and log outlive stop() and start().
 /// Threads: start(), stop() and wait() belong to one thread; all else may be called from any.
 class Simulator {
   public:
-    /// Errors: std::invalid_argument, see Slave; silenceMs 0.
+    /// Errors: std::invalid_argument, see Slave; silenceMs 0; a time below 0.
     explicit Simulator(SimulatorOptions options);
     /// Stops.
     ~Simulator();
@@ -60,7 +49,7 @@ class Simulator {
     /// before start(), serving ends as soon as it begins.
     void requestStop() noexcept;
 
-    enum class End : std::uint8_t { Stopped, HungUp };
+    using End = sim::End;
 
     /// Blocks until requestStop() or a hang-up has ended serving, then cleans up as stop() does.
     End wait();
@@ -85,22 +74,12 @@ class Simulator {
     bool waitForEvents(std::size_t count, std::chrono::milliseconds timeout) const;
 
   private:
-    using Clock = std::chrono::steady_clock;
-
-    enum class Wake : std::uint8_t { Time, Bytes, Stop };
-    Wake waitUntil(Clock::time_point deadline, bool bytesToo) const;
-    bool pause(std::uint32_t ms);
     void joinServing();
     void forgetStopRequest();
     void rememberPaths(const PtyLine& line);
 
-    // The serving thread's steps.
+    // On the serving thread.
     void serve();
-    void receive(wire::FrameSplitter& splitter, Clock::time_point& silence);
-    void handle(const wire::Received& frame);
-    void send(const Transmission& transmission);
-    void sendPieces(const Transmission& transmission);
-    void hangUp();
     void record(LineEvent::Kind kind, wire::Bytes raw);
 
     SimulatorOptions options_;

@@ -23,6 +23,7 @@ TEST(LineEventTest, EveryKindHasItsName) {
     EXPECT_STREQ("request", nameOf(LineEvent::Kind::Request));
     EXPECT_STREQ("damaged", nameOf(LineEvent::Kind::Damaged));
     EXPECT_STREQ("reply", nameOf(LineEvent::Kind::Reply));
+    EXPECT_STREQ("lost", nameOf(LineEvent::Kind::Lost));
 }
 
 }  // namespace

@@ -37,6 +37,22 @@ void TestMaster::send(const std::string& text) {
     send(std::vector<std::uint8_t>(text.begin(), text.end()));
 }
 
+std::size_t TestMaster::sendUntilFull(std::size_t limit) {
+    // Long enough for a reader that still reads to make room.
+    constexpr int kPatience = 200;
+    const std::vector<std::uint8_t> zeroes(1000, 0);
+    std::size_t written = 0;
+    pollfd watched{.fd = fd_, .events = POLLOUT, .revents = 0};
+    EXPECT_EQ(0, ::fcntl(fd_, F_SETFL, O_RDWR | O_NONBLOCK));
+    while (written<limit&& ::poll(&watched, 1, kPatience)> 0) {
+        const ssize_t got = ::write(fd_, zeroes.data(), zeroes.size());
+        if (got <= 0) break;
+        written += static_cast<std::size_t>(got);
+    }
+    EXPECT_EQ(0, ::fcntl(fd_, F_SETFL, O_RDWR));
+    return written;
+}
+
 bool TestMaster::waitForInput(std::int64_t deadlineMs) const {
     pollfd watched{.fd = fd_, .events = POLLIN, .revents = 0};
     const auto left = static_cast<int>(std::max<std::int64_t>(0, deadlineMs - nowMs()));

@@ -19,6 +19,9 @@ class TestMaster {
     void send(const std::vector<std::uint8_t>& bytes);
     void send(const std::string& text);
 
+    /// Writes zeroes until the port takes no more or `limit` are written. @return how many.
+    std::size_t sendUntilFull(std::size_t limit);
+
     /// @return what has arrived when `count` bytes are there, the line has gone or time is up.
     std::vector<std::uint8_t> receive(std::size_t count);
     std::string receiveText(std::size_t count);
