@@ -1,10 +1,10 @@
 // The form in which people write faults.
 #include <algorithm>
 #include <array>
-#include <charconv>
 #include <limits>
 
 #include "sim/Fault.h"
+#include "sim/TextNumbers.h"
 #include "wire/Hex.h"
 
 namespace sim {
@@ -14,16 +14,6 @@ using wire::Bytes;
 
 /// Reads the value of a part into the fault. @return whether it could.
 using Setter = bool (*)(std::string_view value, Fault& fault);
-
-template <typename Number>
-bool readNumber(std::string_view text, Number min, Number max, Number& out) {
-    Number number{};
-    const char* const end = text.data() + text.size();
-    const auto [stop, error] = std::from_chars(text.data(), end, number);
-    if (error != std::errc{} || stop != end || number < min || number > max) return false;
-    out = number;
-    return true;
-}
 
 bool readHex(std::string_view text, Bytes& out) {
     const auto bytes = wire::fromHex(Bytes(text.begin(), text.end()));
