@@ -2,6 +2,7 @@
 #include "cli/CommandSpec.h"
 
 #include <sstream>
+#include <utility>
 
 namespace cli {
 
@@ -32,6 +33,13 @@ std::string OptionSpec::shownValueName() const {
     const bool number =
         std::holds_alternative<int*>(target) || std::holds_alternative<std::vector<int>*>(target);
     return number ? "INT" : "TEXT";
+}
+
+void CommandSpec::addGroup(const char* group, std::vector<OptionSpec> more) {
+    for (OptionSpec& option : more) {
+        option.group = group;
+        options.push_back(std::move(option));
+    }
 }
 
 std::vector<OptionSpec> CommandSpec::allOptions() const {

@@ -60,6 +60,9 @@ struct CommandSpec {
     bool needsCommand = false;            ///< One of them must be named.
     std::function<void()> action{};       ///< What the command does once its line was accepted.
 
+    /// Adds options that stand together in --help, below the group's name.
+    void addGroup(const char* group, std::vector<OptionSpec> more);
+
     /// @return all that the command accepts: --help, --version, `options`, in this order.
     [[nodiscard]] std::vector<OptionSpec> allOptions() const;
 };

@@ -21,19 +21,12 @@ std::vector<std::string> baudRates() {
     return rates;
 }
 
-void addGroup(CommandSpec& command, const char* group, std::vector<OptionSpec> options) {
-    for (OptionSpec& option : options) {
-        option.group = group;
-        command.options.push_back(std::move(option));
-    }
-}
-
 constexpr long kLargestNode = 254;
 constexpr long kLongestTimeoutMs = 3600000;
 
 void addShortForms(CommandSpec& command, LineOptions& options) {
-    addGroup(
-        command, "Configuration",
+    command.addGroup(
+        "Configuration",
         {
             {.names = "--baud",
              .target = &options.baud,
@@ -64,8 +57,8 @@ void addShortForms(CommandSpec& command, LineOptions& options) {
 }
 
 void addPortOptions(CommandSpec& command, LineOptions& options) {
-    addGroup(
-        command, "Line",
+    command.addGroup(
+        "Line",
         {
             {.names = "--port",
              .target = &options.ports,
@@ -103,42 +96,44 @@ void addPortOptions(CommandSpec& command, LineOptions& options) {
 }
 
 void addConfigOptions(CommandSpec& command, LineOptions& options) {
-    addGroup(command, "Configuration",
-             {
-                 {.names = "--config",
-                  .target = &options.configFile,
-                  .help = "Configuration text of the driver",
-                  .valueName = "FILE",
-                  .check = notEmpty()},
-                 {.names = "--set",
-                  .target = &options.settings,
-                  .help = "Add an item to the configuration or replace one, e.g. timeout=500 or "
-                          "Node5::model=2. Can be repeated",
-                  .valueName = "KEY=VALUE",
-                  .oneWordEach = true},
-             });
+    command.addGroup(
+        "Configuration",
+        {
+            {.names = "--config",
+             .target = &options.configFile,
+             .help = "Configuration text of the driver",
+             .valueName = "FILE",
+             .check = notEmpty()},
+            {.names = "--set",
+             .target = &options.settings,
+             .help = "Add an item to the configuration or replace one, e.g. timeout=500 or "
+                     "Node5::model=2. Can be repeated",
+             .valueName = "KEY=VALUE",
+             .oneWordEach = true},
+        });
 }
 
 void addDriverOptions(CommandSpec& command, LineOptions& options) {
-    addGroup(command, "Driver",
-             {
-                 {.names = "--storage",
-                  .target = &options.storage,
-                  .help = "Where overrides are kept, or 'none'. With --sim the default is 'none'",
-                  .valueName = "FILE",
-                  .check = notEmpty()},
-                 {.names = "--ident",
-                  .target = &options.ident,
-                  .help = "Whose overrides: the section of the storage",
-                  .valueName = "NAME",
-                  .check = notEmpty()},
-                 {.names = "--protocol",
-                  .target = &options.protocol,
-                  .help = "Protocol of the plug-in",
-                  .valueName = "NAME",
-                  .check = notEmpty(),
-                  .showsDefault = true},
-             });
+    command.addGroup(
+        "Driver",
+        {
+            {.names = "--storage",
+             .target = &options.storage,
+             .help = "Where overrides are kept, or 'none'. With --sim the default is 'none'",
+             .valueName = "FILE",
+             .check = notEmpty()},
+            {.names = "--ident",
+             .target = &options.ident,
+             .help = "Whose overrides: the section of the storage",
+             .valueName = "NAME",
+             .check = notEmpty()},
+            {.names = "--protocol",
+             .target = &options.protocol,
+             .help = "Protocol of the plug-in",
+             .valueName = "NAME",
+             .check = notEmpty(),
+             .showsDefault = true},
+        });
 }
 
 std::vector<ConfigItem> itemsOf(const LineOptions& options) {

@@ -10,6 +10,7 @@
 
 #include "cli/Commands.h"
 #include "cli/EndSignals.h"
+#include "cli/SimBehaviour.h"
 #include "cli/SimNodes.h"
 #include "cli/Validators.h"
 #include "sim/Simulator.h"
@@ -23,7 +24,8 @@ constexpr const char* kFooter =
 Examples:
   mrtu sim
   mrtu sim --ascii --node 1 --node 17 --link /tmp/line --trace
-  mrtu sim --fault exception=2,times=3)";
+  mrtu sim --fault exception=2,times=3
+  mrtu sim --baud 9600 --turnaround 20..60 --dead 7 --refuse 1:HREG:100-199)";
 
 struct SimOptions {
     bool ascii = false;
@@ -32,6 +34,7 @@ struct SimOptions {
     std::vector<int> nodes;
     std::string link;
     std::vector<std::string> faults;
+    SimBehaviour behaviour;
 };
 
 std::atomic<sim::Simulator*> g_serving{nullptr};
@@ -84,6 +87,7 @@ std::unique_ptr<sim::Simulator> makeSimulator(CommandContext& context, const Sim
     simOptions.mode = options.ascii ? wire::Mode::Ascii : wire::Mode::Rtu;
     simOptions.nodes = nodesOf(options);
     simOptions.link = options.link;
+    applySimBehaviour(options.behaviour, simOptions);
     if (options.trace) {
         simOptions.trace = [&err = context.err, mode = simOptions.mode](const sim::LineEvent& e) {
             err << sim::describe(e, mode) << std::endl;
@@ -109,8 +113,10 @@ void announce(std::ostream& out, const sim::Simulator& simulator, const SimOptio
     const int node = options.nodes.empty() ? 1 : options.nodes.front();
     out << fmt::format("simulated {} line: {}\n", options.ascii ? "ASCII" : "RTU",
                        simulator.path());
-    out << fmt::format("try: mrtu read --port {}{} '{}?HREG?400001?unsignedShort'\n",
-                       simulator.path(), options.ascii ? " --ascii" : "", node);
+    const int baud = options.behaviour.baud;
+    out << fmt::format("try: mrtu read --port {}{}{} '{}?HREG?400001?unsignedShort'\n",
+                       simulator.path(), options.ascii ? " --ascii" : "",
+                       baud == 0 ? "" : fmt::format(" --baud {}", baud), node);
     out << "Ctrl-C ends it." << std::endl;
 }
 
@@ -140,7 +146,7 @@ CommandSpec simCommand(CommandContext& context) {
          .target = &options->nodes,
          .help = "A node of the line; default is 1 to 10",
          .valueName = "N",
-         .range = NumberRange{1, 247},
+         .range = NumberRange{1, kHighestNode},
          .oneWordEach = true},
         {.names = "--plain", .target = &options->plain, .help = "Nodes without 32-bit registers"},
         {.names = "--link",
@@ -157,6 +163,7 @@ CommandSpec simCommand(CommandContext& context) {
          .target = &options->trace,
          .help = "Show every frame on standard error"},
     };
+    addSimBehaviour(command, options->behaviour);
     command.action = [options, &context] { serve(context, *options); };
     return command;
 }

@@ -9,8 +9,6 @@ namespace cli {
 namespace {
 
 constexpr int kDefaultNodes = 10;
-/// Source: Modbus over Serial Line V1.02, 2.2.
-constexpr int kHighestNode = 247;
 
 sim::NodeOptions node(int address, bool longs) {
     sim::NodeOptions options;

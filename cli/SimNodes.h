@@ -8,6 +8,9 @@
 
 namespace cli {
 
+/// Source: Modbus over Serial Line V1.02, 2.2.
+inline constexpr int kHighestNode = 247;
+
 /// @return nodes 1 to 10 with 32-bit registers unless `plain`.
 std::vector<sim::NodeOptions> defaultSimNodes(bool plain);
 

@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 #include <signal.h>
 
+#include <chrono>
 #include <filesystem>
 
 #include "tests/unit/cli/Child.h"
@@ -52,6 +53,60 @@ TEST(SimTest, RepliesWithPausesNeedALongerGap) {
     const auto hasty = mrtu(read);
     EXPECT_EQ(5, hasty.exitCode);
     EXPECT_NE(hasty.err.find("error -6"), std::string::npos) << hasty.err;
+}
+
+/// Exit code and both outputs of one read without a second try, as fast as the node is.
+cli_test::Outcome readOnce(const RunningSim& sim, const std::string& timeoutMs,
+                           const std::vector<std::string>& uris) {
+    std::vector<std::string> words{"read",    "--port", sim.device(), "--timeout",
+                                   timeoutMs, "--set",  "repeat=0"};
+    words.insert(words.end(), uris.begin(), uris.end());
+    return mrtu(words);
+}
+
+TEST(SimTest, CharactersTakeTheirTime) {
+    const RunningSim sim({"--baud", "600", "--parity", "even", "--bits", "7"});
+    EXPECT_NE(sim.announcement().find(sim.device() + " --baud 600 '1?"), std::string::npos)
+        << sim.announcement();
+    const auto begin = std::chrono::steady_clock::now();
+    const auto outcome = mrtu({"read", "--port", sim.device(), "--baud", "600", "--timeout",
+                               "10000", "1?HREG?400001?unsignedShort"});
+    const auto taken = std::chrono::steady_clock::now() - begin;
+    EXPECT_EQ("1?HREG?400001?unsignedShort = 1000\n", outcome.out) << outcome.err;
+    // Request, 3.5 characters of silence and reply, 10 bits each.
+    EXPECT_GE(taken, std::chrono::milliseconds((80 + 35 + 70) * 1000 / 600));
+}
+
+TEST(SimTest, ATurnaroundAboveTheTimeoutIsNoResponse) {
+    const RunningSim sim({"--turnaround", "0..1", "--turnaround", "3:60000", "--seed", "7"});
+    EXPECT_EQ(4, readOnce(sim, "100", {"3?HREG?400001?unsignedShort"}).exitCode);
+    EXPECT_EQ("4?HREG?400001?unsignedShort = 4000\n",
+              readOnce(sim, "10000", {"4?HREG?400001?unsignedShort"}).out);
+}
+
+TEST(SimTest, WhatIsSaidForOneNodeCountsMoreThanWhatIsSaidForAll) {
+    const RunningSim sim({"--away", "3:1/0", "--away", "0/1"});
+    EXPECT_EQ("3?HREG?400001?unsignedShort = 3000\n",
+              readOnce(sim, "10000", {"3?HREG?400001?unsignedShort"}).out);
+    EXPECT_EQ(4, readOnce(sim, "100", {"1?HREG?400001?unsignedShort"}).exitCode);
+}
+
+TEST(SimTest, DeadNodesDoNotAnswer) {
+    const RunningSim sim({"--dead", "2", "--dead", "3"});
+    const auto outcome = readOnce(sim, "100", {"1?OUTP?2?boolean", "2?OUTP?1?boolean"});
+    EXPECT_EQ("1?OUTP?2?boolean = 0\n", outcome.out);
+    EXPECT_EQ(4, outcome.exitCode);
+}
+
+TEST(SimTest, RefusedRangesAreAnsweredWithAnException) {
+    const RunningSim sim({"--refuse", "HREG:100-199", "--refuse", "2:IREG:7"});
+    for (const char* const uri :
+         {"1?HREG?400101?unsignedShort", "2?HREG?400200?int", "2?IREG?300008?short"}) {
+        const auto outcome = readOnce(sim, "10000", {uri});
+        EXPECT_EQ(5, outcome.exitCode) << uri;
+        EXPECT_NE(outcome.err.find("Illegal data address"), std::string::npos) << outcome.err;
+    }
+    EXPECT_EQ("1?IREG?300008?short = 31007\n", readOnce(sim, "10000", {"1?IREG?300008?short"}).out);
 }
 
 TEST(SimTest, DoesNotReplaceAFileByItsLink) {

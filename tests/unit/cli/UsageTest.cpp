@@ -41,6 +41,14 @@ TEST(UsageTest, WrongCommandLinesExitWithTwo) {
         {"sim", "--node", "x"},
         {"sim", "--node", "1", "--node", "1"},
         {"sim", "--fault", "nonsense"},
+        {"sim", "--baud", "0"},
+        {"sim", "--parity", "even"},
+        {"sim", "--turnaround", "fast"},
+        {"sim", "--turnaround", "11:20"},
+        {"sim", "--away", "0/0"},
+        {"sim", "--dead", "11"},
+        {"sim", "--refuse", "HREG"},
+        {"sim", "--refuse", "11:HREG:1"},
     };
     for (const auto& words : rows) {
         const Outcome outcome = mrtu(words);
