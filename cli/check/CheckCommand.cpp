@@ -10,6 +10,7 @@
 #include "cli/describe/OfflineDriver.h"
 #include "lint/LintConfig.h"
 #include "lint/LintTags.h"
+#include "lint/LintTimeouts.h"
 #include "settings/FileReader.h"
 
 namespace cli {
@@ -80,6 +81,7 @@ Report check(const Options& options, const std::string& plugin) {
     if (report.configAccepted) {
         checkTags(driver.protocol(), lint::surroundingsOf(text, description), tags,
                   report.findings);
+        append(report.findings, lint::lintTimeouts(config, description, tags));
     } else {
         report.findings.push_back(
             lint::configRefusal(config, description, driver.protocol().GetLastErrorString()));

@@ -60,6 +60,15 @@ class CheckCommandTest : public testing::Test {
     fs::path directory_;
 };
 
+TEST_F(CheckCommandTest, ATimeoutThatCutsRepliesIsNamedWhereItMatters) {
+    const std::string hasty = kGood + "timeout=100\n";
+    EXPECT_EQ("", rules(kGood, {}));
+    EXPECT_EQ("short-timeout ", rules(hasty, {}));
+    EXPECT_EQ("short-timeout ", rules(hasty, {"1?HREG?400001?unsignedShort-125"}));
+    EXPECT_EQ("short-timeout ", rules(hasty, {"1?INP?100001?boolean-2000"}));
+    EXPECT_EQ("", rules(hasty, {"1?HREG?400001?unsignedShort", "1?OUTP?1?boolean-8"}));
+}
+
 TEST_F(CheckCommandTest, CleanConfigurationAndTagsAreClean) {
     const Outcome outcome =
         check(kGood, {"--strict", "1?HREG?400001?unsignedShort", "1?OUTP?1?boolean-8"});
