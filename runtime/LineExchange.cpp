@@ -63,7 +63,7 @@ bool LineExchange::clearToSend(ByteView request) {
         if (departure.kind == Departure::Kind::Now) return true;
         const bool last = departure.kind == Departure::Kind::Not || now >= giveUpAt;
         const Transfer came =
-            last ? input_.look() : input_.await(std::min(departure.when, giveUpAt));
+            waitedBefore && last ? input_.look() : input_.await(std::min(departure.when, giveUpAt));
         if (came == Transfer::Gone) return true;  // The sending will find it out.
         bookStrays();
         if (last) break;

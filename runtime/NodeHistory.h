@@ -32,7 +32,7 @@ class NodeHistory {
     void heard(TimePoint now, Duration known, Duration suspected);
     /// All that was owed has come, so that what was suspected was so.
     void confirm();
-    /// What was owed did not come.
+    /// What was suspected was not so.
     void dismiss() { suspected_ = Duration{0}; }
 
     /// How long the node must be silent before nothing can come any more: twice the largest

@@ -34,7 +34,9 @@ Departure OwedReplies::before(ByteView request, TimePoint now) {
     const Node& node = nodes_[*addressee];
     if (!isRepetition(request) && !couldMistake(request, *addressee)) return {};
     const TimePoint silentAt = node.history.silentAt();
-    if (node.returning && now < silentAt) return {Departure::Kind::Not, silentAt};
+    if (node.returning && now < silentAt) {
+        return {Departure::Kind::Not, std::min(silentAt, now + node.history.timeout())};
+    }
     const bool sendsOnce = node.repeats == 0;
     if (sendsOnce && isRepetition(request)) return {};
     if (sendsOnce && !node.awaited && !node.returning) return {};
@@ -174,7 +176,6 @@ void OwedReplies::forgetExpired(TimePoint now) {
         if (nodes_[node].history.lastHeard() <= older_[i].first) nodes_[node].awaited = false;
         older_.erase(older_.begin() + static_cast<std::ptrdiff_t>(i));
         if (owesNothing(node)) {
-            nodes_[node].history.dismiss();
             settle(node);
         }
     }
@@ -218,8 +219,10 @@ void OwedReplies::giveUp(std::uint8_t number) {
     older_.erase(std::remove_if(older_.begin(), older_.end(), forget), older_.end());
     forget(latest_);
     node.awaited = answeredSince || node.returning;
+    // What a node that was dead seems to have taken is the time that it was dead for. Elsewhere a
+    // suspicion costs little, and may be right.
+    if (node.returning) node.history.dismiss();
     if (node.repeats > 0) --node.repeats;
-    node.history.dismiss();
     settle(number);
 }
 

@@ -20,7 +20,8 @@ struct Departure {
     enum class Kind : std::uint8_t {
         Now,
         Later,  ///< Not before the line has been silent until `when`; then ask again.
-        Not,    ///< Its reply could not be told from others', for longer than anybody should wait.
+        Not,    ///< Its reply could not be told from others', for longer than anybody should wait:
+                ///< unless that has changed at `when`, no later than an answer would be waited for.
     };
     Kind kind = Kind::Now;
     Line::TimePoint when{};

@@ -81,14 +81,23 @@ TEST_F(OwedRepliesTest, WaitEndsAfterTwiceTheTimeoutOfSilence) {
     EXPECT_EQ(1u, book.counts().forgotten);
 }
 
-TEST_F(OwedRepliesTest, WhatWasOnlySuspectedIsForgottenWithTheReply) {
+TEST_F(OwedRepliesTest, WhatWasSuspectedStaysSuspectedWithoutProof) {
     nodeAnswers(0ms);
     send(kA, 20ms);
     send(kA, 120ms);
     arrive(kReply, 130ms);
     ASSERT_EQ(Kind::Now, before(kB, 350ms));
     send(kB, 350ms);
-    EXPECT_EQ(at(350ms + 2 * kTimeout), book.before(kA, at(450ms)).when);
+    EXPECT_EQ(at(350ms + 2 * 110ms), book.before(kA, at(450ms)).when);
+}
+
+TEST_F(OwedRepliesTest, NodeThatReturnsIsNotTakenForAsSlowAsItWasDead) {
+    send(kA, 0ms);
+    send(kB, 1'000ms);
+    arrive(kReply, 1'010ms);
+    ASSERT_EQ(Kind::Now, before(kB, 1'010ms + 2 * 1'010ms));
+    send(kB, 3'100ms);
+    EXPECT_EQ(at(3'100ms + 2 * kTimeout), book.before(kA, at(3'200ms)).when);
 }
 
 TEST_F(OwedRepliesTest, SlowNodeIsWaitedForTwiceItsLargestTurnaround) {
@@ -142,6 +151,7 @@ TEST_F(OwedRepliesTest, NodeThatReturnsIsRefusedUntilItIsSilent) {
     arrive(kReply, 150ms);
     EXPECT_EQ(Kind::Not, before(kB, 200ms));
     EXPECT_EQ(Kind::Not, before(kA, 200ms));
+    EXPECT_EQ(at(200ms + kTimeout), book.before(kA, at(200ms)).when);
     EXPECT_EQ(Kind::Now, before(kLong, 200ms));
     EXPECT_EQ(Kind::Now, before(kB, 150ms + 2 * 150ms));
     send(kB, 450ms);
