@@ -8,14 +8,12 @@
 
 #include "cli/CommandParser.h"
 #include "cli/Commands.h"
+#include "cli/Results.h"
 #include "cli/UsageErrors.h"
 #include "cli/UsageText.h"
-#include "values/JsonValues.h"
 
 namespace cli {
 namespace {
-
-using values::Json;
 
 constexpr const char* kNoCommand = "what shall be done? mrtu --help lists the commands";
 
@@ -99,13 +97,6 @@ bool wantsJson(int argc, const char* const* argv) {
                        [](const char* word) { return std::string_view(word) == "--json"; });
 }
 
-/// The document of a command that ended before it had one of its own.
-std::string errorDocument(ExitCode code, const CommandContext& context) {
-    const Json document{{"exitCode", static_cast<int>(code)}, {"errors", context.complaints}};
-    // Complaints quote words and file names, which may hold any bytes.
-    return document.dump(-1, ' ', false, Json::error_handler_t::replace) + '\n';
-}
-
 /// Nothing reaches `out` before the command's end: half a document would be none.
 ExitCode runForJson(int argc, const char* const* argv, std::ostream& out, std::ostream& err) {
     std::ostringstream document;
@@ -113,7 +104,7 @@ ExitCode runForJson(int argc, const char* const* argv, std::ostream& out, std::o
         .out = document, .err = err, .exitCode = ExitCode::Done, .pluginOption = {}};
     const ExitCode code = runCommand(argc, argv, context);
     const std::string text = document.str();
-    out << (text.empty() ? errorDocument(code, context) : text);
+    out << (text.empty() ? errorDocument(code, context.complaints) : text);
     return code;
 }
 

@@ -5,6 +5,7 @@
 
 #include <ostream>
 
+#include "values/JsonValues.h"
 #include "values/Values.h"
 
 namespace cli {
@@ -16,21 +17,35 @@ using values::ValueShape;
 
 const std::string kNoReason = "refused";
 
+/// In one line. URIs, complaints and file names may hold any bytes.
+std::string dumped(const Json& document) {
+    return document.dump(-1, ' ', false, Json::error_handler_t::replace);
+}
+
 }  // namespace
 
 void Results::value(const std::string& uri, ValueShape shape, ByteView value) {
+    this->value(uri, shape, value, false);
+}
+
+void Results::value(const std::string& uri, ValueShape shape, ByteView value, bool broadcast) {
     if (json_) {
-        array_.push_back({{"uri", uri},
-                          {"type", values::typeName(shape)},
-                          {"value", values::jsonValue(shape, value)}});
+        Json object{{"uri", uri},
+                    {"type", values::typeName(shape)},
+                    {"value", values::jsonValue(shape, value)}};
+        if (broadcast) object["broadcast"] = true;
+        member(object);
     } else {
         context_.out << uri << " = " << values::formatValue(shape, value) << '\n';
     }
 }
 
+void Results::member(const Json& object) {
+    members_.push_back(dumped(object));
+}
+
 void Results::broadcast(const std::string& uri, ValueShape shape, ByteView value) {
-    this->value(uri, shape, value);
-    if (json_) array_.back()["broadcast"] = true;
+    this->value(uri, shape, value, true);
     complain(context_, uri + ": a broadcast: no answer is expected");
 }
 
@@ -40,7 +55,7 @@ void Results::failure(const std::string& uri, const Failure& failure) {
     // The driver's own areas refuse a value without a word.
     const std::string& text = error.text.empty() ? kNoReason : error.text;
     if (json_) {
-        array_.push_back({{"uri", uri}, {"error", {{"code", error.code}, {"text", text}}}});
+        member({{"uri", uri}, {"error", {{"code", error.code}, {"text", text}}}});
     } else {
         complain(context_, fmt::format("{}: error {}: {}", uri, error.code, text));
     }
@@ -50,13 +65,16 @@ void Results::finish() {
     context_.exitCode = first_.code();
     if (!json_) return;
     // One line for each tag: short enough to read, and long arrays do not run down the screen.
-    constexpr auto kReplace = Json::error_handler_t::replace;  // A URI may hold any bytes.
     const char* separator = "[\n  ";
-    for (const Json& result : array_) {
-        context_.out << separator << result.dump(-1, ' ', false, kReplace);
+    for (const std::string& result : members_) {
+        context_.out << separator << result;
         separator = ",\n  ";
     }
     context_.out << "\n]\n";
+}
+
+std::string errorDocument(ExitCode code, const std::vector<std::string>& complaints) {
+    return dumped({{"exitCode", static_cast<int>(code)}, {"errors", complaints}}) + '\n';
 }
 
 }  // namespace cli

@@ -2,10 +2,11 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 #include "cli/Command.h"
 #include "cli/Session.h"
-#include "values/JsonValues.h"
+#include "values/Json.h"
 #include "values/LittleEndian.h"
 #include "values/ValueTypes.h"
 
@@ -30,10 +31,17 @@ class Results {
     void finish();
 
   private:
+    void value(const std::string& uri, values::ValueShape shape, values::ByteView value,
+               bool broadcast);
+    void member(const values::Json& object);
+
     CommandContext& context_;
     bool json_;
-    values::Json array_ = values::Json::array();
+    std::vector<std::string> members_;
     FirstFailure first_;
 };
+
+/// @return the JSON document of a command that ended before it had one of its own.
+std::string errorDocument(ExitCode code, const std::vector<std::string>& complaints);
 
 }  // namespace cli

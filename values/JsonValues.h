@@ -3,13 +3,11 @@
 
 #include <nlohmann/json.hpp>
 
+#include "values/Json.h"
 #include "values/LittleEndian.h"
 #include "values/ValueTypes.h"
 
 namespace values {
-
-/// The order of the members is the order of their creation.
-using Json = nlohmann::ordered_json;
 
 /// @param value  Run-time form, shape.bytes bytes.
 /// @return true or false, a number, an array, or a text. Infinite reals and NaNs are texts, as are

@@ -20,8 +20,6 @@ using lint::Findings;
 using lint::Severity;
 using lint::TagLine;
 
-using values::Json;
-
 struct Options {
     std::string configFile;
     std::string tagsFile;
@@ -109,12 +107,7 @@ void print(const Report& report, bool json, std::ostream& out) {
         out << findingsText(report.findings) << summary(report) << '\n';
         return;
     }
-    const Json object{{"errors", lint::countOf(report.findings, Severity::Error)},
-                      {"warnings", lint::countOf(report.findings, Severity::Warning)},
-                      {"tagsChecked", report.configAccepted ? report.tags : 0},
-                      {"findings", findingsJson(report.findings)}};
-    // File names and texts may be anything; what is not UTF-8 is shown as such.
-    out << object.dump(2, ' ', false, Json::error_handler_t::replace) << '\n';
+    out << reportDocument(report.findings, report.configAccepted ? report.tags : 0);
 }
 
 constexpr const char* kFooter = R"(

@@ -3,6 +3,7 @@
 
 #include <fmt/format.h>
 
+#include "values/JsonValues.h"
 #include "values/TextEscapes.h"
 
 namespace cli {
@@ -45,6 +46,15 @@ Json findingsJson(const Findings& findings) {
                         {"suggestion", finding.suggestion}});
     }
     return json;
+}
+
+std::string reportDocument(const Findings& findings, std::size_t tagsChecked) {
+    const Json object{{"errors", lint::countOf(findings, Severity::Error)},
+                      {"warnings", lint::countOf(findings, Severity::Warning)},
+                      {"tagsChecked", tagsChecked},
+                      {"findings", findingsJson(findings)}};
+    // File names and texts may be anything; what is not UTF-8 is shown as such.
+    return object.dump(2, ' ', false, Json::error_handler_t::replace) + '\n';
 }
 
 ExitCode verdictOf(const Findings& findings, bool warningsCount) {

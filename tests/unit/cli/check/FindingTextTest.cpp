@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "values/JsonValues.h"
+
 namespace cli {
 namespace {
 
