@@ -76,12 +76,17 @@ struct Session::Parts {
           plugin(pluginFile(context)),
           storage(openOverrides(context, options, need)),
           simulator(makeSimulator(options, configText)),
-          tracing(serial, watcher(portGone, context.err, options, isAscii(configText))),
+          watch(watcher(portGone, context.err, options, isAscii(configText))),
+          tracing(serial, watch),
           host(multiTask, tracing, storage.get()),
           channel(makeProtocol(plugin, host, options.protocol)) {
         serial.setGapFloor(options.minGapMs);
         serial.setFrameEnd(frameEndOf(options));
         serial.setReplyRules(std::make_shared<runtime::ModbusReplies>());
+        serial.setThrownAway([this](const std::string& port, runtime::ByteView frame) {
+            watch({runtime::TraceDirection::Received, port, std::chrono::steady_clock::now(),
+                   std::chrono::system_clock::now(), frame, true, true});
+        });
         serial.setReport([this](const std::string& text) { complain(context, text); });
         for (const PortMapping& port : ports)
             mapPort(port);
@@ -102,6 +107,7 @@ struct Session::Parts {
     runtime::PosixMultiTask multiTask;
     runtime::PosixSerialFactory serial;
     bool portGone = false;
+    runtime::TracingSerialFactory::Callback watch;
     runtime::TracingSerialFactory tracing;
     runtime::ServiceFactory host;
     runtime::Channel channel;

@@ -37,7 +37,12 @@ ByteView withoutLineEnd(ByteView bytes) {
 std::string TraceText::lineOf(const runtime::TraceEvent& event) {
     const bool sent = event.direction == runtime::TraceDirection::Sent;
     return fmt::format("{} {} {} {}{}", timeOfDay(event.realTime), event.port, sent ? '>' : '<',
-                       frameOf(event.bytes), event.complete ? meaningOf(event) : " (cut)");
+                       frameOf(event.bytes), endOf(event));
+}
+
+std::string TraceText::endOf(const runtime::TraceEvent& event) {
+    if (!event.complete) return " (cut)";
+    return event.late ? " (late, thrown away)" : meaningOf(event);
 }
 
 std::string TraceText::frameOf(ByteView bytes) const {

@@ -24,11 +24,12 @@ class TraceText {
 
     /// @return one line without its end: local time of day, port, ">" (sent) or "<" (received), the
     /// frame. `14:03:07.123 com1 > 01 03 00 00 00 01 84 0A`; a frame that was cut short ends in
-    /// " (cut)", any other with its meaning where that is wanted:
-    /// ` | node 1: read 1 holding register at 0`.
+    /// " (cut)", one that the port threw away in " (late, thrown away)", any other with its meaning
+    /// where that is wanted: ` | node 1: read 1 holding register at 0`.
     std::string lineOf(const runtime::TraceEvent& event);
 
   private:
+    std::string endOf(const runtime::TraceEvent& event);
     std::string frameOf(values::ByteView bytes) const;
     std::string meaningOf(const runtime::TraceEvent& event);
 

@@ -4,8 +4,10 @@
 
 namespace runtime {
 
-void CutReply::keep(ByteView start, Line::TimePoint now) {
-    length_ = start.size() <= kRoom ? start.size() : 0;
+void CutReply::keep(ByteView start, std::size_t whole, Line::TimePoint now) {
+    const bool isCut = start.size() < whole && whole <= kRoom;
+    length_ = isCut ? start.size() : 0;
+    lacking_ = isCut ? whole - start.size() : 0;
     std::copy_n(start.begin(), length_, bytes_.begin());
     at_ = now;
 }

@@ -17,9 +17,11 @@ class CutReply {
     /// Holds the longest frame of serial Modbus in ASCII with room to spare.
     static constexpr std::size_t kRoom = 520;
 
-    void keep(ByteView start, Line::TimePoint now);
+    /// @param whole  The length of the whole frame; a frame that is not shorter is not kept.
+    void keep(ByteView start, std::size_t whole, Line::TimePoint now);
     void forget() { length_ = 0; }
     bool isEmpty() const { return length_ == 0; }
+    std::size_t lacking() const { return lacking_; }
 
     /// @return start and rest as one frame, valid until the next call; empty when they are longer
     /// than any frame.
@@ -30,6 +32,7 @@ class CutReply {
   private:
     std::array<std::uint8_t, kRoom> bytes_{};
     std::size_t length_ = 0;
+    std::size_t lacking_ = 0;
     Line::TimePoint at_{};
 };
 

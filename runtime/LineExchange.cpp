@@ -196,11 +196,12 @@ ByteView LineExchange::front() const {
 /// Books the frame that the input begins with. @return whether it may be handed out; else it is
 /// thrown away.
 bool LineExchange::frontIsForLatest() {
-    const ByteView frame = front();
-    const bool deliver = !completesCutReply(frame) && book_->arrived(frame, input_.lastArrival()) ==
-                                                          OwedReplies::Verdict::Deliver;
+    const std::size_t rest = takeRestOfCutReply();
+    const ByteView frame = rest > 0 ? input_.bytes().first(rest) : front();
     whole_ = frame.size();
-    if (deliver) return true;
+    if (rest == 0 && book_->arrived(frame, input_.lastArrival()) == OwedReplies::Verdict::Deliver) {
+        return true;
+    }
     if (options_.thrownAway) options_.thrownAway(frame);
     dropInput(whole_);
     return false;
@@ -213,9 +214,11 @@ void LineExchange::bookStrays() {
         untilFrameEnd(LineInput::kRoom, now + kLongestStray, input_.lastArrival() + gap_);
     }
     while (!input_.bytes().empty()) {
-        const std::size_t known = book_->frontFrame(input_.bytes());
+        const std::size_t rest = takeRestOfCutReply();
+        const std::size_t known = rest > 0 ? rest : book_->frontFrame(input_.bytes());
         const ByteView frame = known > 0 ? input_.bytes().first(known) : input_.bytes();
-        if (!completesCutReply(frame)) book_->arrivedLate(frame, input_.lastArrival());
+        if (rest == 0) book_->arrivedLate(frame, input_.lastArrival());
+        if (delivered_ == 0 && options_.thrownAway) options_.thrownAway(frame);
         dropInput(frame.size());
     }
 }
@@ -223,18 +226,19 @@ void LineExchange::bookStrays() {
 /// The driver has what it wanted of a frame.
 void LineExchange::closeFrame() {
     const ByteView frame = input_.bytes().first(delivered_);
-    if (book_ && !frame.empty() && whole_ == 0 && !completesCutReply(frame)) {
+    if (book_ && !frame.empty() && whole_ == 0 && takeRestOfCutReply() == 0) {
         book_->arrived(frame, input_.lastArrival());
-        const bool isShort = options_.rules->replyLength(book_->latest(), frame) > frame.size();
-        if (isShort) cut_.keep(frame, input_.lastArrival());
+        cut_.keep(frame, options_.rules->replyLength(book_->latest(), frame), input_.lastArrival());
     }
     dropInput(delivered_);
 }
 
-/// Whether a frame is the rest of the one before it, which a pause has cut off.
-bool LineExchange::completesCutReply(ByteView frame) {
-    if (cut_.isEmpty()) return false;
-    const ByteView joined = cut_.joined(frame);
+/// Books the frame before together with its rest, which a pause has cut off and which the input
+/// begins with. @return the rest's bytes; 0 when it is none.
+std::size_t LineExchange::takeRestOfCutReply() {
+    if (cut_.isEmpty()) return 0;
+    const std::size_t lacking = std::min(cut_.lacking(), input_.bytes().size());
+    const ByteView joined = cut_.joined(input_.bytes().first(lacking));
     const TimePoint now = input_.lastArrival();
     const bool fits = options_.rules->answers(book_->latest(), joined) == Answer::Yes;
     if (fits) book_->arrivedLate(joined, now);
@@ -242,7 +246,7 @@ bool LineExchange::completesCutReply(ByteView frame) {
         options_.report(cutAdvice(options_.port, gap_, cut_.pauseUntil(now)));
     }
     cut_.forget();
-    return fits;
+    return fits ? lacking : 0;
 }
 
 void LineExchange::reportLate() {

@@ -35,7 +35,7 @@ struct ExchangeOptions {
     /// Told what people should know, each thing once: a node that answers later than is waited
     /// for, replies that are cut by pauses. Called on the thread that uses the port.
     std::function<void(const std::string&)> report;
-    /// Shown each frame that came for an older request and was thrown away.
+    /// Shown each frame that was thrown away before anybody had a byte of it.
     std::function<void(ByteView)> thrownAway;
 };
 
@@ -109,7 +109,7 @@ class LineExchange {
     bool frontIsForLatest();
     void bookStrays();
     void closeFrame();
-    bool completesCutReply(ByteView frame);
+    std::size_t takeRestOfCutReply();
     void reportLate();
 
     Line& line_;

@@ -23,7 +23,8 @@ struct TraceEvent {
     std::chrono::steady_clock::time_point monotonic;  ///< Sent: before sending; received: at its
     std::chrono::system_clock::time_point realTime;   ///< first byte.
     std::span<const std::uint8_t> bytes;
-    bool complete;  ///< false for a send that failed and a reply cut short by a vanished port.
+    bool complete;      ///< false for a send that failed and a reply cut short by a vanished port.
+    bool late = false;  ///< An older request's reply, which the port threw away.
 };
 
 struct TraceCounts {

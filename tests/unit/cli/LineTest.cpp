@@ -106,11 +106,12 @@ TEST(LineTest, AReplyThatAPauseHasCutIsAnsweredWithAdviceOnce) {
 
 TEST(LineTest, ALateNodeIsNamedWithTheTimeoutToSetAndDeliversNoOthersValue) {
     const RunningSim line({"--fault", "delay=150,times=99"});
-    const Outcome outcome = readOn(line, {"--timeout", "100", "--set", "repeat=2"},
+    const Outcome outcome = readOn(line, {"--timeout", "100", "--set", "repeat=2", "--trace"},
                                    {"1?HREG?400001?unsignedShort", "1?HREG?400002?unsignedShort",
                                     "1?HREG?400003?unsignedShort"});
     EXPECT_THAT(outcome.err, HasSubstr("mrtu: com1: node 1 answers up to "));
     EXPECT_THAT(outcome.err, HasSubstr("set the timeout to "));
+    EXPECT_THAT(outcome.err, HasSubstr(" (late, thrown away)\n"));
     // Whatever is printed is the register's own.
     for (const char* const wrong : {"400001?unsignedShort = 1001", "400001?unsignedShort = 1002",
                                     "400002?unsignedShort = 1000", "400002?unsignedShort = 1002",

@@ -43,6 +43,13 @@ TEST_F(TraceTextTest, TellsThatAFrameWasCutShort) {
               lineOf({.meaning = true}, TraceDirection::Received, Bytes{0x01}, false));
 }
 
+TEST_F(TraceTextTest, TellsThatAFrameCameLate) {
+    const Bytes bytes{0x01};
+    EXPECT_EQ(
+        "01:46:40.007 com1 < 01 (late, thrown away)",
+        cli::TraceText({}).lineOf({TraceDirection::Received, port_, {}, at_, bytes, true, true}));
+}
+
 TEST_F(TraceTextTest, ShowsAsciiFramesAsCharacters) {
     const TraceStyle ascii{.ascii = true};
     EXPECT_EQ("01:46:40.007 com1 > :010300000001FB",

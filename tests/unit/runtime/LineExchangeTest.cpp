@@ -201,6 +201,16 @@ TEST_F(LineExchangeTest, RestOfACutReplyIsNotHandedOutAsTheRepetitionsReply) {
     EXPECT_EQ(kReplyA, exchange(kA));
 }
 
+TEST_F(LineExchangeTest, RestOfACutReplyIsKnownAlsoRightBeforeTheRepetitionsReply) {
+    arrive(20, {1, 2});
+    Bytes restAndReply{0x0A, 0x0A};
+    restAndReply.insert(restAndReply.end(), kReplyA.begin(), kReplyA.end());
+    arrive(60, restAndReply);
+    EXPECT_EQ((Bytes{1, 2}), exchange(kA));
+    EXPECT_EQ(kReplyA, exchange(kA));
+    EXPECT_THAT(reports, ElementsAre(HasSubstr("--min-gap")));
+}
+
 TEST_F(LineExchangeTest, LateReplyIsThrownAwayAndTheWaitGoesOn) {
     arrive(5, kReplyA);
     ASSERT_EQ(kReplyA, exchange(kA));
