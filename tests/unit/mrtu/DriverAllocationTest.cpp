@@ -141,4 +141,49 @@ TEST_F(DriverAllocationTest, SecondRequestOfANodeWithALongNumber) {
     EXPECT_EQ(0U, costOfRead(tag("1000000001?HREG?400001?short"), 1)) << "low byte 1";
 }
 
+// Above the requests: the values of large tags take one or two buffers, given back at once.
+TEST_F(DriverAllocationTest, WholeTagsTakeBuffersByTheirSize) {
+    struct Row {
+        const char* uri;
+        Bytes read;     // the reply without its check
+        Bytes written;  // the same of a write
+        std::size_t costOfRead;
+        std::size_t costOfWrite;
+    };
+    const Row rows[] = {
+        {"1?HREG?400001?short", hex("01 03 02 00 01"), hex("01 10 00 00 00 01"), 0, 0},
+        {"1?HREG?400001?short-32", hex("01 03 40") + Bytes(64, 1), hex("01 10 00 00 00 20"), 0, 0},
+        {"1?HREG?400001?short-33", hex("01 03 42") + Bytes(66, 1), hex("01 10 00 00 00 21"), 1, 0},
+        {"1?HREG?400001?short-123", hex("01 03 F6") + Bytes(246, 1), hex("01 10 00 00 00 7B"), 1,
+         0},
+        {"1?OUTP?1?boolean-1968", hex("01 01 F6") + Bytes(246, 1), hex("01 0F 00 00 07 B0"), 2, 1},
+    };
+    start("");
+    Bytes value(2000, 1);
+    for (const Row& row : rows) {
+        const Tag_MRTU* const whole = tag(row.uri);
+        port.setReply(rtuFrame(row.read));
+        // Each is given back: twice as many calls.
+        EXPECT_EQ(2 * row.costOfRead, costOf([&] { return driver.Read(whole, value.data()) != 0; }))
+            << row.uri;
+        port.setReply(rtuFrame(row.written));
+        EXPECT_EQ(2 * row.costOfWrite,
+                  costOf([&] { return driver.Write(whole, value.data()) != 0; }))
+            << row.uri;
+    }
+}
+
+TEST_F(DriverAllocationTest, TheLargestReadsTakeOneBufferOfRegistersAndTwoOfCoils) {
+    start("");
+    Bytes value(2000, 1);
+    const auto cost = [&](const char* uri) {
+        const Tag_MRTU* const whole = tag(uri);
+        return costOf([&] { return driver.Read(whole, value.data()) != 0; });
+    };
+    port.setReply(rtuFrame(hex("01 03 FA") + Bytes(250, 1)));
+    EXPECT_EQ(2U * 1, cost("1?HREG?400001?short-125"));
+    port.setReply(rtuFrame(hex("01 01 FA") + Bytes(250, 1)));
+    EXPECT_EQ(2U * 2, cost("1?OUTP?1?boolean-2000"));
+}
+
 }  // namespace
