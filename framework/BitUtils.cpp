@@ -1,6 +1,8 @@
 // Moves bits between packed buffers and buffers of one byte per bit.
 #include "framework/BitUtils.h"
 
+#include <algorithm>
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <functional>
@@ -54,6 +56,16 @@ class BitCursor {
 using Reader = BitCursor<const unsigned char>;
 using Writer = BitCursor<unsigned char>;
 
+using Nibble = std::array<unsigned char, 4>;
+
+constexpr auto kUnpackedNibbles = [] {
+    std::array<Nibble, 16> nibbles{};
+    for (std::size_t value = 0; value < nibbles.size(); ++value)
+        for (std::size_t bit = 0; bit < 4; ++bit)
+            nibbles[value][bit] = static_cast<unsigned char>(value >> bit & 1U);
+    return nibbles;
+}();
+
 // The bytes that a copy touches in one of its buffers.
 struct Extent {
     const unsigned char* begin;
@@ -104,9 +116,8 @@ void UnpackBits(unsigned char* dst, const unsigned char* src, int srcBit, int bi
     const auto one = [&] { *dst++ = from.take() ? 1 : 0; };
     const auto eight = [&] {
         const unsigned bits = from.takeEight();
-        for (int bit = 0; bit < kByteBits; ++bit)
-            dst[bit] = static_cast<unsigned char>(bits >> bit & 1U);
-        dst += kByteBits;
+        dst = std::copy_n(kUnpackedNibbles[bits & 0xFU].begin(), 4, dst);
+        dst = std::copy_n(kUnpackedNibbles[bits >> 4].begin(), 4, dst);
     };
     moveBits(from, bitCount, areApart(unpacked(dst, bitCount), packed(src, srcBit, bitCount)), one,
              eight);
