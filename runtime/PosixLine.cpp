@@ -10,6 +10,7 @@
 #include <cerrno>
 #include <ctime>
 #include <thread>
+#include <utility>
 
 namespace runtime {
 namespace {
@@ -29,7 +30,9 @@ timespec leftUntil(Line::TimePoint until) {
 }  // namespace
 
 WaitResult PosixLine::waitReadable(TimePoint until) {
-    return wait(POLLIN, until);
+    const WaitResult result = wait(POLLIN, until);
+    readable_ = result == WaitResult::Ready;
+    return result;
 }
 
 WaitResult PosixLine::waitWritable(TimePoint until) {
@@ -58,8 +61,17 @@ void PosixLine::sleepUntil(TimePoint until) {
     std::this_thread::sleep_until(until);
 }
 
+/// A read that finds nothing first waits for the kernel's worker, which may be just ending the last
+/// delivery: another 20 us and a wake-up. Asking how much is there does not wait. What can't be
+/// asked is read, which then tells why.
+bool PosixLine::isEmpty() const {
+    int waiting = 0;
+    return ::ioctl(fd_, FIONREAD, &waiting) == 0 && waiting == 0;
+}
+
 Moved PosixLine::read(std::span<std::uint8_t> buffer) {
     if (gone_) return {0, true};
+    if (!std::exchange(readable_, false) && isEmpty()) return {0, false};
     ssize_t got = 0;
     do {
         got = ::read(fd_, buffer.data(), buffer.size());

@@ -30,9 +30,11 @@ class PosixLine final : public Line {
 
   private:
     WaitResult wait(short event, TimePoint until);
+    bool isEmpty() const;
     Moved moved(long result);
 
     int fd_;
+    bool readable_ = false;  // The last wait has seen something to read.
     std::atomic<bool> gone_ = false;
 };
 
