@@ -92,12 +92,13 @@ class Transactions {
 
     bool read(Values& values) {
         if (!channel_.readInto(tag_, bytes_)) return false;
-        for (std::size_t index = 0; index < values.size(); ++index) {
-            values[index] =
-                work_.kind == Work::ReadCoils
-                    ? bytes_[index]
-                    : static_cast<std::uint16_t>(bytes_[2 * index] | bytes_[2 * index + 1] << 8);
+        if (work_.kind == Work::ReadCoils) {
+            values.assign(bytes_.begin(), bytes_.end());
+            return true;
         }
+        for (std::size_t index = 0; index < values.size(); ++index)
+            values[index] =
+                static_cast<std::uint16_t>(bytes_[2 * index] | bytes_[2 * index + 1] << 8);
         return true;
     }
 
