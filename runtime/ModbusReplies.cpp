@@ -27,30 +27,30 @@ std::optional<std::uint8_t> ModbusReplies::addressee(ByteView request) const {
 }
 
 std::size_t ModbusReplies::replyLength(ByteView request, ByteView received) const {
-    const auto asked = wire::requestIn(request);
+    const auto asked = wire::knownRequestIn(request);
     return asked ? wire::replyLength(*asked, received) : 0;
 }
 
 bool ModbusReplies::isWhole(ByteView request, ByteView received) const {
-    const auto asked = wire::requestIn(request);
+    const auto asked = wire::knownRequestIn(request);
     return asked && wire::isWholeReply(*asked, received);
 }
 
 Answer ModbusReplies::answers(ByteView request, ByteView frame) const {
-    const auto asked = wire::requestIn(request);
+    const auto asked = wire::knownRequestIn(request);
     return asked ? answerOf(wire::answering(*asked, frame)) : Answer::No;
 }
 
 bool ModbusReplies::confusable(ByteView one, ByteView other) const {
-    const auto first = wire::requestIn(one);
-    const auto second = wire::requestIn(other);
+    const auto first = wire::knownRequestIn(one);
+    const auto second = wire::knownRequestIn(other);
     return first && second && wire::confusable(*first, *second);
 }
 
 std::chrono::nanoseconds ModbusReplies::silence(ByteView request, int baud,
                                                 int characterBits) const {
     // Colon and line end separate the frames of the ASCII mode.
-    const auto asked = wire::requestIn(request);
+    const auto asked = wire::knownRequestIn(request);
     if (asked && asked->mode == wire::Mode::Ascii) return std::chrono::nanoseconds{0};
     return wire::silenceBetweenFrames({baud, characterBits});
 }

@@ -19,6 +19,7 @@ enum class Answer : std::uint8_t {
 };
 
 /// Knowledge of one protocol's requests and replies. Frames are as they travel, check included.
+/// REQUIRES: a request that has no addressee is asked for that and for its silence alone.
 /// Threads: any; an object has no state.
 class ReplyRules {
   public:

@@ -74,6 +74,14 @@ bool looksLikeAscii(ByteView bytes) {
            bytes[bytes.size() - 1] == '\n';
 }
 
+std::optional<Request> asciiRequestIn(ByteView frame) {
+    if (!looksLikeAscii(frame)) return std::nullopt;
+    MessageRoom room;
+    const ByteView message = messageIn(Mode::Ascii, frame, room);
+    if (message.empty()) return std::nullopt;
+    return requestOf(Mode::Ascii, message);
+}
+
 /// Node and function, then all that a write's reply can repeat.
 using HeadRoom = std::array<std::uint8_t, kHead + 2 + kLongRegisterBytes>;
 
@@ -152,14 +160,17 @@ bool sameGoodReplies(const Request& one, const Request& other) {
 }  // namespace
 
 std::optional<Request> requestIn(ByteView frame) {
+    if (const auto request = asciiRequestIn(frame)) return request;
     MessageRoom room;
-    if (looksLikeAscii(frame)) {
-        const ByteView message = messageIn(Mode::Ascii, frame, room);
-        if (!message.empty()) return requestOf(Mode::Ascii, message);
-    }
     const ByteView message = messageIn(Mode::Rtu, frame, room);
     if (message.empty()) return std::nullopt;
     return requestOf(Mode::Rtu, message);
+}
+
+std::optional<Request> knownRequestIn(ByteView frame) {
+    if (const auto request = asciiRequestIn(frame)) return request;
+    if (frame.size() < frameLength(Mode::Rtu, kHead)) return std::nullopt;
+    return requestOf(Mode::Rtu, frame.first(frame.size() - frameLength(Mode::Rtu, 0)));
 }
 
 std::size_t replyLength(const Request& request, ByteView received) {

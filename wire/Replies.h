@@ -38,6 +38,11 @@ struct Request {
 /// @return nothing when it is neither.
 std::optional<Request> requestIn(ByteView frame);
 
+/// The same for a frame of which requestIn() has made a request before: the CRC, which costs more
+/// than all the rest, is not reckoned again. Of another frame it makes a request that means
+/// nothing.
+std::optional<Request> knownRequestIn(ByteView frame);
+
 /// @param received  What has come of the reply so far, also nothing.
 /// @return how long the reply's frame is at least: exactly so long once its third byte is there.
 /// 0 when nobody answers, when `received` is no reply's beginning, or when the request's row is

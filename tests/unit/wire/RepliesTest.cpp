@@ -248,5 +248,24 @@ TEST(RepliesTest, ARequestLaidOutOtherwiseIsLikeAnotherFunction) {
     }
 }
 
+TEST(RepliesTest, AKnownRequestSaysTheSameWithoutItsCrc) {
+    for (const Mode mode : kModes) {
+        for (const auto& [request, reply] : kExchanges) {
+            Bytes frame = encodeFrame(mode, request);
+            const Request asked = requestIn(frame).value();
+            if (mode == Mode::Rtu) frame.back() ^= 0xFFU;
+            const auto known = knownRequestIn(frame);
+            ASSERT_TRUE(known) << nameOf(mode, request);
+            EXPECT_EQ(std::tie(asked.mode, asked.node, asked.function, asked.row, asked.fields,
+                               asked.fieldCount),
+                      std::tie(known->mode, known->node, known->function, known->row, known->fields,
+                               known->fieldCount))
+                << nameOf(mode, request);
+        }
+    }
+    EXPECT_FALSE(knownRequestIn({}));
+    EXPECT_FALSE(knownRequestIn(Bytes(3, 0)));
+}
+
 }  // namespace
 }  // namespace wire
