@@ -158,5 +158,13 @@ TEST(OtherNodesTest, AnAnswerThatIsSentForEverEndsEachAccess) {
     }
 }
 
+// What the tests with rules are worth.
+TEST(OtherNodesTest, ALateNodeDeliversAnothersValueEachTimeWithoutRules) {
+    Cell cell{.latencyMs = 120, .knowsReplies = false};
+    const Tally tally = run(cell);
+    EXPECT_EQ(1, tally.right);
+    EXPECT_EQ(39, tally.wrong);
+}
+
 }  // namespace
 }  // namespace slow

@@ -94,13 +94,5 @@ TEST_P(SlowNodesTest, AreReadAndWrittenAllTheSameWhenARepetitionWaitsLongEnough)
 
 INSTANTIATE_TEST_SUITE_P(Works, SlowNodesTest, testing::ValuesIn(kWorks));
 
-// What the tests above are worth.
-TEST(SlowNodesWithoutRulesTest, DeliverAnotherRequestsValueEachTime) {
-    Cell cell{.latencyMs = 120, .knowsReplies = false};
-    const Tally tally = run(cell);
-    EXPECT_EQ(1, tally.right);
-    EXPECT_EQ(39, tally.wrong);
-}
-
 }  // namespace
 }  // namespace slow
