@@ -1,28 +1,32 @@
-// What a read costs on the line.
+// What reads cost on a line. Pure.
 #pragma once
 
 #include <chrono>
+#include <cstddef>
 #include <map>
 
-#include "wire/Times.h"
+#include "poll/ReadCost.h"
+#include "wire/TransactionCost.h"
 
 namespace poll {
 
-/// The line, and what is known of each node. Values are set by whoever makes the plan.
+/// A line, and what is known of its nodes.
 struct CostModel {
     wire::LineRate rate{9600};
     wire::Mode mode = wire::Mode::Rtu;
-    /// Characters of silence after which the driver takes a reply for complete; 0 where it knows
-    /// the length of the reply.
+    /// The silence by which the driver knows the end of a reply; 0 where the reply's length tells
+    /// it. The standard's silence between frames is kept in both cases.
     std::chrono::nanoseconds gapAfterReply{0};
-    /// What the driver waits before a request, by node.
+    /// What the driver waits in front of a request, by node; 0 for nodes that are not there.
     std::map<int, std::chrono::nanoseconds> delays;
-    /// From the end of a request to the first character of its reply, by node.
+    /// From the end of a request to its reply, as measured or assumed, by node.
     std::map<int, std::chrono::nanoseconds> turnarounds;
-    std::chrono::nanoseconds turnaround{0};  ///< Of the nodes that have none of their own.
+    std::chrono::nanoseconds turnaround{0};  ///< Of nodes that have none of their own.
 
-    /// Time of the line for a read of `items` items of `itemBytes` bytes (0: bits) in one request.
-    [[nodiscard]] std::chrono::nanoseconds ofRead(int node, long items, int itemBytes) const;
+    /// What one request for items of `itemBytes` bytes (0: bits) costs.
+    [[nodiscard]] ReadCost readCost(int node, int itemBytes) const;
+    /// Characters of one request and its reply.
+    [[nodiscard]] std::size_t readCharacters(long items, int itemBytes) const;
 };
 
 }  // namespace poll

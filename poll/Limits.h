@@ -11,25 +11,28 @@ namespace poll {
 /// Limits of one area of one node.
 struct AreaLimits {
     long mostItems = 125;  ///< Items of one request, 1..
-    long firstItem = 0;    ///< A request begins here at the earliest ...
-    long endItem = std::numeric_limits<long>::max();  ///< ... and ends in front of it.
+    long firstItem = 0;    ///< What begins in front of it, or ends behind the end, is refused.
+    long endItem = std::numeric_limits<long>::max();
+    bool onLine = true;  ///< false: an area of the driver's own; a read of it sends nothing.
 };
 
 /// Limits by node and area.
 class Limits {
   public:
-    /// What counts for areas that set() has not named: 2000 bits or 125 registers.
+    /// What counts for areas that set() has not named.
     /// Source: Modbus Application Protocol V1.1b3, 6.1 and 6.3.
-    static constexpr AreaLimits kBits{.mostItems = 2000};
-    static constexpr AreaLimits kRegisters{.mostItems = 125};
+    static constexpr long kMostBits = 2000;
+    static constexpr long kMostDataBytes = 250;
 
     void set(int node, const std::string& area, const AreaLimits& limits) {
         areas_[{node, area}] = limits;
     }
-    [[nodiscard]] AreaLimits of(int node, const std::string& area, bool bits) const {
+
+    /// @param itemBytes  Of one item; 0: a bit.
+    [[nodiscard]] AreaLimits of(int node, const std::string& area, int itemBytes) const {
         const auto found = areas_.find({node, area});
         if (found != areas_.end()) return found->second;
-        return bits ? kBits : kRegisters;
+        return {.mostItems = itemBytes == 0 ? kMostBits : kMostDataBytes / itemBytes};
     }
 
   private:

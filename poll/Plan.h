@@ -35,7 +35,8 @@ struct Block {
                                           ///< first of them begins the block.
     std::chrono::milliseconds period{0};  ///< The shortest of its tags.
     std::chrono::nanoseconds cost{0};     ///< One read on the line.
-    int requests = 1;                     ///< More than 1 only for a tag wider than a request.
+    int requests = 1;                     ///< More only for a tag wider than a request; 0 for the
+                                          ///< areas of the driver's own.
     long fillerItems = 0;                 ///< Items that no tag wanted.
     std::string reason;                   ///< For people: why it begins where it begins.
 };
