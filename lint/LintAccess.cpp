@@ -8,6 +8,7 @@
 #include "lint/NodeNumber.h"
 #include "lint/TagSpan.h"
 #include "settings/NumberText.h"
+#include "settings/ReadLimits.h"
 #include "values/ValueTypes.h"
 
 namespace lint {
@@ -20,11 +21,6 @@ constexpr std::size_t kNodeField = 0;
 constexpr std::size_t kAddressField = 2;
 constexpr std::size_t kTypeField = 3;
 constexpr int kBitsOfAByte = 8;
-
-/// The driver's own areas hold one value; it never goes over the line, whatever the node.
-bool isOfDriver(const AreaInfo& area) {
-    return area.readCount <= 1;
-}
 
 bool isOfBits(const TagFacts& facts) {
     return facts.type == ICU_Type::boolean || facts.type == ICU_Type::booleanArray;
@@ -45,20 +41,10 @@ void negativeSubIndex(const TagLine& tag, const TagSurroundings& /*around*/, Fin
                    "bits count from 0, the least significant one of the first item"});
 }
 
-/// The addresses that a model gives an area; the area's own ones where the model does not offer it.
-AreaOffer offerOf(const AreaInfo& area, const settings::ModelInfo* model) {
-    if (model != nullptr) {
-        for (const AreaOffer& offer : model->offers) {
-            if (offer.area == area.name) return offer;
-        }
-    }
-    return {area.name, area.min, area.max};
-}
-
 void outsideArea(const TagLine& tag, const TagSurroundings& around, Findings& out) {
     const AreaInfo* area = around.description.area(tag.area());
-    if (area == nullptr || isOfDriver(*area) || tag.facts->length <= 0) return;
-    const AreaOffer offer = offerOf(*area, around.modelOf(tag.facts->node));
+    if (area == nullptr || settings::isOfDriver(*area) || tag.facts->length <= 0) return;
+    const AreaOffer offer = settings::offerOf(*area, around.modelOf(tag.facts->node));
     const TagSpan span = tagSpan(*tag.facts, *area);
     if (span.endItem() <= offer.max - offer.min + 1) return;
     out.push_back(
@@ -71,7 +57,7 @@ void outsideArea(const TagLine& tag, const TagSurroundings& around, Findings& ou
 
 void unusableNode(const TagLine& tag, const TagSurroundings& around, Findings& out) {
     const AreaInfo* area = around.description.area(tag.area());
-    if (area != nullptr && isOfDriver(*area)) return;
+    if (area != nullptr && settings::isOfDriver(*area)) return;
     const std::string fault = nodeFault(settings::readNumber(tag.node()).value);
     if (fault.empty()) return;
     warn(out, "unusable-node", tag.placeOf(kNodeField), fault, kUsableNodes);

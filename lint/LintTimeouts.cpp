@@ -6,9 +6,10 @@
 #include <algorithm>
 #include <chrono>
 
-#include "lint/NodeValue.h"
 #include "lint/ReadLengths.h"
 #include "settings/ConfigText.h"
+#include "settings/LineFormat.h"
+#include "settings/NodeValue.h"
 #include "settings/NumberText.h"
 #include "wire/Times.h"
 
@@ -17,12 +18,9 @@ namespace {
 
 using settings::AreaInfo;
 using settings::Description;
+using settings::LineFormat;
+using settings::NodeValue;
 using settings::ScannedConfig;
-
-struct LineFormat {
-    wire::Mode mode;
-    wire::LineRate rate;
-};
 
 /// One timeout of the configuration and the longest reply that it must suffice for.
 struct Demand {
@@ -30,21 +28,6 @@ struct Demand {
     std::size_t characters = 0;
     std::string reply;  ///< "the reply to '...'"
 };
-
-long numberOf(const ScannedConfig& config, const char* key, long otherwise) {
-    const auto text = settings::itemOf(config, key);
-    return text ? settings::readNumber(*text).value : otherwise;
-}
-
-LineFormat formatOf(const ScannedConfig& config) {
-    const bool ascii = settings::itemOf(config, "txMode") == "ASCII";
-    const bool parity = settings::itemOf(config, "parity").value_or("even") != "none";
-    const long dataBits = ascii ? numberOf(config, "bits", 8) : 8;
-    const long bits = 1 + dataBits + (parity ? 1 : 0) + numberOf(config, "stopbits", 1);
-    return {ascii ? wire::Mode::Ascii : wire::Mode::Rtu,
-            {.baud = static_cast<int>(numberOf(config, "baudrate", 0)),
-             .characterBits = static_cast<int>(bits)}};
-}
 
 /// Rounded up, but not for the nanosecond that each part of a sum is rounded up by.
 long wholeMs(std::chrono::nanoseconds time) {
@@ -87,7 +70,7 @@ std::vector<Demand> demandsOfTags(const ScannedConfig& config, const Description
     for (const TagLine& tag : tags) {
         if (!tag.facts || !tag.wellFormed()) continue;
         const AreaInfo* area = description.area(tag.area());
-        const auto timeout = nodeValue(config, description, tag.facts->node, "timeout");
+        const auto timeout = settings::nodeValue(config, description, tag.facts->node, "timeout");
         if (area == nullptr || !timeout) continue;
         const long long bytes = longestReadOf(tag, *area, config, description);
         if (bytes <= 0) continue;
@@ -101,7 +84,7 @@ std::vector<Demand> demandsOfNodes(const ScannedConfig& config, const Descriptio
                                    wire::Mode mode) {
     std::vector<Demand> demands;
     for (const int node : settings::nodesOf(config)) {
-        const auto timeout = nodeValue(config, description, node, "timeout");
+        const auto timeout = settings::nodeValue(config, description, node, "timeout");
         if (!timeout) continue;
         long long bytes = 0;
         for (const AreaInfo& area : description.areas)
@@ -138,7 +121,7 @@ void judge(const Demand& demand, const LineFormat& line, const settings::Place& 
 Findings lintTimeouts(const ScannedConfig& config, const Description& description,
                       const std::vector<TagLine>& tags) {
     Findings out;
-    const LineFormat line = formatOf(config);
+    const LineFormat line = settings::lineFormatOf(config);
     const settings::ScannedItem* const rate = config.item("baudrate");
     if (rate == nullptr || line.rate.baud <= 0) return out;
     const std::vector<Demand> demands = tags.empty()

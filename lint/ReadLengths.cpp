@@ -2,42 +2,33 @@
 
 #include <algorithm>
 
-#include "lint/NodeValue.h"
 #include "lint/TagSpan.h"
-#include "values/ValueTypes.h"
+#include "settings/ReadLimits.h"
+#include "values/ItemSpan.h"
+#include "wire/TransactionCost.h"
 
 namespace lint {
 namespace {
 
-constexpr long long kBitsOfAByte = 8;
-
-/// Of an area of registers.
-long long itemBytes(const settings::AreaInfo& area) {
-    const values::ValueType* natural = values::typeNamed(area.naturalType);
-    return natural == nullptr ? 1 : natural->bytes;
-}
-
 long long bytesOf(long long items, const settings::AreaInfo& area) {
-    return isBitArea(area) ? (items + kBitsOfAByte - 1) / kBitsOfAByte : items * itemBytes(area);
+    const int itemBytes = values::itemBytesOf(area.naturalType);
+    const auto count = static_cast<std::size_t>(items);
+    return static_cast<long long>(itemBytes == 0 ? wire::packedBytes(count)
+                                                 : count * static_cast<std::size_t>(itemBytes));
 }
 
 /// The items that one request may carry.
 long long mostItems(const settings::AreaInfo& area, int node, const settings::ScannedConfig& config,
                     const settings::Description& description) {
-    if (area.readCount <= 1) return 0;
-    const bool bits = isBitArea(area);
-    const auto limit = nodeValue(config, description, node, bits ? "maxBitOptLen" : "maxOptLen");
-    if (!limit) return area.readCount;
-    const long long items = bits ? limit->value : limit->value / itemBytes(area);
-    return std::clamp<long long>(items, 0, area.readCount);
+    return settings::mostReadItems(area, values::itemBytesOf(area.naturalType), node, config,
+                                   description);
 }
 
 }  // namespace
 
 std::size_t replyCharacters(wire::Mode mode, long long dataBytes) {
     // Node, function and byte count stand in front of the data.
-    const auto message = static_cast<std::size_t>(1 + 1 + 1 + dataBytes);
-    return mode == wire::Mode::Rtu ? message + 2 : 1 + 2 * (message + 1) + 2;
+    return wire::frameLength(mode, static_cast<std::size_t>(1 + 1 + 1 + dataBytes));
 }
 
 long long longestRead(const settings::AreaInfo& area, int node,

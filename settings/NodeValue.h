@@ -6,17 +6,16 @@
 #include "settings/ConfigScan.h"
 #include "settings/DriverDescription.h"
 
-namespace lint {
+namespace settings {
 
 struct NodeValue {
-    const settings::ScannedItem* item;  ///< That says it; null: the driver's default.
+    const ScannedItem* item;  ///< That says it; null: the driver's default.
     long value;
 };
 
 /// @param node  Nothing: what serves the nodes without an item of their own.
 /// @return nothing when neither the configuration nor the description knows the number.
-std::optional<NodeValue> nodeValue(const settings::ScannedConfig& config,
-                                   const settings::Description& description,
+std::optional<NodeValue> nodeValue(const ScannedConfig& config, const Description& description,
                                    std::optional<int> node, const char* key);
 
-}  // namespace lint
+}  // namespace settings
