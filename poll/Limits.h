@@ -28,6 +28,10 @@ class Limits {
         areas_[{node, area}] = limits;
     }
 
+    [[nodiscard]] bool has(int node, const std::string& area) const {
+        return areas_.contains({node, area});
+    }
+
     /// @param itemBytes  Of one item; 0: a bit.
     [[nodiscard]] AreaLimits of(int node, const std::string& area, int itemBytes) const {
         const auto found = areas_.find({node, area});
