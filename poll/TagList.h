@@ -23,7 +23,8 @@ struct CellColumns {
     int name = 1;
     int uri = 1;
     int period = 1;
-    int scale = 1;  ///< Of the offset where there is no scale.
+    int scale = 1;
+    int offset = 1;
     int low = 1;
 };
 
