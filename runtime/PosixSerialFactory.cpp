@@ -98,7 +98,7 @@ ISerialPort* PosixSerialFactory::openPort(const char* name) {
         errors_->set(opened.error());
         return nullptr;
     }
-    errors_->set({});
+    errors_->forget();
     ISerialPort* port = opened.value().get();
     open_[port] = std::move(opened).value();
     return port;

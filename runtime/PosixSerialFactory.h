@@ -23,6 +23,11 @@ class SerialErrors {
     void set(const std::string& text);
     std::string get() const;
     void notePortGone() { portGone_ = true; }
+    /// A port was opened: nothing to complain of, nothing gone.
+    void forget() {
+        set({});
+        portGone_ = false;
+    }
     bool portGone() const { return portGone_; }
 
   private:
@@ -79,8 +84,8 @@ class PosixSerialFactory final : public ISerialFactory {
     /// @return why the last openPort() or configure() failed, e.g.
     /// "com1: /dev/ttyUSB9: No such file or directory"; empty after one that succeeded.
     std::string lastError() const;
-    /// Whether a port vanished (end of file, I/O error, hang-up) while it was open. The interface
-    /// tells a vanished port from a silent one nowhere else.
+    /// Whether a port vanished (end of file, I/O error, hang-up) while it was open, and none was
+    /// opened since. The interface tells a vanished port from a silent one nowhere else.
     bool portGone() const { return errors_->portGone(); }
 
     void* ConvertTo(const char* name) override;
