@@ -18,21 +18,49 @@ bool inDatagram(const ProtgenTag& tag) {
     return tag.memoryType() != nullptr && tag.memoryType()->isInDatagram();
 }
 
+// The tag's first bit within its first item.
+int bitInItem(const ProtgenTag& tag) {
+    const bool counts = !tag.inBitMemory() && ProtUtilsN::IsBitType(tag.GetVarType());
+    return counts ? tag.subIndex() : 0;
+}
+
 // The first bit of the tag, counted from address 0 of its memory.
 std::int64_t firstBit(const ProtgenTag& tag) {
-    if (tag.inBitMemory()) return tag.offset();
-    const bool bits = ProtUtilsN::IsBitType(tag.GetVarType());
-    return std::int64_t{tag.offset()} * tag.memoryItemLength() * 8 + (bits ? tag.subIndex() : 0);
+    const std::int64_t itemBits = tag.inBitMemory() ? 1 : tag.memoryItemLength() * 8;
+    return tag.offset() * itemBits + bitInItem(tag);
+}
+
+// The bit behind the tag's last one.
+std::int64_t endBit(const ProtgenTag& tag) {
+    const std::int64_t length = tag.GetVarLength();
+    return firstBit(tag) + (ProtUtilsN::IsBitType(tag.GetVarType()) ? length : length * 8);
+}
+
+// Two bits that touch do not do: a sub-index beyond the first item makes the images overlap.
+bool imagesFitTogether(const ProtgenTag& first, const ProtgenTag& next) {
+    return next.offset() == first.offset() || bitInItem(next) == 0;
+}
+
+bool adjacent(const ITag* a, const ITag* b) {
+    const ProtgenTag& next = own(a);
+    const ProtgenTag& first = own(b);
+    return next.memoryType() == first.memoryType() && sameDevice(next, first) &&
+           endBit(first) == firstBit(next) && imagesFitTogether(first, next);
+}
+
+const char* accessFault(const ProtgenTag& tag, bool write) {
+    return engine::accessFault(tag, engine::itemsOfTag(tag), write);
 }
 
 const char* readFault(const ITag* tag) {
-    return engine::accessFault(own(tag), engine::itemsOfTag(own(tag)), false);
+    return accessFault(own(tag), false);
 }
 
 }  // namespace
 
 ProtgenProtocol::ProtgenProtocol() {
     readCheck_ = readFault;
+    adjacency_ = adjacent;
 }
 
 bool ProtgenProtocol::CanBeOptimized(const ITag* a, const ITag* b, bool write) const {
@@ -40,11 +68,15 @@ bool ProtgenProtocol::CanBeOptimized(const ITag* a, const ITag* b, bool write) c
     if (first.memoryType() == nullptr || first.memoryType() != own(b).memoryType()) return false;
     if (!sameDevice(first, own(b))) return false;
     if (write && first.IsReadOnly()) return false;
+    // A tag that is refused by itself would take the others of its block along.
+    if (accessFault(first, write) != nullptr || accessFault(own(b), write) != nullptr) return false;
     return engine::declaredBlock(first, write) != 0;
 }
 
 bool ProtgenProtocol::IsBefore(const ITag* a, const ITag* b) const {
-    return firstBit(own(a)) < firstBit(own(b));
+    // By items first: a block holds its tags' images, which begin with their first items.
+    if (own(a).offset() != own(b).offset()) return own(a).offset() < own(b).offset();
+    return bitInItem(own(a)) < bitInItem(own(b));
 }
 
 int ProtgenProtocol::GetNodeID(const ITag* tag) const {
@@ -61,7 +93,7 @@ bool ProtgenProtocol::CanWriteBitBlock(const ITag* tag) const {
 
 bool ProtgenProtocol::NeedsReadBeforeWrite(const ITag* tag) const {
     const ProtgenTag& target = own(tag);
-    if (engine::accessFault(target, engine::itemsOfTag(target), true) != nullptr) return false;
+    if (accessFault(target, true) != nullptr) return false;
     if (engine::declaredBlock(target, true) == 0) return false;
     return engine::footprint(target, engine::wholeTag(target)).partial;
 }

@@ -153,6 +153,11 @@ class ProtocolBase : public IProtocol7 {
     /// null: every tag is tried.
     using ReadCheck = const char* (*)(const ITag* tag);
     ReadCheck readCheck_ = nullptr;
+    /// Tells whether `b` ends where `a` begins. The engine, which knows how many bits an item has,
+    /// sets it in its constructor, so that IsAdjacent() need not be its own: every run time's
+    /// engine leaves that slot to the framework. Null: an item is a byte.
+    using Adjacency = bool (*)(const ITag* a, const ITag* b);
+    Adjacency adjacency_ = nullptr;
 
   private:
     class ConsoleTag;

@@ -96,6 +96,7 @@ bool ProtocolBase::IsBefore(const ITag* a, const ITag* b) const {
 }
 
 bool ProtocolBase::IsAdjacent(const ITag* a, const ITag* b) const {
+    if (adjacency_ != nullptr) return adjacency_(a, b);
     return ProtUtilsN::getEndingBit(b) == ProtUtilsN::getStartingBit(a);
 }
 

@@ -13,6 +13,7 @@ class QueriesTest : public testing::Test {
     bool optimized(const char* a, const char* b, bool write) {
         return driver_.CanBeOptimized(tag(a), tag(b), write);
     }
+    bool adjacent(const char* a, const char* b) { return driver_.IsAdjacent(tag(a), tag(b)); }
     bool before(const char* a, const char* b) { return driver_.IsBefore(tag(a), tag(b)); }
 
     FakeDriver driver_;
@@ -44,13 +45,25 @@ TEST_F(QueriesTest, AreasOfTheDriverItselfAreNotOptimized) {
     EXPECT_FALSE(optimized("1?FLAG?0?boolean", "1?FLAG?0?boolean", true));
 }
 
-TEST_F(QueriesTest, RegisterTagsAreOrderedByBit) {
+TEST_F(QueriesTest, TagThatCannotBeReadAloneSharesNoBlock) {
+    for (const char* uri : {"1?REG?65535?int", "1?REG?-1?short", "1?REG?0?short-0",
+                            "1?REG?0.-1?boolean", "1?NOWHERE?0?short"}) {
+        EXPECT_FALSE(optimized(uri, "1?REG?0?short", false)) << uri;
+        EXPECT_FALSE(optimized("1?REG?0?short", uri, false)) << uri;
+        EXPECT_FALSE(optimized("1?REG?0?short", uri, true)) << uri;
+    }
+    EXPECT_TRUE(optimized("1?REG?65535?short", "1?REG?0?short", false));
+    EXPECT_FALSE(optimized("1?COIL?65535?boolean", "1?COIL?65535?boolean-2", false));
+}
+
+TEST_F(QueriesTest, RegisterTagsAreOrderedByTheirFirstItemThenByBit) {
     EXPECT_TRUE(before("1?REG?1?short", "1?REG?2?short"));
     EXPECT_FALSE(before("1?REG?2?short", "1?REG?2?int"));
     EXPECT_TRUE(before("1?REG?2.3?boolean", "1?REG?2.4?boolean"));
     EXPECT_FALSE(before("1?REG?2.4?boolean", "1?REG?2.3?boolean"));
-    EXPECT_FALSE(before("1?REG?2.16?boolean", "1?REG?3.0?boolean"));
-    EXPECT_TRUE(before("1?REG?3.0?boolean", "1?REG?2.17?boolean"));
+    EXPECT_TRUE(before("1?REG?2.17?boolean", "1?REG?3.0?boolean"))
+        << "a block that begins with register 3 does not hold the other's image";
+    EXPECT_FALSE(before("1?REG?3.0?boolean", "1?REG?2.17?boolean"));
     EXPECT_FALSE(before("1?REG?2.0?short", "1?REG?2.9?short")) << "no bits, no sub-index";
 }
 
@@ -58,6 +71,39 @@ TEST_F(QueriesTest, BitTagsAreOrderedByTheirBit) {
     EXPECT_TRUE(before("1?COIL?8?boolean", "1?COIL?9?boolean"));
     EXPECT_FALSE(before("1?COIL?9?boolean", "1?COIL?8?boolean"));
     EXPECT_FALSE(before("1?COIL?9.1?boolean", "1?COIL?9.2?boolean"));
+}
+
+TEST_F(QueriesTest, RegisterTagIsAdjacentToTheOneWhoseRegistersEndWhereItBegins) {
+    EXPECT_TRUE(adjacent("1?REG?11?short", "1?REG?10?short"));
+    EXPECT_FALSE(adjacent("1?REG?12?short", "1?REG?10?short")) << "register 11 lies between";
+    EXPECT_TRUE(adjacent("1?REG?12?short", "1?REG?10?int"));
+    EXPECT_FALSE(adjacent("1?REG?10?short", "1?REG?11?short"));
+    EXPECT_FALSE(adjacent("1?REG?10?short", "1?REG?10?short"));
+    EXPECT_FALSE(adjacent("1?REG?11?short", "1?REG?10?byte")) << "half a register lies between";
+    EXPECT_TRUE(adjacent("1?LONG?11?int", "1?LONG?10?int"));
+    EXPECT_FALSE(adjacent("1?LONG?14?int", "1?LONG?10?int"));
+}
+
+TEST_F(QueriesTest, BitsOfRegistersAreAdjacentWhereTheirImagesFitTogether) {
+    EXPECT_TRUE(adjacent("1?REG?10.4?boolean", "1?REG?10.3?boolean"));
+    EXPECT_TRUE(adjacent("1?REG?10.16?boolean", "1?REG?10.15?boolean"));
+    EXPECT_TRUE(adjacent("1?REG?11.0?boolean", "1?REG?10.15?boolean"));
+    EXPECT_TRUE(adjacent("1?REG?11?short", "1?REG?10.0?boolean-16"));
+    EXPECT_TRUE(adjacent("1?REG?11.9?short", "1?REG?10?short")) << "no bits, no sub-index";
+    EXPECT_FALSE(adjacent("1?REG?11?short", "1?REG?10.14?boolean"));
+    EXPECT_FALSE(adjacent("1?REG?11.16?boolean", "1?REG?10.31?boolean"))
+        << "the image of the first begins in the middle of the other's";
+}
+
+TEST_F(QueriesTest, CoilsAreAdjacentByTheirNumbers) {
+    EXPECT_TRUE(adjacent("1?COIL?8?boolean", "1?COIL?7?boolean"));
+    EXPECT_TRUE(adjacent("1?COIL?19?boolean", "1?COIL?9?boolean-10"));
+    EXPECT_FALSE(adjacent("1?COIL?9?boolean", "1?COIL?7?boolean"));
+}
+
+TEST_F(QueriesTest, TagsOfOtherNodesAndMemoriesAreNotAdjacent) {
+    EXPECT_FALSE(adjacent("2?REG?11?short", "1?REG?10?short"));
+    EXPECT_FALSE(adjacent("1?IREG?11?short", "1?REG?10?short"));
 }
 
 TEST_F(QueriesTest, NodeIsTheTagsNode) {
