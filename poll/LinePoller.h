@@ -48,7 +48,7 @@ class LinePoller {
 
   private:
     void run();
-    void waitUntil(Clock::TimePoint moment);
+    bool waitUntil(Clock::TimePoint moment);
 
     std::shared_ptr<const LineSetup> setup_;
     Clock& clock_;
@@ -57,6 +57,7 @@ class LinePoller {
     std::condition_variable wake_;
     bool woken_ = false;
     bool stopping_ = false;
+    Clock::TimePoint next_{};  // Of the thread.
     std::thread thread_;
 };
 

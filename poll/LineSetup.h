@@ -20,6 +20,8 @@ struct Patience {
     std::chrono::milliseconds longestPause{10000};  ///< ... doubling up to this.
     std::chrono::milliseconds reopen{1000};         ///< Between attempts to open a lost port.
     std::chrono::milliseconds holeRetry{60000};     ///< Until refused items are asked for again.
+
+    bool operator==(const Patience&) const = default;
 };
 
 /// One line: its tags and their plan, ready to be polled.

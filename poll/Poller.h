@@ -28,7 +28,8 @@ struct LineView {
 /// Threads: any may call snapshot() and write(); start(), reload() and stop() belong to the owner.
 class Poller {
   public:
-    /// @param clock, report  Outlive the poller. Reports come from the threads of the lines.
+    /// @param clock  Outlives the poller. @param report  May be empty. Reports come from the
+    /// threads of the lines.
     Poller(SourceFactory factory, Clock& clock, FaultReport report);
     Poller(const Poller&) = delete;
     Poller& operator=(const Poller&) = delete;
@@ -54,8 +55,15 @@ class Poller {
   private:
     using Line = std::shared_ptr<LinePoller>;
 
-    Line find(const std::string& name) const;
-    Line makeLine(LineSetup setup) const;
+    /// What reload() would put in force.
+    struct Change {
+        std::vector<Line> lines;    // All of them, in order.
+        std::vector<Line> added;    // Not started yet.
+        std::vector<Line> dropped;  // Still polling.
+    };
+
+    Change compare(std::vector<LineSetup> setups) const;
+    void apply(Change change);
     std::vector<Line> lines() const;
 
     SourceFactory factory_;
