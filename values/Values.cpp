@@ -71,15 +71,10 @@ std::vector<std::string_view> splitAtCommas(std::string_view text) {
 }
 
 Bytes parseArray(ValueShape shape, std::string_view text) {
-    const std::vector<std::string_view> items = splitAtCommas(text);
-    if (items.size() != itemCount(shape)) {
-        refuse(fmt::format("{} needs {} items, not {}", typeName(shape), itemCount(shape),
-                           items.size()));
-    }
     const ValueType& item = rowOf(rowOf(shape.type).item);
     Bytes bytes;
-    for (const std::string_view text_ : items)
-        appendItem(bytes, item, text_);
+    for (const std::string_view each : itemTexts(shape, text))
+        appendItem(bytes, item, each);
     return bytes;
 }
 
@@ -94,6 +89,16 @@ std::string formatArray(ValueShape shape, ByteView value) {
 }
 
 }  // namespace
+
+std::vector<std::string_view> itemTexts(ValueShape shape, std::string_view text) {
+    if (rowOf(shape.type).kind != ValueKind::Array) return {text};
+    std::vector<std::string_view> items = splitAtCommas(text);
+    if (items.size() != itemCount(shape)) {
+        refuse(fmt::format("{} needs {} items, not {}", typeName(shape), itemCount(shape),
+                           items.size()));
+    }
+    return items;
+}
 
 Bytes parseValue(ValueShape shape, std::string_view text) {
     const ValueType& row = rowOf(shape.type);

@@ -10,6 +10,7 @@
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "values/LittleEndian.h"
 #include "values/ValueTypes.h"
@@ -20,6 +21,10 @@ namespace values {
 /// Errors: ValueError when the text is no value of that type: wrong form, out of range,
 /// wrong item count, text too long, or a type that has no text form (time, object).
 Bytes parseValue(ValueShape shape, std::string_view text);
+
+/// @return the texts of a value's items: an array's, between the commas; else the text as it is.
+/// Errors: ValueError when there are more or fewer than the array has.
+std::vector<std::string_view> itemTexts(ValueShape shape, std::string_view text);
 
 /// @param value  Run-time form, shape.bytes bytes.
 /// @return text that parseValue() turns into the same bytes; types without a text form are shown
