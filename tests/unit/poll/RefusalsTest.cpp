@@ -5,7 +5,7 @@
 #include <set>
 #include <string>
 
-#include "tests/unit/poll/FakeLine.h"
+#include "tests/unit/poll/FakeSource.h"
 
 namespace poll {
 namespace {

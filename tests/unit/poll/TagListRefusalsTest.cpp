@@ -26,9 +26,9 @@ void PrintTo(const Case& each, std::ostream* out) {
     *out << testing::PrintToString(each.text);
 }
 
-class RefusedList : public testing::TestWithParam<Case> {};
+class TagListRefusalsTest : public testing::TestWithParam<Case> {};
 
-TEST_P(RefusedList, TellsPlaceAndExpectation) {
+TEST_P(TagListRefusalsTest, TellsPlaceAndExpectation) {
     EXPECT_EQ(std::vector<std::string>{GetParam().complaint}, complaintsOf(GetParam().text));
 }
 
@@ -37,14 +37,14 @@ constexpr const char* kNothing =
     "a URI a line";
 
 INSTANTIATE_TEST_SUITE_P(
-    Whole, RefusedList,
+    Whole, TagListRefusalsTest,
     testing::Values(Case{"", kNothing}, Case{"\xEF\xBB\xBF", kNothing},
                     Case{"\n# nothing\n \n", kNothing}, Case{"name,uri\n", kNothing},
                     Case{"name,uri,comment\na,u,x\nb,v,gr\xFC\xDF\n",
                          "3:7: not-utf-8: byte 0xFC is no UTF-8: expected a file saved as UTF-8"}));
 
 INSTANTIATE_TEST_SUITE_P(
-    Headers, RefusedList,
+    Headers, TagListRefusalsTest,
     testing::Values(
         Case{"name,uri,perido\na,u,1\n",
              "1:10: unknown-column: unknown column 'perido': expected 'period', perhaps"},
@@ -69,7 +69,7 @@ INSTANTIATE_TEST_SUITE_P(
              "like 'name,uri,unit', or a list of URIs, one a line"}));
 
 INSTANTIATE_TEST_SUITE_P(
-    Fields, RefusedList,
+    Fields, TagListRefusalsTest,
     testing::Values(
         Case{"name,uri,unit\na,u\nb,v,m\n",
              "2:3: field-count: 2 fields: expected 3 as in the header line"},
@@ -89,7 +89,7 @@ INSTANTIATE_TEST_SUITE_P(
              "and the quotes in it doubled"}));
 
 INSTANTIATE_TEST_SUITE_P(
-    Cells, RefusedList,
+    Cells, TagListRefusalsTest,
     testing::Values(
         Case{"name,uri\n,u\nb,v\n", "2:1: empty-name: no name: expected one for every tag"},
         Case{"name,uri\na, \nb,v\n", "2:4: empty-uri: no uri: expected one for every tag"},

@@ -22,7 +22,7 @@ std::vector<std::string> urisOf(const TagList& list) {
     return uris;
 }
 
-TEST(TagListTest, EveryColumnInAnyOrder) {
+TEST(ListedTagsTest, EveryColumnInAnyOrder) {
     const TagList list = goodList(
         "comment,high,low,decimals,unit,offset,scale,period,uri,name\n"
         "boiler,120,-20.5,1,°C,-40,0.1,500,1?HREG?400001?short,flow\n");
@@ -41,7 +41,7 @@ TEST(TagListTest, EveryColumnInAnyOrder) {
     EXPECT_EQ(2, tag.line);
 }
 
-TEST(TagListTest, CellsKnowTheirColumns) {
+TEST(ListedTagsTest, CellsKnowTheirColumns) {
     const TagList list = goodList("name, uri ,period,scale\nflow, 1?A?2?int , 5,\"2\"\n");
     ASSERT_EQ(1U, list.tags.size());
     EXPECT_EQ(1, list.tags[0].columns.name);
@@ -50,7 +50,7 @@ TEST(TagListTest, CellsKnowTheirColumns) {
     EXPECT_EQ(21, list.tags[0].columns.scale);
 }
 
-TEST(TagListTest, EmptyCellsAreNotGiven) {
+TEST(ListedTagsTest, EmptyCellsAreNotGiven) {
     const TagList list =
         goodList("name,uri,period,scale,offset,unit,decimals,low,high\na,u?,,,, ,\"\",,\n");
     ASSERT_EQ(1U, list.tags.size());
@@ -59,11 +59,11 @@ TEST(TagListTest, EmptyCellsAreNotGiven) {
     EXPECT_EQ("", tag.unit);
 }
 
-TEST(TagListTest, ColumnNamesInCapitals) {
+TEST(ListedTagsTest, ColumnNamesInCapitals) {
     EXPECT_EQ(1U, goodList("Name,URI\na,1?A?2?int\n").tags.size());
 }
 
-TEST(TagListTest, QuotedFieldsHoldCommasQuotesAndLineEnds) {
+TEST(ListedTagsTest, QuotedFieldsHoldCommasQuotesAndLineEnds) {
     const TagList list = goodList(
         "name,uri,comment\n"
         "a,\"1?A?2?float(swap2,swap4)\",\"a \"\"hot\"\" one,\r\nin two lines\"\n"
@@ -76,7 +76,7 @@ TEST(TagListTest, QuotedFieldsHoldCommasQuotesAndLineEnds) {
     EXPECT_EQ(2, list.tags[1].columns.name);
 }
 
-TEST(TagListTest, ByteOrderMarksCarriageReturnsAndAMissingLastLineEnd) {
+TEST(ListedTagsTest, ByteOrderMarksCarriageReturnsAndAMissingLastLineEnd) {
     for (const char* text : {"name,uri\na,u\nb,v\n", "\xEF\xBB\xBFname,uri\r\na,u\r\nb,v\r\n",
                              "name,uri\r\na,u\r\nb,v", "name,uri\na,u\nb,v\r"}) {
         const TagList list = goodList(text);
@@ -84,14 +84,14 @@ TEST(TagListTest, ByteOrderMarksCarriageReturnsAndAMissingLastLineEnd) {
     }
 }
 
-TEST(TagListTest, CommentsAndEmptyLinesOfCsv) {
+TEST(ListedTagsTest, CommentsAndEmptyLinesOfCsv) {
     const TagList list = goodList("# pumps\n\nname,uri\n  \n# old: x,y,z\na,u#1\n");
     ASSERT_EQ(1U, list.tags.size());
     EXPECT_EQ("u#1", list.tags[0].uri);
     EXPECT_EQ(6, list.tags[0].line);
 }
 
-TEST(TagListTest, PeriodsWithAndWithoutUnits) {
+TEST(ListedTagsTest, PeriodsWithAndWithoutUnits) {
     const TagList list =
         goodList("name,uri,period\na,u,1\nb,u,500ms\nc,u,2s\nd,u,0.5 s\ne,u,86400000\nf,u,1e3\n");
     std::vector<long long> periods;
@@ -100,7 +100,7 @@ TEST(TagListTest, PeriodsWithAndWithoutUnits) {
     EXPECT_EQ((std::vector<long long>{1, 500, 2000, 500, 86400000, 1000}), periods);
 }
 
-TEST(TagListTest, NumbersWithSignsAndExponents) {
+TEST(ListedTagsTest, NumbersWithSignsAndExponents) {
     const TagList list = goodList("name,uri,scale,offset,low\na,u,+0.1,-1e-3,.5\n");
     ASSERT_EQ(1U, list.tags.size());
     EXPECT_EQ(0.1, list.tags[0].scale);
@@ -108,7 +108,7 @@ TEST(TagListTest, NumbersWithSignsAndExponents) {
     EXPECT_EQ(0.5, list.tags[0].low);
 }
 
-TEST(TagListTest, APlainListNamesTagsByTheirUris) {
+TEST(ListedTagsTest, APlainListNamesTagsByTheirUris) {
     const TagList list =
         goodList("\xEF\xBB\xBF# all\n\n  1?A?2?float(swap2,swap4)  # one\r\n\t#\n1?B?3?int");
     ASSERT_EQ(2U, list.tags.size());
@@ -120,11 +120,11 @@ TEST(TagListTest, APlainListNamesTagsByTheirUris) {
     EXPECT_EQ(1, list.tags[1].columns.uri);
 }
 
-TEST(TagListTest, APlainListMayRepeatAUriAndHoldAnyBytesInComments) {
+TEST(ListedTagsTest, APlainListMayRepeatAUriAndHoldAnyBytesInComments) {
     EXPECT_EQ(2U, goodList("1?A?2?int # \xE4\n1?A?2?int\nno uri\n").tags.size() - 1);
 }
 
-TEST(TagListTest, AHundredThousandTags) {
+TEST(ListedTagsTest, AHundredThousandTags) {
     std::string text = "name,uri,period\n";
     for (int i = 0; i < 100000; ++i) {
         const std::string number = std::to_string(i);

@@ -14,7 +14,7 @@ struct Case {
     bool againstNode;
 };
 
-TEST(FailureTest, EveryErrorHasItsMeaning) {
+TEST(ReadFailureTest, EveryErrorHasItsMeaning) {
     const Case cases[] = {
         {{0, ""}, FailureKind::None, true, false},
         {{-4, "No response"}, FailureKind::Timeout, false, true},
@@ -38,7 +38,7 @@ TEST(FailureTest, EveryErrorHasItsMeaning) {
     }
 }
 
-TEST(FailureTest, TheDriversTextsAreTheOnesThatAreKnown) {
+TEST(ReadFailureTest, TheDriversTextsAreTheOnesThatAreKnown) {
     for (int code = 0; code < 256; ++code) {
         const auto byte = static_cast<std::uint8_t>(code);
         const std::string text = getExceptionText(byte);
