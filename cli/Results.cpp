@@ -5,12 +5,14 @@
 
 #include <ostream>
 
+#include "poll/Scaling.h"
 #include "values/JsonValues.h"
-#include "values/Values.h"
+#include "values/ValueTypes.h"
 
 namespace cli {
 namespace {
 
+using poll::ListedTag;
 using values::ByteView;
 using values::Json;
 using values::ValueShape;
@@ -22,42 +24,55 @@ std::string dumped(const Json& document) {
     return document.dump(-1, ' ', false, Json::error_handler_t::replace);
 }
 
-}  // namespace
-
-void Results::value(const std::string& uri, ValueShape shape, ByteView value) {
-    this->value(uri, shape, value, false);
+/// @return the members that say which tag it is.
+Json identity(const ListedTag& tag) {
+    Json object{{"uri", tag.uri}};
+    if (tag.name != tag.uri) object["name"] = tag.name;
+    return object;
 }
 
-void Results::value(const std::string& uri, ValueShape shape, ByteView value, bool broadcast) {
-    if (json_) {
-        Json object{{"uri", uri},
-                    {"type", values::typeName(shape)},
-                    {"value", values::jsonValue(shape, value)}};
-        if (broadcast) object["broadcast"] = true;
-        member(object);
-    } else {
-        context_.out << uri << " = " << values::formatValue(shape, value) << '\n';
+}  // namespace
+
+void Results::value(const ListedTag& tag, ValueShape shape, ByteView value) {
+    this->value(tag, shape, value, false);
+}
+
+void Results::value(const ListedTag& tag, ValueShape shape, ByteView value, bool broadcast) {
+    const poll::Scaling scaling(tag);
+    if (!json_) {
+        context_.out << tag.name << " = " << scaling.textOf(shape, value)
+                     << (tag.unit.empty() ? "" : " " + tag.unit) << '\n';
+        return;
     }
+    Json object = identity(tag);
+    object["type"] = values::typeName(shape);
+    object["value"] = scaling.jsonOf(shape, value);
+    if (!scaling.isPlain()) object["raw"] = values::jsonValue(shape, value);
+    if (!tag.unit.empty()) object["unit"] = tag.unit;
+    if (broadcast) object["broadcast"] = true;
+    member(object);
 }
 
 void Results::member(const Json& object) {
     members_.push_back(dumped(object));
 }
 
-void Results::broadcast(const std::string& uri, ValueShape shape, ByteView value) {
-    this->value(uri, shape, value, true);
-    complain(context_, uri + ": a broadcast: no answer is expected");
+void Results::broadcast(const ListedTag& tag, ValueShape shape, ByteView value) {
+    this->value(tag, shape, value, true);
+    complain(context_, tag.name + ": a broadcast: no answer is expected");
 }
 
-void Results::failure(const std::string& uri, const Failure& failure) {
+void Results::failure(const ListedTag& tag, const Failure& failure) {
     const runtime::ChannelError& error = failure.error;
     first_.note(failure.code);
     // The driver's own areas refuse a value without a word.
     const std::string& text = error.text.empty() ? kNoReason : error.text;
     if (json_) {
-        member({{"uri", uri}, {"error", {{"code", error.code}, {"text", text}}}});
+        Json object = identity(tag);
+        object["error"] = {{"code", error.code}, {"text", text}};
+        member(object);
     } else {
-        complain(context_, fmt::format("{}: error {}: {}", uri, error.code, text));
+        complain(context_, fmt::format("{}: error {}: {}", tag.name, error.code, text));
     }
 }
 

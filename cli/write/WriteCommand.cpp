@@ -6,11 +6,13 @@
 #include "cli/Commands.h"
 #include "cli/Results.h"
 #include "cli/Session.h"
+#include "cli/TagNames.h"
 #include "cli/UsageErrors.h"
 #include "cli/override/OverrideNotice.h"
 #include "cli/override/Overrides.h"
 #include "cli/write/Assignment.h"
 #include "cli/write/WriteRequests.h"
+#include "poll/Scaling.h"
 #include "values/Values.h"
 
 namespace cli {
@@ -23,23 +25,26 @@ constexpr const char* kFooter =
 comma lists, strings with or without double quotes, binary as 0x and two digits a byte. All values
 are looked at first: when one is wrong, nothing is sent. Every written tag gets a line
 "URI = value", with --verify the value that was read back. `mrtu read --help` tells the byte orders.
+With --tags, NAME=VALUE takes a value in the unit of the list, which has to lie within its low and high.
 
 Examples:
   mrtu write --sim '1?HREG?400001?short=-5' '1?OUTP?1?boolean-4=1,0,0,1'
   mrtu write --sim --verify '1?HREG?400010?float@ABCD=3.25' '1?HREG?400020?string-8@AB="Pump 1"'
+  mrtu write --sim --tags tags.csv setpoint=21.5
   mrtu write --port /dev/ttyUSB0 --set presetFunction=06 '1?HREG?400001?unsignedShort=0xFFFF')";
 
 struct WriteOptions {
     LineOptions line;
     bool json = false;
     bool verify = false;
+    std::string tagsFile;
     std::vector<std::string> assignments;
 };
 
 constexpr std::uint8_t kBroadcast = 0;
 
 struct Job {
-    std::string uri;
+    poll::ListedTag listed;
     const ITag* tag;
     values::Bytes value;
 };
@@ -58,27 +63,29 @@ void refuseUnwritable(Session& session, const ITag& tag, bool verify) {
         throw CommandError(ExitCode::Usage, "a broadcast must fit into one request");
 }
 
-Job prepare(Session& session, const std::string& text, bool verify) {
+Job prepare(Session& session, const TagNames& names, const std::string& text, bool verify) {
     const Assignment assignment = parseAssignment(text);
-    const auto tag = session.createTag(assignment.uri);
+    const poll::ListedTag listed = names.tag(assignment.uri);
+    const auto tag = session.createTag(listed.uri);
     try {
         if (!tag) throw CommandError(tag.error().code, tag.error().error.text);
         refuseUnwritable(session, *tag.value(), verify);
         const ValueShape shape = values::shapeOf(*tag.value());
-        return {assignment.uri, tag.value(),
-                withUsageErrors([&] { return values::parseValue(shape, assignment.value); })};
+        return {listed, tag.value(), withUsageErrors([&] {
+                    return poll::Scaling(listed).rawOf(shape, assignment.value);
+                })};
     } catch (const CommandError& error) {
-        throw CommandError(error.code(), assignment.uri + ": " + error.what());
+        throw CommandError(error.code(), listed.name + ": " + error.what());
     }
 }
 
 /// Complains about every assignment that is wrong, then ends the command.
-std::vector<Job> prepareAll(CommandContext& context, Session& session,
+std::vector<Job> prepareAll(CommandContext& context, Session& session, const TagNames& names,
                             const WriteOptions& options) {
     std::vector<Job> jobs;
     for (const std::string& text : options.assignments) {
         try {
-            jobs.push_back(prepare(session, text, options.verify));
+            jobs.push_back(prepare(session, names, text, options.verify));
         } catch (const CommandError& error) {
             complain(context, error.what());
         }
@@ -91,15 +98,16 @@ std::vector<Job> prepareAll(CommandContext& context, Session& session,
 
 void verifyOne(Session& session, const Job& job, Results& results) {
     const auto back = session.read(*job.tag);
-    if (!back) return results.failure(job.uri, back.error());
+    if (!back) return results.failure(job.listed, back.error());
     const ValueShape shape = values::shapeOf(*job.tag);
     if (back.value() != job.value) {
-        const std::string text =
-            fmt::format("wrote {} but read back {}", values::formatValue(shape, job.value),
-                        values::formatValue(shape, back.value()));
-        return results.failure(job.uri, {{0, text}, ExitCode::Other});
+        // Raw: rounded to its decimals, the one might look like the other.
+        const std::string text = fmt::format(
+            "wrote {}{} but read back {}", poll::Scaling(job.listed).isPlain() ? "" : "raw ",
+            values::formatValue(shape, job.value), values::formatValue(shape, back.value()));
+        return results.failure(job.listed, {{0, text}, ExitCode::Other});
     }
-    results.value(job.uri, shape, back.value());
+    results.value(job.listed, shape, back.value());
 }
 
 runtime::Result<runtime::Done, Failure> send(Session& session, const Job& job) {
@@ -123,15 +131,16 @@ void writeOne(Session& session, const Job& job, bool verify, Results& results) {
     const auto done = send(session, job);
     const ValueShape shape = values::shapeOf(*job.tag);
     if (!done && wasBroadcast(session, *job.tag, done.error()) && !verify)
-        return results.broadcast(job.uri, shape, job.value);
-    if (!done) return results.failure(job.uri, done.error());
+        return results.broadcast(job.listed, shape, job.value);
+    if (!done) return results.failure(job.listed, done.error());
     if (verify) return verifyOne(session, job, results);
-    results.value(job.uri, shape, job.value);
+    results.value(job.listed, shape, job.value);
 }
 
 void write(CommandContext& context, const WriteOptions& options) {
+    const TagNames names(context, options.tagsFile);
     Session session(context, options.line);
-    const std::vector<Job> jobs = prepareAll(context, session, options);
+    const std::vector<Job> jobs = prepareAll(context, session, names, options);
     announceOverrides(context, session, options.line);
     session.start();
     Results results(context, options.json);
@@ -153,9 +162,10 @@ CommandSpec writeCommand(CommandContext& context) {
     command.options.push_back({.names = "--verify",
                                .target = &options->verify,
                                .help = "Read back what was written and compare"});
+    addTagsOption(command, options->tagsFile);
     command.options.push_back({.names = "URI=VALUE",
                                .target = &options->assignments,
-                               .help = "Tags and their values",
+                               .help = "Tags and their values; with --tags also NAME=VALUE",
                                .required = true});
     command.action = [options, &context] { write(context, *options); };
     return command;

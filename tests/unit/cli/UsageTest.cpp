@@ -74,7 +74,7 @@ TEST(UsageTest, WhatIsUnknownIsAnsweredWithWhatIsAccepted) {
         {{"read", "--bauds=9600", kUri}, "unknown option '--bauds'; did you mean '--baud'?"},
         {{"--verson"}, "unknown option '--verson'; did you mean '--version'?"},
         {{"sim", "--xyz"}, "unknown option '--xyz'; 'mrtu sim --help' tells more"},
-        {{"read"}, "URI is required; 'mrtu read --help' tells more"},
+        {{"read"}, "URI is required, or --tags FILE; 'mrtu read --help' tells more"},
         {{"info", "more"}, "'more' was not expected; 'mrtu info --help' tells more"},
         {{"describe", "modls"},
          "section: 'modls' is not one of models, memory, parameters, conversions; did you mean "
