@@ -73,7 +73,8 @@ CommandSpec commandLine(CommandContext& context) {
             .version = "mrtu " MRTU_VERSION,
             .commands = {readCommand(context), writeCommand(context), consoleCommand(context),
                          overrideCommand(context), infoCommand(context), describeCommand(context),
-                         checkCommand(context), inspectCommand(context), simCommand(context)}};
+                         checkCommand(context), planCommand(context), inspectCommand(context),
+                         simCommand(context)}};
 }
 
 namespace {

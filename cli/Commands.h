@@ -14,6 +14,7 @@ CommandSpec consoleCommand(CommandContext& context);
 CommandSpec overrideCommand(CommandContext& context);
 CommandSpec describeCommand(CommandContext& context);
 CommandSpec checkCommand(CommandContext& context);
+CommandSpec planCommand(CommandContext& context);
 CommandSpec inspectCommand(CommandContext& context);
 
 }  // namespace cli

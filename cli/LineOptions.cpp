@@ -159,10 +159,14 @@ bool namesPort(const std::string& text) {
 
 }  // namespace
 
-void addLineOptions(CommandSpec& command, LineOptions& options, CommandContext& context) {
-    addPortOptions(command, options);
+void addConfigurationOptions(CommandSpec& command, LineOptions& options) {
     addConfigOptions(command, options);
     addShortForms(command, options);
+}
+
+void addLineOptions(CommandSpec& command, LineOptions& options, CommandContext& context) {
+    addPortOptions(command, options);
+    addConfigurationOptions(command, options);
     addDriverOptions(command, options);
     addPluginOption(command, context);
 }

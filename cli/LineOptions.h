@@ -36,6 +36,9 @@ struct PortMapping {
 /// @param options  Must live until the action has run.
 void addLineOptions(CommandSpec& command, LineOptions& options, CommandContext& context);
 
+/// Declares those of them that make the configuration text.
+void addConfigurationOptions(CommandSpec& command, LineOptions& options);
+
 /// @return the configuration text: the file's or the default one, with the options in front.
 /// Errors: CommandError (Usage) when the file can't be read or an option is malformed.
 std::string configTextOf(const LineOptions& options);
