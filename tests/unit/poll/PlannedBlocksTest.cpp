@@ -11,6 +11,7 @@
 #include "poll/Plan.h"
 #include "tests/unit/poll/AnswersHost.h"
 #include "tests/unit/poll/LoadedDriver.h"
+#include "tests/unit/poll/PlaceByHand.h"
 #include "tests/unit/poll/RandomTags.h"
 
 namespace {
@@ -19,22 +20,6 @@ using namespace poll_test;
 
 constexpr int kLists = 10000;
 constexpr int kMostTags = 30;
-
-/// A tag's place, by the driver's answers and the widths that the areas are known to have.
-poll::TagPlace placeOf(IProtocol4& engine, const ITag& tag) {
-    const std::string uri = tag.GetVarName();
-    const std::size_t begin = uri.find('?') + 1;
-    poll::TagPlace place;
-    place.node = engine.GetNodeID(&tag);
-    place.area = uri.substr(begin, uri.find('?', begin) - begin);
-    place.bits = engine.CanReadBitBlock(&tag);
-    place.itemBytes = place.bits ? 0 : place.area == "LONG" ? 4 : 2;
-    place.first = static_cast<int>(tag.GetByteOffset());
-    if (place.bits) place.first = place.first * 8 + tag.GetBitIndex();
-    place.items =
-        place.bits ? tag.GetVarLength() : (tag.PackedLen() + place.itemBytes - 1) / place.itemBytes;
-    return place;
-}
 
 /// What the configuration of LoadedDriver makes of the standard's limits.
 poll::Limits limitsOfNodes() {
