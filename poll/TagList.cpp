@@ -3,6 +3,10 @@
 #include <fmt/format.h>
 
 #include <algorithm>
+#include <array>
+#include <span>
+
+#include <algorithm>
 #include <tuple>
 #include <unordered_map>
 
@@ -67,9 +71,10 @@ std::size_t firstForeignByte(std::string_view text) {
             ++at;
             continue;
         }
-        const std::string_view next = text.substr(at, 4);
-        const values::Bytes bytes(next.begin(), next.end());
-        const std::size_t length = values::utf8Length(bytes);
+        std::array<std::uint8_t, 4> bytes{};  // No character has more.
+        const std::size_t count = std::min(bytes.size(), text.size() - at);
+        std::copy_n(text.begin() + static_cast<std::ptrdiff_t>(at), count, bytes.begin());
+        const std::size_t length = values::utf8Length(std::span(bytes).first(count));
         if (length == 0) return at;
         at += length;
     }
