@@ -23,6 +23,7 @@ constexpr const char* kFooter = R"(Examples:
   mrtu write --port /dev/ttyUSB0 --verify '1?HREG?400001?short=-5'
   mrtu console --sim getmaxtm
   mrtu override set --port /dev/ttyUSB0 node 5=7 baud=38400
+  mrtu plan --config line.cfg --tags tags.csv
   mrtu sim
   mrtu info
   mrtu COMMAND --help   (more examples)

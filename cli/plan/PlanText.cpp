@@ -97,9 +97,9 @@ std::string rivalsText(const PlanReport& report) {
 }
 
 std::string verdictText(const PlanReport& report) {
-    std::string text = fmt::format(
-        "all tags together can be read every {:.0f} ms at most\n",
-        std::ceil(std::chrono::duration<double, std::milli>(report.shortestPeriod).count()));
+    const std::chrono::duration<double, std::milli> shortest = report.shortestPeriod;
+    std::string text = fmt::format("one period for all tags can be {:.0f} ms at the shortest\n",
+                                   std::ceil(shortest.count()));
     if (report.reachable())
         return text + fmt::format("the wanted periods take {} of the line's time\n",
                                   percentText(report.sums.load));

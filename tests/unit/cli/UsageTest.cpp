@@ -162,12 +162,12 @@ TEST(UsageTest, EveryCommandThatIsOfferedStandsInTheHelp) {
         if (name.ends_with(',')) name.pop_back();
         EXPECT_NE(std::string::npos, help.find("\n  " + name + ' ')) << name;
     }
-    EXPECT_EQ(9, count);
+    EXPECT_EQ(10, count);
 }
 
 TEST(UsageTest, EveryCommandExplainsItselfWithExamples) {
-    for (const char* const command :
-         {"read", "write", "console", "override", "info", "describe", "check", "inspect", "sim"}) {
+    for (const char* const command : {"read", "write", "console", "override", "info", "describe",
+                                      "check", "plan", "inspect", "sim"}) {
         const Outcome outcome = mrtu({command, "--help"});
         EXPECT_EQ(0, outcome.exitCode) << command;
         EXPECT_NE(outcome.out.find("Examples:\n  mrtu " + std::string(command)), std::string::npos)

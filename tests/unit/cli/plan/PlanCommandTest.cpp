@@ -4,6 +4,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <sstream>
 
 #include "tests/unit/cli/InProcess.h"
 #include "values/JsonValues.h"
@@ -176,6 +177,20 @@ TEST_F(PlanCommandTest, ARefusedTagIsNamedWithItsLine) {
         << outcome.err;
     EXPECT_TRUE(has(outcome.err, "tags.csv:4: ")) << outcome.err;
     EXPECT_EQ("", outcome.out);
+}
+
+TEST_F(PlanCommandTest, DocumentationShowsTheRealOutput) {
+    const std::string folder = SOURCE_FOLDER "/examples/plan/";
+    const Outcome outcome = runInProcess({"plan", "--plugin", PLUGIN, "--config",
+                                          folder + "line.cfg", "--tags", folder + "tags.csv"});
+    std::ifstream file(SOURCE_FOLDER "/docs/plan.md");
+    std::ostringstream page;
+    page << file.rdbuf();
+    std::istringstream lines(outcome.out);
+    std::string shown;
+    for (std::string line; std::getline(lines, line);)
+        shown += (line.empty() ? "" : "    ") + line + '\n';
+    EXPECT_TRUE(has(page.str(), shown)) << shown;
 }
 
 TEST_F(PlanCommandTest, NoTagsAreWrongUsage) {
