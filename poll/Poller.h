@@ -43,7 +43,8 @@ class Poller {
     std::optional<std::string> start(std::vector<LineSetup> setups) {
         return reload(std::move(setups));
     }
-    /// Returns when all ports are closed. What was known stays readable.
+    /// Returns when all ports are closed. What was known stays readable. No later
+    /// reload().
     void stop();
 
     /// Lines in the order of the setups.

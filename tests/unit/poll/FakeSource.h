@@ -163,8 +163,8 @@ class FakeLine {
     }
     /// Steps until nothing is due.
     void settle() {
-        while (machine.step() <= clock.now()) {
-        }
+        for (auto next = machine.step(); next <= clock.now();)
+            next = machine.step();
     }
     TagState tag(std::size_t index) const { return machine.snapshot().tags.at(index); }
     NodeState node(std::size_t index) const { return machine.snapshot().nodes.at(index); }
