@@ -26,12 +26,6 @@ using values::ValueType;
 constexpr int kFloatDigits = 7;
 constexpr int kDoubleDigits = 15;
 
-/// @return the type of one item, of an array or alone.
-const ValueType& itemType(ICU_Type type) {
-    const ValueType& row = rowOf(type);
-    return row.kind == ValueKind::Array ? rowOf(row.item) : row;
-}
-
 bool isWhole(const ValueType& type) {
     return type.kind == ValueKind::Signed || type.kind == ValueKind::Unsigned;
 }
@@ -63,17 +57,12 @@ double numberIn(std::string_view text) {
 /// Calls `take` with the bytes of each item.
 template <class Take>
 void forEachItem(ValueShape shape, ByteView raw, Take&& take) {
-    const std::size_t bytes = itemType(shape.type).bytes;
+    const std::size_t bytes = values::itemRowOf(shape.type).bytes;
     for (std::size_t at = 0; at + bytes <= raw.size(); at += bytes)
         take(raw.subspan(at, bytes));
 }
 
 }  // namespace
-
-bool canBeScaled(ICU_Type type) {
-    const ValueType& item = itemType(type);
-    return isWhole(item) || item.kind == ValueKind::Real;
-}
 
 Scaling::Scaling(const ListedTag& tag)
     : scale_(tag.scale.value_or(1)),
@@ -101,7 +90,7 @@ std::string Scaling::textOf(ValueShape shape, ByteView raw) const {
     std::string text;
     forEachItem(shape, raw, [&](ByteView item) {
         if (!text.empty()) text += ',';
-        text += itemText(itemType(shape.type), item);
+        text += itemText(values::itemRowOf(shape.type), item);
     });
     return text;
 }
@@ -110,7 +99,7 @@ Json Scaling::jsonOf(ValueShape shape, ByteView raw) const {
     if (isPlain() || !canBeScaled(shape.type)) return values::jsonValue(shape, raw);
     Json items = Json::array();
     forEachItem(shape, raw, [&](ByteView item) {
-        const std::string text = itemText(itemType(shape.type), item);
+        const std::string text = itemText(values::itemRowOf(shape.type), item);
         const bool finite = std::isfinite(numberIn(text));
         items.push_back(finite ? Json::parse(text) : Json(text));
     });
@@ -121,7 +110,7 @@ std::vector<double> Scaling::numbersOf(ValueShape shape, ByteView raw) const {
     std::vector<double> numbers;
     if (!canBeScaled(shape.type)) return numbers;
     forEachItem(shape, raw, [&](ByteView item) {
-        numbers.push_back(scaled(rawNumber(itemType(shape.type), item)));
+        numbers.push_back(scaled(rawNumber(values::itemRowOf(shape.type), item)));
     });
     return numbers;
 }
@@ -147,7 +136,7 @@ std::uint64_t Scaling::itemBits(const ValueType& type, std::string_view text) co
 
 Bytes Scaling::rawOf(ValueShape shape, std::string_view text) const {
     if (!canBeScaled(shape.type)) return values::parseValue(shape, text);
-    const ValueType& type = itemType(shape.type);
+    const ValueType& type = values::itemRowOf(shape.type);
     const auto items = values::itemTexts(shape, text);
     for (const std::string_view item : items)
         checkLimits(values::trimmed(item));

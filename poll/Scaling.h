@@ -14,7 +14,9 @@
 namespace poll {
 
 /// @return true for numbers and arrays of numbers; booleans, texts and bytes have no scale.
-bool canBeScaled(ICU_Type type);
+inline bool canBeScaled(ICU_Type type) {
+    return values::holdsNumbers(type);
+}
 
 /// How a tag's numbers are shown, and what is written for a number that a person gives.
 class Scaling {

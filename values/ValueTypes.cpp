@@ -14,6 +14,16 @@ const ValueType& rowOf(ICU_Type type) {
     return kValueTypes.at(static_cast<std::size_t>(type) - 1);
 }
 
+const ValueType& itemRowOf(ICU_Type type) {
+    const ValueType& row = rowOf(type);
+    return row.kind == ValueKind::Array ? rowOf(row.item) : row;
+}
+
+bool holdsNumbers(ICU_Type type) {
+    const ValueKind kind = itemRowOf(type).kind;
+    return kind == ValueKind::Signed || kind == ValueKind::Unsigned || kind == ValueKind::Real;
+}
+
 const ValueType* typeNamed(std::string_view name) {
     const auto* const row =
         std::find_if(kValueTypes.begin(), kValueTypes.end(),

@@ -83,6 +83,12 @@ ValueShape shapeOf(const ITag& tag);
 /// @return the type's row. REQUIRES: `type` is one of the 27 codes.
 const ValueType& rowOf(ICU_Type type);
 
+/// @return the row of one item: an array's item type, else the type's own.
+const ValueType& itemRowOf(ICU_Type type);
+
+/// @return true for numbers and arrays of numbers; booleans, texts and bytes are none.
+bool holdsNumbers(ICU_Type type);
+
 /// @return the row of that name, with the "-" of an array; null for a name of no type.
 const ValueType* typeNamed(std::string_view name);
 

@@ -173,6 +173,15 @@ TEST(ValuesTest, TypesWithoutATextFormAreShownAsBytes) {
     EXPECT_EQ("0x", formatValue({object, 0}, Bytes{}));
 }
 
+TEST(ValuesTest, NumbersAndTheirArraysAreNumbers) {
+    for (const ICU_Type type : {ICU_Type::byte, ICU_Type::uint64, ICU_Type::float_,
+                                ICU_Type::doubleArray, ICU_Type::unsignedShortArray})
+        EXPECT_TRUE(values::holdsNumbers(type)) << static_cast<int>(type);
+    for (const ICU_Type type : {ICU_Type::boolean, ICU_Type::booleanArray, ICU_Type::string,
+                                ICU_Type::binary, ICU_Type::time, ICU_Type::object})
+        EXPECT_FALSE(values::holdsNumbers(type)) << static_cast<int>(type);
+}
+
 TEST(ValuesTest, TypesAreNamedAsUrisNameThem) {
     EXPECT_EQ("int", values::typeName({int_, 4}));
     EXPECT_EQ("int-10", values::typeName({intArray, 40}));
