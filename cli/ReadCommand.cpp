@@ -62,7 +62,8 @@ void readOne(Session& session, const ListedTag& listed, const TagResult& tag, Re
 
 std::vector<ListedTag> tagsOf(CommandContext& context, const ReadOptions& options) {
     if (options.tagsFile.empty() && options.words.empty())
-        throw CommandError(ExitCode::Usage, "URI is required, or --tags FILE; 'mrtu read --help' tells more");
+        throw CommandError(ExitCode::Usage,
+                           "URI is required, or --tags FILE; 'mrtu read --help' tells more");
     return TagNames(context, options.tagsFile).tags(options.words);
 }
 

@@ -16,6 +16,27 @@ namespace {
 /// A list that is wrong all over is mended from the top.
 constexpr std::size_t kMostComplaints = 20;
 
+[[noreturn]] void refuseList(CommandContext& context, const std::string& file,
+                             const std::vector<poll::ListComplaint>& complaints) {
+    const std::size_t shown = std::min(complaints.size(), kMostComplaints);
+    for (std::size_t i = 0; i < shown; ++i) {
+        const poll::ListComplaint& each = complaints[i];
+        complain(context, values::printableText(fmt::format("{}:{}:{}: {}", each.file, each.line,
+                                                            each.column, each.text)));
+    }
+    const std::size_t more = complaints.size() - shown;
+    throw CommandError(ExitCode::Usage,
+                       more == 0 ? file + ": the list is not used"
+                                 : fmt::format("{}: {} more; the list is not used", file, more));
+}
+
+std::vector<poll::ListedTag> goodTags(CommandContext& context, const std::string& file) {
+    if (file.empty()) return {};
+    poll::TagList list = readTagList(file);
+    if (!list.complaints.empty()) refuseList(context, file, list.complaints);
+    return std::move(list.tags);
+}
+
 }  // namespace
 
 void addTagsOption(CommandSpec& command, std::string& file) {
@@ -33,27 +54,13 @@ poll::TagList readTagList(const std::string& file) {
 }
 
 TagNames::TagNames(CommandContext& context, std::string file)
-    : context_(context), file_(std::move(file)) {
-    if (file_.empty()) return;
-    poll::TagList list = readTagList(file_);
-    if (!list.complaints.empty()) complainOfList(list.complaints);
-    tags_ = std::move(list.tags);
+    : TagNames(context, file, goodTags(context, file)) {}
+
+TagNames::TagNames(CommandContext& context, std::string file, std::vector<poll::ListedTag> tags)
+    : context_(context), file_(std::move(file)), tags_(std::move(tags)) {
     // Of a plain list that repeats a URI, the first.
     for (std::size_t i = 0; i < tags_.size(); ++i)
         places_.try_emplace(tags_[i].name, i);
-}
-
-void TagNames::complainOfList(const std::vector<poll::ListComplaint>& complaints) {
-    const std::size_t shown = std::min(complaints.size(), kMostComplaints);
-    for (std::size_t i = 0; i < shown; ++i) {
-        const poll::ListComplaint& each = complaints[i];
-        complain(context_, values::printableText(fmt::format("{}:{}:{}: {}", each.file, each.line,
-                                                             each.column, each.text)));
-    }
-    const std::size_t more = complaints.size() - shown;
-    throw CommandError(ExitCode::Usage,
-                       more == 0 ? file_ + ": the list is not used"
-                                 : fmt::format("{}: {} more; the list is not used", file_, more));
 }
 
 poll::ListedTag TagNames::tag(const std::string& word) const {

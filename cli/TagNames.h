@@ -23,6 +23,9 @@ class TagNames {
     /// every complaint was made on the context.
     TagNames(CommandContext& context, std::string file);
 
+    /// A list that was read before. @param file  For complaints; empty: no list.
+    TagNames(CommandContext& context, std::string file, std::vector<poll::ListedTag> tags);
+
     /// @return all tags of the list, in its order.
     [[nodiscard]] const std::vector<poll::ListedTag>& all() const { return tags_; }
 
@@ -36,7 +39,6 @@ class TagNames {
     [[nodiscard]] std::vector<poll::ListedTag> tags(const std::vector<std::string>& words) const;
 
   private:
-    void complainOfList(const std::vector<poll::ListComplaint>& complaints);
     [[nodiscard]] std::string unknownName(const std::string& word) const;
 
     CommandContext& context_;

@@ -5,56 +5,26 @@
 #include <map>
 #include <utility>
 
+#include "lint/AreaSpans.h"
 #include "lint/FirstMeetings.h"
 #include "lint/LintTags.h"
-#include "lint/TagSpan.h"
 #include "values/ValueTypes.h"
 
 namespace lint {
 namespace {
 
-using settings::AreaInfo;
 using settings::Description;
-
-/// What a tag stands for, and the tag.
-struct Span : TagSpan {
-    const TagLine* tag;
-    std::size_t order;  ///< In the text.
-    bool readOnly;
-};
-
-Span spanOf(const TagLine& tag, std::size_t order, const AreaInfo& area) {
-    return {tagSpan(*tag.facts, area), &tag, order, tag.facts->readOnly};
-}
-
-std::string describe(const Span& span) {
-    return fmt::format("'{}' ({}:{})", span.tag->uri, span.tag->place.source, span.tag->place.line);
-}
 
 Finding sharedRegister(const Span& bit, const Span& owner) {
     return {Severity::Warning, "shared-register", bit.tag->placeOf(2),
-            fmt::format("writing a bit rewrites the register that {} owns", describe(owner)),
+            fmt::format("writing a bit rewrites the register that {} owns", placed(owner)),
             "write it through one of the two tags only"};
 }
 
 Finding overlap(const Span& later, const Span& earlier) {
     return {Severity::Warning, "overlap", later.tag->placeOf(2),
-            fmt::format("overlaps {} with another data type", describe(earlier)),
+            fmt::format("overlaps {} with another data type", placed(earlier)),
             "check the address and the data type of both"};
-}
-
-using Area = std::pair<int, std::string>;  // Node and name.
-
-std::map<Area, std::vector<Span>> spansByArea(const std::vector<TagLine>& tags,
-                                              const Description& description) {
-    std::map<Area, std::vector<Span>> areas;
-    for (std::size_t i = 0; i < tags.size(); ++i) {
-        if (!tags[i].wellFormed() || !tags[i].facts) continue;
-        const AreaInfo* area = description.area(tags[i].area());
-        if (area == nullptr) continue;
-        areas[{tags[i].facts->node, area->name}].push_back(spanOf(tags[i], i, *area));
-    }
-    return areas;
 }
 
 using Reports = std::map<std::size_t, Finding>;  ///< By the order of the tag.

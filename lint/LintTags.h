@@ -48,6 +48,10 @@ void lintConversions(const TagLine& tag, const TagSurroundings& surroundings, Fi
 /// against the first tag in the text that it meets.
 Findings lintOverlaps(const std::vector<TagLine>& tags, const settings::Description& description);
 
+/// What the tags' list says of them. Rules: unused-scale, swapped-limits, two-periods; the last
+/// reports each tag once at most, against the first tag in the text that it meets.
+Findings lintList(const std::vector<TagLine>& tags, const settings::Description& description);
+
 /// Makes the driver's refusal of a tag an error, at the field that is to blame.
 Finding tagRefusal(const TagLine& tag, const TagSurroundings& surroundings,
                    const std::string& message);

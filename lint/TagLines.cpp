@@ -68,24 +68,6 @@ TagLine tagLine(std::string_view uri, const std::string& source, int line, int c
     return tag;
 }
 
-std::vector<TagLine> tagLines(const std::string& source, std::string_view text) {
-    std::vector<TagLine> lines;
-    int number = 0;
-    for (std::size_t at = 0; at < text.size();) {
-        const std::size_t end = std::min(text.find('\n', at), text.size());
-        std::string_view line = text.substr(at, end - at);
-        at = end + 1;
-        ++number;
-        line = line.substr(0, line.find('#'));
-        if (line.ends_with('\r')) line.remove_suffix(1);
-        std::size_t skipped = 0;
-        const std::string_view uri = trim(line, skipped);
-        if (uri.empty()) continue;
-        lines.push_back(tagLine(uri, source, number, static_cast<int>(skipped) + 1));
-    }
-    return lines;
-}
-
 DataTypeText dataTypeText(std::string_view text) {
     DataTypeText parts;
     std::size_t skipped = 0;

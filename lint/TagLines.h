@@ -38,6 +38,18 @@ struct UriField {
     int column;
 };
 
+/// What a list says of a tag beside its URI.
+struct ListFacts {
+    std::string name;                 ///< Empty for a tag without one of its own.
+    std::optional<long long> period;  ///< Milliseconds.
+    settings::Place periodPlace{};
+    const char* scaledBy = nullptr;  ///< What asks for a number: "the scale"; null: nothing does.
+    settings::Place scalePlace{};
+    std::optional<double> low{};
+    std::optional<double> high{};
+    settings::Place limitsPlace{};
+};
+
 struct TagLine {
     std::string uri;  ///< As written.
     settings::Place place;
@@ -46,6 +58,7 @@ struct TagLine {
     std::optional<TagFacts> facts;  ///< Nothing when the driver refused the tag.
     std::string driverUri;          ///< The URI with conversions for a byte order by name.
     std::string orderRefusal;       ///< Why the named byte order can't be; empty for most.
+    ListFacts listed{};
 
     [[nodiscard]] bool wellFormed() const { return fields.size() == 4; }
     [[nodiscard]] const std::string& node() const { return fields[0].text; }
@@ -60,9 +73,6 @@ struct TagLine {
 
 /// @param column  Of the URI's first character.
 TagLine tagLine(std::string_view uri, const std::string& source, int line, int column);
-
-/// One URI a line; "#" begins a comment; blanks around a URI and empty lines do not count.
-std::vector<TagLine> tagLines(const std::string& source, std::string_view text);
 
 /// A data type taken apart: "float-4(swap2, swap4)".
 struct DataTypeText {

@@ -144,7 +144,7 @@ const std::array<ListColumn, 10> kListColumns{
     ListColumn{"scale", takeScale, &CellColumns::scale},
     ListColumn{"offset", takeOffset, &CellColumns::offset},
     ListColumn{"unit", takeUnitName},
-    ListColumn{"decimals", takeDecimals},
+    ListColumn{"decimals", takeDecimals, &CellColumns::decimals},
     ListColumn{"low", takeLow, &CellColumns::low},
     ListColumn{"high", takeHigh},
     ListColumn{"comment", takeComment}};

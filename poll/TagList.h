@@ -25,6 +25,7 @@ struct CellColumns {
     int period = 1;
     int scale = 1;
     int offset = 1;
+    int decimals = 1;
     int low = 1;
 };
 

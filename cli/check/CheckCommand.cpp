@@ -5,6 +5,8 @@
 #include <ostream>
 
 #include "cli/Commands.h"
+#include "cli/TagNames.h"
+#include "cli/check/CheckedTags.h"
 #include "cli/check/DriverFacts.h"
 #include "cli/check/FindingText.h"
 #include "cli/describe/OfflineDriver.h"
@@ -23,7 +25,7 @@ using lint::TagLine;
 struct Options {
     std::string configFile;
     std::string tagsFile;
-    std::vector<std::string> uris;
+    std::vector<std::string> words;
     std::string protocol = "MRTU";
     bool json = false;
     bool strict = false;
@@ -35,19 +37,6 @@ struct Report {
     std::size_t tags = 0;
     bool configAccepted = false;
 };
-
-std::vector<TagLine> tagsOf(const Options& options) {
-    if (!options.tagsFile.empty()) {
-        return lint::tagLines(
-            options.tagsFile,
-            settings::readText("tags", options.tagsFile, {.bytes = settings::kTagListBytes}));
-    }
-    std::vector<TagLine> tags;
-    for (const std::string& uri : options.uris) {
-        tags.push_back(lint::tagLine(uri, "argument", static_cast<int>(tags.size()) + 1, 1));
-    }
-    return tags;
-}
 
 void append(Findings& all, const Findings& more) {
     all.insert(all.end(), more.begin(), more.end());
@@ -62,13 +51,14 @@ void checkTags(IProtocol& protocol, const lint::TagSurroundings& surroundings,
         append(out, lint::lintTag(tag, surroundings));
     }
     append(out, lint::lintOverlaps(tags, surroundings.description));
+    append(out, lint::lintList(tags, surroundings.description));
 }
 
-Report check(const Options& options, const std::string& plugin) {
+Report check(CommandContext& context, const Options& options) {
     const std::string text =
         settings::readText("configuration", options.configFile, {.bytes = settings::kConfigBytes});
-    std::vector<TagLine> tags = tagsOf(options);
-    const OfflineDriver driver(plugin, options.protocol);
+    auto [tags, complaints] = checkedTags(context, options.tagsFile, options.words);
+    const OfflineDriver driver(pluginFile(context), options.protocol);
     const settings::Description description = settings::parseDescription(driver.description());
     const settings::ScannedConfig config = settings::scanConfig(options.configFile, text);
 
@@ -76,6 +66,7 @@ Report check(const Options& options, const std::string& plugin) {
     report.tags = tags.size();
     report.configAccepted = driver.protocol().Config(text.c_str()) != 0;
     append(report.findings, lint::lintConfig(config, description));
+    append(report.findings, complaints);
     if (report.configAccepted) {
         checkTags(driver.protocol(), lint::surroundingsOf(text, description), tags,
                   report.findings);
@@ -112,10 +103,11 @@ void print(const Report& report, bool json, std::ostream& out) {
 
 constexpr const char* kFooter = R"(
 Examples:
-  mrtu check --config line.cfg --tags tags.txt
+  mrtu check --config line.cfg --tags tags.csv
   mrtu check --config line.cfg --strict '1?HREG?400001?unsignedShort'
 
-The tags file has one URI a line; "#" begins a comment. No port is opened.
+A list of tags is CSV with names and URIs, or has one URI a line. Without names the whole list is
+checked. No port is opened.
 Exit codes: 0 no errors, 1 warnings with --strict, 2 errors.)";
 
 }  // namespace
@@ -131,12 +123,9 @@ CommandSpec checkCommand(CommandContext& context) {
          .help = "The configuration's file",
          .valueName = "FILE",
          .required = true},
-        {.names = "uri", .target = &options->uris, .help = "Tags to check"},
-        {.names = "--tags",
-         .target = &options->tagsFile,
-         .help = "A file with one tag URI a line",
-         .valueName = "FILE",
-         .excludes = {"uri"}},
+        {.names = "uri",
+         .target = &options->words,
+         .help = "Tags to check; with --tags also names of the list"},
         {.names = "--json", .target = &options->json, .help = "Print JSON"},
         {.names = "--strict", .target = &options->strict, .help = "Warnings make the exit code 1"},
         {.names = "--protocol",
@@ -146,9 +135,10 @@ CommandSpec checkCommand(CommandContext& context) {
          .group = "Driver",
          .showsDefault = true},
     };
+    addTagsOption(command, options->tagsFile);
     addPluginOption(command, context);
     command.action = [options, &context] {
-        const Report report = check(*options, pluginFile(context));
+        const Report report = check(context, *options);
         print(report, options->json, context.out);
         context.exitCode = verdictOf(report.findings, options->strict);
     };

@@ -5,23 +5,6 @@
 namespace lint {
 namespace {
 
-using settings::Place;
-
-TEST(TagLinesTest, CommentsAndBlanksDoNotCount) {
-    const auto tags = tagLines("t", "# all\n\n  1?A?2?int  # one\r\n\t#\n1?B?3?int");
-    ASSERT_EQ(2U, tags.size());
-    EXPECT_EQ("1?A?2?int", tags[0].uri);
-    EXPECT_EQ((Place{"t", 3, 3}), tags[0].place);
-    EXPECT_EQ((Place{"t", 5, 1}), tags[1].place);
-}
-
-TEST(TagLinesTest, LinesMayEndInCarriageReturns) {
-    const auto tags = tagLines("t", "1?A?2?int\r\n1?A?3?int\r\n");
-    ASSERT_EQ(2U, tags.size());
-    EXPECT_EQ("1?A?2?int", tags[0].uri);
-    EXPECT_EQ("int", tags[1].dataType());
-}
-
 TEST(TagLinesTest, FieldsAreTrimmedAndKnowTheirColumns) {
     const TagLine tag = tagLine("1? HREG ?400001.3? int (swap2)", "t", 1, 5);
     ASSERT_TRUE(tag.wellFormed());

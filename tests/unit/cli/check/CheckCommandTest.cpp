@@ -229,10 +229,15 @@ std::string asShown(std::string text, const std::string& folder) {
 
 TEST_F(CheckCommandTest, DocumentationShowsTheRealOutput) {
     const std::string folder = SOURCE_FOLDER "/examples/check/";
-    const std::string copy = store("tags.txt", contentsOf(folder + "tags.txt"));
-    const Outcome outcome = check(contentsOf(folder + "line.cfg"), {"--tags", copy});
-    const std::string shown = asShown(outcome.out, fs::path(copy).parent_path().string() + "/");
-    EXPECT_NE(contentsOf(SOURCE_FOLDER "/docs/check.md").find(shown), std::string::npos) << shown;
+    const std::pair<const char*, const char*> examples[] = {{"line.cfg", "tags.txt"},
+                                                            {"plant.cfg", "plant.csv"}};
+    for (const auto& [config, list] : examples) {
+        const std::string copy = store(list, contentsOf(folder + list));
+        const Outcome outcome = check(contentsOf(folder + config), {"--tags", copy});
+        const std::string shown = asShown(outcome.out, fs::path(copy).parent_path().string() + "/");
+        EXPECT_NE(contentsOf(SOURCE_FOLDER "/docs/check.md").find(shown), std::string::npos)
+            << shown;
+    }
 }
 
 TEST_F(CheckCommandTest, JsonCountsWhatItLists) {
@@ -279,8 +284,61 @@ TEST_F(CheckCommandTest, TagsFileIsReadWithTheSameCare) {
     EXPECT_EQ(2, check(kGood, {"--tags", store("tags", std::string("1?\0", 3))}).code);
 }
 
-TEST_F(CheckCommandTest, FileAndArgumentsExcludeEachOther) {
-    EXPECT_EQ(2, check(kGood, {"--tags", "x", "1?HREG?400001?short"}).code);
+TEST_F(CheckCommandTest, NamesChooseTagsOfTheList) {
+    const std::string tags = store("tags.csv",
+                                   "name,uri\nflow,1?HREG?400001?short\nodd,1?HREG?400001?float\n"
+                                   "far,9?HREG?400005?short\n");
+    EXPECT_EQ("overlap unnamed-node ", rules(kGood, {"--tags", tags}));
+    EXPECT_EQ("", rules(kGood, {"--tags", tags, "flow"}));
+    EXPECT_EQ("", rules(kGood, {"--tags", tags, "odd", "1?HREG?400005?short"}));
+    EXPECT_EQ("unnamed-node overlap ",
+              rules(kGood, {"--tags", tags, "flow", "far", "1?HREG?400001?float"}));
+    const Outcome outcome = check(kGood, {"--tags", tags, "flwo"});
+    EXPECT_EQ("mrtu: no tag 'flwo' in " + tags + "; 'flow' perhaps\nmrtu: nothing was done\n",
+              outcome.err);
+    EXPECT_EQ(2, outcome.code);
+}
+
+TEST_F(CheckCommandTest, WhatOnlyAListShowsIsFound) {
+    const std::string tags = store("tags.csv",
+                                   "name,uri,period,scale,offset,decimals,low,high\n"
+                                   "flow,1?HREG?400001?short,500,0.1,,,0,100\n"
+                                   "slow,1?HREG?400001?short,2s,,,,,\n"
+                                   "lamp,1?OUTP?1?boolean,,10,,,,\n"
+                                   "bits,1?OUTP?9?boolean-8,,,1,,,\n"
+                                   "text,1?HREG?400020?string-8,,,,2,,\n"
+                                   "back,1?HREG?400030?float,,,,,10,-10\n");
+    const Outcome outcome = check(kGood, {"--tags", tags});
+    const auto has = [&](const char* text) {
+        EXPECT_NE(std::string::npos, outcome.out.find(text)) << text << " in\n" << outcome.out;
+    };
+    has("tags.csv:3:26: warning: 'slow' is wanted every 2000 ms, and 'flow' (");
+    has("tags.csv:2) on the same items every 500 ms [two-periods]\n");
+    has("tags.csv:4:24: warning: 'lamp' holds no number: the scale has no effect [unused-scale]\n");
+    has("tags.csv:5:27: warning: 'bits' holds no number: the offset has no effect");
+    has("tags.csv:6:32: warning: 'text' holds no number: the number of decimals has no effect");
+    has("tags.csv:7:30: warning: the low limit of 'back', 10, is above its high limit, -10: "
+        "nothing can be written [swapped-limits]\n");
+    EXPECT_EQ(0, outcome.code);
+}
+
+TEST_F(CheckCommandTest, MistakesOfAListAreErrorsAndDoNotHideTheOthers) {
+    const std::string tags = store("tags.csv",
+                                   "name,uri,period\nflow,1?HREG?400001?short,0\n"
+                                   "flow,1?HREG?400001?float,1\n,1?HREG?400009?short,1\n");
+    EXPECT_EQ("bad-period duplicate-name overlap empty-name ", rules(kGood, {"--tags", tags}));
+    const Outcome outcome = check(kGood, {"--tags", tags, "any"});
+    EXPECT_NE(std::string::npos,
+              outcome.out.find("tags.csv:3:1: error: a second tag 'flow', see line 2: expected a "
+                               "name of its own [duplicate-name]\n"))
+        << outcome.out;
+    EXPECT_EQ(2, outcome.code);
+    EXPECT_EQ("empty-list ", rules(kGood, {"--tags", store("empty", "# none\n")}));
+}
+
+TEST_F(CheckCommandTest, TheExampleListIsGood) {
+    EXPECT_EQ(
+        "", rules(kGood + "Node2::prefix=pump\n", {"--tags", SOURCE_FOLDER "/examples/tags.csv"}));
 }
 
 }  // namespace
