@@ -1,6 +1,7 @@
 // What the poller reads blocks and writes tags through, and the same over a loaded driver.
 #pragma once
 
+#include <chrono>
 #include <cstddef>
 #include <cstdint>
 #include <functional>
@@ -40,6 +41,12 @@ class BlockSource {
     /// Reads a block of the plan. @return one reading for each of block.tags, in their order; all
     /// of them belong to the same moment unless the block takes several requests.
     virtual std::vector<TagReading> read(const Block& block) = 0;
+    /// Reads a block to find out whether its node is back. @param wait  For the begin of the reply,
+    /// where the line can be told so; 0: as long as ever.
+    virtual std::vector<TagReading> probe(const Block& block, std::chrono::milliseconds wait) {
+        (void)wait;
+        return read(block);
+    }
     /// Writes a tag. @param value  In run-time form. @return nothing when the device took it.
     virtual std::optional<ReadError> write(std::size_t tag,
                                            std::span<const std::uint8_t> value) = 0;
@@ -65,6 +72,9 @@ class ChannelSource final : public BlockSource {
         std::function<bool()> gone;
         /// Why it could not be opened; empty, or answering "": the driver's text has to do.
         std::function<std::string()> whyNotOpen;
+        /// Limits how long the port waits for a reply, from now on and whatever the driver asks
+        /// for; 0 ends that. Empty: a probe takes the driver's own time-out.
+        std::function<void(std::chrono::milliseconds)> limitWait;
     };
 
     /// @param channel  Configured; outlives this object. It is stopped by close() alone.
@@ -72,6 +82,7 @@ class ChannelSource final : public BlockSource {
     ChannelSource(runtime::Channel& channel, std::vector<const ITag*> tags, Port port = {});
 
     std::vector<TagReading> read(const Block& block) override;
+    std::vector<TagReading> probe(const Block& block, std::chrono::milliseconds wait) override;
     std::optional<ReadError> write(std::size_t tag, std::span<const std::uint8_t> value) override;
     bool open() override;
     void close() override;

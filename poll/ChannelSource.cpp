@@ -39,6 +39,13 @@ std::vector<TagReading> ChannelSource::read(const Block& block) {
     return readings;
 }
 
+std::vector<TagReading> ChannelSource::probe(const Block& block, std::chrono::milliseconds wait) {
+    if (port_.limitWait) port_.limitWait(wait);
+    std::vector<TagReading> readings = read(block);
+    if (port_.limitWait) port_.limitWait(std::chrono::milliseconds{0});
+    return readings;
+}
+
 TagReading ChannelSource::readAlone(const ITag& tag) {
     auto value = channel_.read(tag);
     if (!value) return {.error = {value.error().code, value.error().text}};

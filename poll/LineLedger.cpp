@@ -56,6 +56,11 @@ bool LineLedger::reachable(int node) const {
     return nodes_.at(node).health.reachable();
 }
 
+std::chrono::nanoseconds LineLedger::longestAnswer(int node) const {
+    const std::lock_guard lock(mutex_);
+    return nodes_.at(node).statistics.longestAnswer();
+}
+
 std::optional<std::pair<int, LineLedger::TimePoint>> LineLedger::nextProbe() const {
     const std::lock_guard lock(mutex_);
     std::optional<std::pair<int, TimePoint>> first;

@@ -46,6 +46,9 @@ class LineLedger {
     /// @return the unreachable node whose probe is due first, and when.
     [[nodiscard]] std::optional<std::pair<int, TimePoint>> nextProbe() const;
 
+    /// @return the longest time in which the node has ever answered; 0 when it never has.
+    [[nodiscard]] std::chrono::nanoseconds longestAnswer(int node) const;
+
     [[nodiscard]] std::vector<NodeState> nodes(TimePoint now) const;
     [[nodiscard]] LineState line(TimePoint now) const;
 

@@ -9,6 +9,9 @@ namespace {
 
 const char* const kPort = "port";
 
+// A device that has just come back may be slower than it was.
+constexpr std::chrono::milliseconds kShortestProbe{50};
+
 std::vector<Schedule::Duration> periodsOf(const std::vector<Block>& blocks) {
     std::vector<Schedule::Duration> periods;
     periods.reserve(blocks.size());
@@ -146,7 +149,7 @@ bool LineMachine::probe(TimePoint now) {
     if (due && *due < probe->second) return false;
     const std::size_t block = nodes_.at(probe->first).probe;
     const Block& part = setup_->blocks[block];
-    const Outcome outcome = read(part);
+    const Outcome outcome = lookFor(part);
     if (outcome.failure.heard() && outcome.failure.kind != FailureKind::Refusal)
         keep(block, part, outcome);
     settle({part.node, part.requests, outcome.failure, outcome.from, outcome.to}, outcome.error);
@@ -198,9 +201,22 @@ void LineMachine::proceed(std::size_t block) {
 }
 
 LineMachine::Outcome LineMachine::read(const Block& part) {
+    return timed([&] { return source_->read(part); });
+}
+
+// A node that has answered before is not waited for much longer than it ever took.
+LineMachine::Outcome LineMachine::lookFor(const Block& part) {
+    const auto longest =
+        std::chrono::ceil<std::chrono::milliseconds>(ledger_.longestAnswer(part.node));
+    const auto wait = longest.count() > 0 ? std::max(2 * longest, kShortestProbe) : longest;
+    return timed([&] { return source_->probe(part, wait); });
+}
+
+template <class Reading>
+LineMachine::Outcome LineMachine::timed(Reading&& reading) {
     Outcome outcome;
     outcome.from = clock_.now();
-    outcome.readings = source_->read(part);
+    outcome.readings = reading();
     outcome.to = clock_.now();
     outcome.error = errorOf(outcome.readings);
     outcome.failure = classify(outcome.error);

@@ -76,6 +76,9 @@ class LineMachine {
     bool resume();
     void proceed(std::size_t block);
     Outcome read(const Block& part);
+    Outcome lookFor(const Block& part);
+    template <class Reading>
+    Outcome timed(Reading&& reading);
     void judge(std::size_t block, const Block& part, const Outcome& outcome);
     void accept(std::size_t block, const Block& part);
     bool refuse(std::size_t block, const Block& part, const Outcome& outcome);

@@ -19,6 +19,7 @@ class NodeStatistics {
     void add(const Failure& failure, int requests, int repeats, std::chrono::nanoseconds taken);
     /// Fills what is counted; number, reachability and unreachable time stay as they are.
     void fill(NodeState& state) const;
+    [[nodiscard]] std::chrono::nanoseconds longestAnswer() const { return taken_.max(); }
 
   private:
     NodeState counts_;

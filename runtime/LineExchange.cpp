@@ -92,10 +92,16 @@ void LineExchange::keepSilence(ByteView request, const Pace& format) {
     if (line_.now() < silentEnough) line_.sleepUntil(silentEnough);
 }
 
+Milliseconds LineExchange::longestWait() const {
+    const int limit = options_.longestWait ? options_.longestWait->load() : 0;
+    return limit > 0 ? Milliseconds{limit} : Milliseconds::max();
+}
+
 Transfer LineExchange::receiveByte(std::uint8_t& byte, Milliseconds timeout) {
     dropOldInput();
     if (timeout <= Milliseconds{0}) return lookForByte(byte);
     if (refused_) return Transfer::TimedOut;
+    timeout = std::min(timeout, longestWait());
     if (book_) book_->awaits(timeout);
     const TimePoint deadline = std::max(line_.now(), onWireAt_) + timeout;
     for (;;) {

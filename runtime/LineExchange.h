@@ -32,6 +32,9 @@ struct ExchangeOptions {
     std::shared_ptr<const ReplyRules> rules;  ///< Null: nothing is known of what passes.
     FrameEndBy frameEnd = FrameEndBy::Silence;
     Milliseconds gapFloor{0};  ///< The shortest silence that ends a frame.
+    /// The longest wait for the first byte of a reply, in ms, whatever is asked for; it may change
+    /// at any time. Null or 0: as long as is asked for.
+    std::shared_ptr<const std::atomic<int>> longestWait;
     /// Told what people should know, each thing once: a node that answers later than is waited
     /// for, replies that are cut by pauses. Called on the thread that uses the port.
     std::function<void(const std::string&)> report;
@@ -97,6 +100,7 @@ class LineExchange {
     void dropOldInput();
     void dropInput(std::size_t count);
 
+    Milliseconds longestWait() const;
     void keepSilence(ByteView request, const Pace& pace);
 
     Transfer lookForByte(std::uint8_t& byte);

@@ -78,6 +78,7 @@ void PosixSerialFactory::setThrownAway(
 ExchangeOptions PosixSerialFactory::exchangeOf(const std::string& port) const {
     ExchangeOptions options = exchange_;
     options.port = port;
+    options.longestWait = longestWait_;
     if (thrownAway_) {
         options.thrownAway = [port, show = thrownAway_](ByteView frame) { show(port, frame); };
     }

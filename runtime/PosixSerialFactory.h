@@ -66,6 +66,11 @@ class PosixSerialFactory final : public ISerialFactory {
     /// USB adapters hand over what they receive in chunks, with pauses that the line did not have.
     void setGapFloor(int ms);
 
+    /// The longest wait, in ms, for the first byte of a reply, whatever longer one a driver asks
+    /// for; counts at once, also on ports that are open. 0 (the default) leaves the driver's wait
+    /// alone. For a look at whether a device is back.
+    void limitWait(int ms) { *longestWait_ = ms; }
+
     // For ports opened from now on, see ExchangeOptions.
     void setFrameEnd(FrameEndBy frameEnd);
     /// @param rules  Null (the default): the ports know nothing of what passes.
@@ -99,6 +104,7 @@ class PosixSerialFactory final : public ISerialFactory {
     std::map<std::string, std::string> devices_;
     std::map<ISerialPort*, std::unique_ptr<PosixSerialPort>> open_;
     std::shared_ptr<SerialErrors> errors_;
+    const std::shared_ptr<std::atomic<int>> longestWait_ = std::make_shared<std::atomic<int>>(0);
     ExchangeOptions exchange_;
     std::function<void(const std::string&, ByteView)> thrownAway_;
 };

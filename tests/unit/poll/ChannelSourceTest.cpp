@@ -140,6 +140,17 @@ TEST_F(ChannelSourceTest, WritesAreTheDriversWithItsErrors) {
     EXPECT_EQ(-4, refused->code);
 }
 
+TEST_F(ChannelSourceTest, ProbeLimitsThePortsWaitWhileItLasts) {
+    std::vector<std::chrono::milliseconds> limits;
+    ChannelSource source(
+        driver_.channel(), driver_.tags({"1?HREG?400001?short"}),
+        {.gone = {}, .whyNotOpen = {}, .limitWait = [&](std::chrono::milliseconds wait) {
+             limits.push_back(wait);
+         }});
+    EXPECT_TRUE(source.probe(block(1, 1, 2), std::chrono::milliseconds{40}).front().good);
+    EXPECT_EQ((std::vector{std::chrono::milliseconds{40}, std::chrono::milliseconds{0}}), limits);
+}
+
 TEST_F(ChannelSourceTest, ClosedLineReadsNothingUntilItIsOpenedAgain) {
     ChannelSource source(driver_.channel(), driver_.tags({"1?HREG?400001?short"}));
     const Block one = block(1, 1, 2);

@@ -20,7 +20,7 @@
 namespace poll_test {
 
 /// Nodes 1 (Modicon), 2 (items from 0, short requests) and 3 (Enron: 32-bit registers 5000..5999),
-/// all areas full and of random content.
+/// all areas full, their first and last items of random content.
 class LoadedDriver {
   public:
     explicit LoadedDriver(std::uint32_t seed = 1) {
@@ -69,7 +69,7 @@ class LoadedDriver {
         for (const std::uint8_t node : {std::uint8_t{1}, std::uint8_t{2}, std::uint8_t{3}})
             for (const sim::Area area : {sim::Area::Coil, sim::Area::DiscreteInput,
                                          sim::Area::HoldingRegister, sim::Area::InputRegister})
-                for (std::uint32_t item = 0; item < 65536; ++item)
+                for (std::uint32_t item = 0; item < 65536; item += item == 4999 ? 60001 : 1)
                     slave_.set(node, area, item, static_cast<std::uint32_t>(random() >> 7U));
         for (std::uint32_t item = 5000; item < 6000; ++item)
             slave_.set(3, sim::Area::LongRegister, item, static_cast<std::uint32_t>(random()) * 5U);

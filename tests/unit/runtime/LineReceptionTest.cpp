@@ -3,7 +3,9 @@
 #include <gmock/gmock.h>
 
 #include <array>
+#include <atomic>
 #include <limits>
+#include <memory>
 
 #include "tests/unit/runtime/FakeLine.h"
 
@@ -27,6 +29,21 @@ struct LineReceptionTest : ::testing::Test {
     LineExchange port{line, {}};
     std::array<std::uint8_t, 512> buffer{};
 };
+
+TEST_F(LineReceptionTest, LimitedWaitForTheFirstByteEndsEarlyUntilTheLimitIsLifted) {
+    const auto limit = std::make_shared<std::atomic<int>>(50);
+    ExchangeOptions options;
+    options.longestWait = limit;
+    LineExchange limited(line, options);
+    std::uint8_t byte = 0;
+    EXPECT_EQ(Transfer::TimedOut, limited.receiveByte(byte, 1000ms));
+    EXPECT_EQ(50, line.elapsedMs());
+    EXPECT_EQ(Transfer::TimedOut, limited.receiveByte(byte, 20ms));
+    EXPECT_EQ(70, line.elapsedMs()) << "a shorter wait stays as it is";
+    *limit = 0;
+    EXPECT_EQ(Transfer::TimedOut, limited.receiveByte(byte, 1000ms));
+    EXPECT_EQ(1070, line.elapsedMs());
+}
 
 TEST_F(LineReceptionTest, SilenceEndsTheFrame) {
     line.arrive(1, {1});
