@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "tests/unit/poll/FakeLine.h"
+#include "tests/unit/poll/FakeSource.h"
 
 namespace poll {
 namespace {

@@ -3,7 +3,7 @@
 
 #include "poll/LineMachine.h"
 #include "tests/support/AllocationCounter.h"
-#include "tests/unit/poll/FakeLine.h"
+#include "tests/unit/poll/FakeSource.h"
 
 namespace poll {
 namespace {

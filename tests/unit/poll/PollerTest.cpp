@@ -9,7 +9,7 @@
 #include <stdexcept>
 #include <thread>
 
-#include "tests/unit/poll/FakeLine.h"
+#include "tests/unit/poll/FakeSource.h"
 
 namespace poll {
 namespace {

@@ -5,7 +5,7 @@
 #include <atomic>
 #include <thread>
 
-#include "tests/unit/poll/FakeLine.h"
+#include "tests/unit/poll/FakeSource.h"
 
 namespace poll {
 namespace {
