@@ -14,12 +14,13 @@
 #include <string>
 #include <vector>
 
-#include "bench/poll/FixedGap.h"
 #include "bench/poll/MixedTags.h"
 #include "bench/poll/PacedLine.h"
 #include "poll/BlockReader.h"
 #include "poll/Plan.h"
-#include "tests/unit/poll/PlaceByHand.h"
+#include "poll/Rivals.h"
+#include "poll/TagPlacing.h"
+#include "settings/DescriptionBlock.h"
 #include "tests/unit/poll/SlavePort.h"
 
 namespace {
@@ -50,11 +51,21 @@ poll::CostModel costsWith(std::chrono::nanoseconds gapAfterReply) {
 
 std::vector<poll::TagPlace> placesOf(runtime::Channel& channel,
                                      const std::vector<const ITag*>& tags) {
+    const auto description =
+        settings::parseDescription(settings::inflateDescription(channel.protocol().GetXml()));
     std::vector<poll::TagPlace> places;
     places.reserve(tags.size());
     for (const ITag* tag : tags)
-        places.push_back(poll_test::placeOf(*channel.as<IProtocol4>("IProtocol4"), *tag));
+        places.push_back(poll::placeOf(*tag, channel, description).value());
     return places;
+}
+
+/// Time of the whole plan, one read of every block.
+std::chrono::nanoseconds cycleOf(const Blocks& blocks) {
+    std::chrono::nanoseconds sum{0};
+    for (const poll::Block& block : blocks)
+        sum += block.cost;
+    return sum;
 }
 
 /// One read of every block. Errors: std::runtime_error when a tag has no value.
@@ -82,11 +93,11 @@ struct Contender {
 std::vector<Contender> contenders(const std::vector<poll::TagPlace>& places,
                                   const poll::CostModel& costs) {
     std::vector<Contender> plans{{"plan", poll::makePlan(places, {}, costs).blocks}};
-    for (const long gap : {0L, 8L, 50L})
-        plans.push_back(
-            {fmt::format("fixed gap {}", gap), bench::fixedGapBlocks(places, {}, costs, gap)});
+    for (const long gap : poll::kFixedGaps)
+        plans.push_back({fmt::format("fixed gap {}", gap),
+                         poll::planOfFixedGap(places, gap, {}, costs).blocks});
     std::sort(plans.begin() + 1, plans.end(), [](const Contender& a, const Contender& b) {
-        return bench::cycleOf(a.blocks) < bench::cycleOf(b.blocks);
+        return cycleOf(a.blocks) < cycleOf(b.blocks);
     });
     return plans;
 }
@@ -99,12 +110,12 @@ void paced(const std::string& plugin, int cycles, runtime::FrameEndBy frameEnd,
     const auto places = placesOf(line.channel(), tags);
     const auto costs = costsWith(gap);
     auto plans = contenders(places, costs);
-    const auto single = bench::fixedGapBlocks(places, {}, costs, -1);
+    const auto single = poll::planOfSingles(places, {}, costs).blocks;
     plans.erase(plans.begin() + 2, plans.end());
     for (int done = 0; done < cycles; ++done)
         for (Contender& plan : plans)
             plan.times.push_back(cycle(source, plan.blocks));
-    const auto predicted = bench::cycleOf(plans[0].blocks);
+    const auto predicted = cycleOf(plans[0].blocks);
     const auto measured = median(plans[0].times);
     row("1,000 tags, 4 nodes, " + by + ": cycle measured / predicted",
         fmt::format("{} / {} = {:.3f}", text(measured), text(predicted),
@@ -116,8 +127,8 @@ void paced(const std::string& plugin, int cycles, runtime::FrameEndBy frameEnd,
             static_cast<double>(single.size()) / static_cast<double>(plans[0].blocks.size())),
         "5 or more");
     row("- predicted, one a tag / plan",
-        fmt::format("{} / {} = {:.1f}", text(bench::cycleOf(single)), text(predicted),
-                    ratio(bench::cycleOf(single), predicted)));
+        fmt::format("{} / {} = {:.1f}", text(cycleOf(single)), text(predicted),
+                    ratio(cycleOf(single), predicted)));
     row("- measured, best fixed gap / plan",
         fmt::format("{} ({}) / {} = {:.3f}", text(median(plans[1].times)), plans[1].name,
                     text(measured), ratio(median(plans[1].times), measured)),
@@ -131,12 +142,11 @@ void oneNode(const std::string& plugin) {
     const auto costs = costsWith({});
     const auto plans = contenders(places, costs);
     const auto show = [&](const std::string& name, const Blocks& blocks) {
-        row("- " + name,
-            fmt::format("{} requests, {}", blocks.size(), text(bench::cycleOf(blocks))));
+        row("- " + name, fmt::format("{} requests, {}", blocks.size(), text(cycleOf(blocks))));
     };
     row("1,000 tags, 1 node, spread wide, predicted:", "");
-    show("one request a tag", bench::fixedGapBlocks(places, {}, costs, -1));
-    show("fewest requests", bench::fixedGapBlocks(places, {}, costs, 100000));
+    show("one request a tag", poll::planOfSingles(places, {}, costs).blocks);
+    show("fewest requests", poll::planOfFixedGap(places, 100000, {}, costs).blocks);
     for (const Contender& plan : plans)
         show(plan.name, plan.blocks);
 }
