@@ -11,6 +11,7 @@ LineLedger::LineLedger(const LineSetup& setup, TimePoint now)
 }
 
 LineLedger::Turn LineLedger::enter(const Transaction& transaction) {
+    if (transaction.requests == 0) return Turn::None;
     const std::lock_guard lock(mutex_);
     load_.busy(transaction.from, transaction.to);
     Node& node = nodes_.at(transaction.node);

@@ -20,7 +20,7 @@ namespace poll {
 /// One request, or the requests of one read.
 struct Transaction {
     int node = 0;
-    int requests = 1;  ///< When it succeeds.
+    int requests = 1;  ///< When it succeeds; 0: the driver answers by itself.
     Failure failure;
     Clock::TimePoint from, to;
 };

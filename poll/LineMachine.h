@@ -54,9 +54,9 @@ class LineMachine {
         std::chrono::nanoseconds taken{0};  // In this round.
     };
     struct NodeWork {
-        std::vector<std::size_t> blocks;
-        std::size_t probe = 0;  // The cheapest of them.
-        bool isFaulty = false;  // And told to be so.
+        std::vector<std::size_t> blocks;  // Those that it is asked for.
+        std::size_t probe = 0;            // The cheapest of them.
+        bool isFaulty = false;            // And told to be so.
     };
 
     struct Outcome {
@@ -66,6 +66,7 @@ class LineMachine {
         TimePoint from, to;
     };
 
+    void addBlock(const Block& block);
     bool open(TimePoint now);
     void loseLine(const std::string& fault);
     void doWrite(PendingWrite write);
@@ -74,6 +75,7 @@ class LineMachine {
     bool probe(TimePoint now);
     bool begin(TimePoint now);
     bool resume();
+    bool isWorthIt(const Block& block) const;
     void proceed(std::size_t block);
     Outcome read(const Block& part);
     Outcome lookFor(const Block& part);

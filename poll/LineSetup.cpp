@@ -34,8 +34,8 @@ bool holds(const Block& block, const TagPlace& place) {
 }
 
 Complaint aboutBlock(const LineSetup& setup, const Block& block, std::vector<bool>& isPlanned) {
-    if (block.tags.empty() || block.period <= block.period.zero() || block.requests < 1)
-        return fmt::format("{}: a block without tags, period or request", setup.name);
+    if (block.tags.empty() || block.period <= block.period.zero() || block.requests < 0)
+        return fmt::format("{}: a block without tags or period", setup.name);
     for (const std::size_t tag : block.tags) {
         if (tag >= setup.places.size())
             return fmt::format("{}: a block of a tag that is not in the list", setup.name);

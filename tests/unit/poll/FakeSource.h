@@ -85,6 +85,7 @@ class FakeSource final : public BlockSource {
 
   private:
     std::vector<TagReading> answer(const Block& block) {
+        if (block.requests == 0) return all(block, {}, milliseconds{0});
         if (!devices_.isPresent) return all(block, {-1, "I/O error"}, milliseconds{0});
         if (devices_.dead.contains(block.node)) return all(block, kSilent, devices_.timeout);
         if (devices_.noisy.contains(block.node)) return all(block, kNoise, devices_.timeout);

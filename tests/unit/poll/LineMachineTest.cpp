@@ -142,6 +142,19 @@ TEST(LineMachineTest, ProbesOfANodeAreSingleRequests) {
     EXPECT_EQ(0U, node.replies);
 }
 
+TEST(LineMachineTest, WhatTheDriverAnswersByItselfDependsOnNoNode) {
+    SetupBuilder builder = twoBlocks();
+    builder.block(1, 900, 1, milliseconds{100});
+    builder.setup().blocks.back().requests = 0;
+    FakeLine line(builder);
+    line.devices.dead = {1};
+    line.run(seconds{60});
+    EXPECT_FALSE(line.node(0).reachable);
+    EXPECT_EQ(12U, line.node(0).requests);
+    EXPECT_EQ(Quality::Good, line.tag(6).quality);
+    EXPECT_GT(line.tag(6).count, 500U);
+}
+
 TEST(LineMachineTest, RepetitionsOfFailedRequestsAreCounted) {
     SetupBuilder builder = twoBlocks();
     builder.setup().repeats = 2;

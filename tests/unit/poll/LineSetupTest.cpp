@@ -37,7 +37,7 @@ TEST(LineSetupTest, EveryComplaintNamesLineAndTag) {
         {"com1: tag t1 lies outside its block", [](LineSetup& s) { s.blocks[0].items = 1; }},
         {"com1: a block of a tag that is not in the list",
          [](LineSetup& s) { s.blocks[0].tags = {9}; }},
-        {"com1: a block without tags, period or request",
+        {"com1: a block without tags or period",
          [](LineSetup& s) { s.blocks[1].period = milliseconds{0}; }},
         {"com1: pauses and numbers of failures must be above 0",
          [](LineSetup& s) { s.patience.failures = 0; }},
