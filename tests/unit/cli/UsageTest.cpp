@@ -66,7 +66,7 @@ TEST(UsageTest, WhatIsUnknownIsAnsweredWithWhatIsAccepted) {
     } rows[] = {
         {{"reed", kUri},
          "unknown command: 'reed' is not one of read, write, console, override, info, describe, "
-         "check, inspect, sim; did you mean 'read'?"},
+         "check, plan, inspect, sim; did you mean 'read'?"},
         {{"override", "lst"},
          "unknown command: 'lst' is not one of list, set, clear; did you mean 'list'?"},
         {{"override"}, "one of list, set, clear must follow; 'mrtu override --help' tells more"},
