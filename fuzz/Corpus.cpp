@@ -16,6 +16,8 @@ const std::vector<std::string> seeds{
     "Node3::timeout=500 Node3::model=3",
     std::string("\x01\x03\x02\x03\xF1\x79\x30", 7),
     ":010302002AD0\r\n",
+    "name,uri,period,scale,decimals,low\r\na,\"1?A?2?float(swap2,swap4)\",2s,0.1,1,-5\n# "
+    "b\nc,d,,,,\n",
 };
 
 constexpr int kRounds = 20000;
