@@ -53,7 +53,7 @@ poll::TagList readTagList(const std::string& file) {
     });
 }
 
-TagNames::TagNames(CommandContext& context, std::string file)
+TagNames::TagNames(CommandContext& context, const std::string& file)
     : TagNames(context, file, goodTags(context, file)) {}
 
 TagNames::TagNames(CommandContext& context, std::string file, std::vector<poll::ListedTag> tags)

@@ -21,7 +21,7 @@ class TagNames {
     /// @param file  Empty: no list; every word is a URI then.
     /// Errors: CommandError (Usage) when the file can't be read or its list is not good, after
     /// every complaint was made on the context.
-    TagNames(CommandContext& context, std::string file);
+    TagNames(CommandContext& context, const std::string& file);
 
     /// A list that was read before. @param file  For complaints; empty: no list.
     TagNames(CommandContext& context, std::string file, std::vector<poll::ListedTag> tags);

@@ -20,6 +20,7 @@ std::string lowerCase(std::string text) {
 
 std::string unknownColumn(const std::string& name) {
     std::vector<std::string> names;
+    names.reserve(kListColumns.size());
     for (const ListColumn& column : kListColumns)
         names.emplace_back(column.name);
     const std::string nearest = values::nearestName(name, names);
