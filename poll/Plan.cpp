@@ -15,7 +15,10 @@ struct AreaKey {
     bool bits;
     int itemBytes;
 
-    auto operator<=>(const AreaKey&) const = default;
+    bool operator<(const AreaKey& other) const {
+        return std::tie(node, area, bits, itemBytes) <
+               std::tie(other.node, other.area, other.bits, other.itemBytes);
+    }
 };
 
 using Areas = std::map<AreaKey, std::vector<AreaTag>>;

@@ -49,8 +49,9 @@ std::vector<std::size_t> inGroups(std::span<const TagPlace> places) {
     std::vector<std::size_t> order(places.size());
     std::iota(order.begin(), order.end(), std::size_t{0});
     std::sort(order.begin(), order.end(), [&](std::size_t one, std::size_t other) {
-        const auto groups = groupOf(places[one]) <=> groupOf(places[other]);
-        return groups == 0 ? places[one].first < places[other].first : groups < 0;
+        if (groupOf(places[one]) != groupOf(places[other]))
+            return groupOf(places[one]) < groupOf(places[other]);
+        return places[one].first < places[other].first;
     });
     return order;
 }
