@@ -29,7 +29,8 @@ Value valueOf(runtime::Result<Value, Error> result) {
 /// 8 data bits, even parity.
 inline constexpr wire::LineRate kRate{.baud = 19200, .characterBits = 11};
 
-/// One line with nodes 1..`nodes`, opened. Errors: std::runtime_error, std::system_error.
+/// One line with nodes 1..`nodes`, opened. A reply that a busy machine cuts is asked for again.
+/// Errors: std::runtime_error, std::system_error.
 class PacedLine {
   public:
     PacedLine(const std::string& plugin, int nodes, runtime::FrameEndBy frameEnd)
@@ -40,7 +41,7 @@ class PacedLine {
         serial_.setFrameEnd(frameEnd);
         valueOf(
             channel_.configure("CfgVer=1 defNodeId=1 uart=com1 baudrate=19200 parity=even "
-                               "bits=8 stopbits=1 mode=RS-232 txMode=RTU repeat=0 "
+                               "bits=8 stopbits=1 mode=RS-232 txMode=RTU repeat=2 "
                                "timeout=1000"));
         valueOf(channel_.start());
     }
