@@ -26,6 +26,11 @@ struct CommandContext {
     std::string pluginOption;
     /// What complain() has said so far.
     std::vector<std::string> complaints{};
+    /// Where a command writes that does not end by itself, and what it writes is to be seen at
+    /// once: with --json, `out` is kept back until the end. Null: `out`.
+    std::ostream* liveOut = nullptr;
+    /// Whether anything went to `liveOut`; it is the whole answer then.
+    bool wroteLive = false;
 };
 
 /// Declares `--plugin FILE` on a sub-command that loads the driver.
@@ -45,7 +50,7 @@ CommandSpec commandLine(CommandContext& context);
 
 /// Runs a whole command line, also `--help` and `--version`. With `--json` among the words, `out`
 /// gets one JSON document in every case: what the command printed, or, when it ended before,
-/// {"exitCode": 2, "errors": ["..."]} with the complaints.
+/// {"exitCode": 2, "errors": ["..."]} with the complaints. Of `poll` each line is a document.
 /// @return what main() returns: the number of an ExitCode.
 int runCommandLine(int argc, const char* const* argv, std::ostream& out, std::ostream& err);
 

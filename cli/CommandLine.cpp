@@ -74,8 +74,8 @@ CommandSpec commandLine(CommandContext& context) {
             .version = "mrtu " MRTU_VERSION,
             .commands = {readCommand(context), writeCommand(context), consoleCommand(context),
                          overrideCommand(context), infoCommand(context), describeCommand(context),
-                         checkCommand(context), planCommand(context), inspectCommand(context),
-                         simCommand(context)}};
+                         checkCommand(context), planCommand(context), pollCommand(context),
+                         inspectCommand(context), simCommand(context)}};
 }
 
 namespace {
@@ -104,7 +104,9 @@ ExitCode runForJson(int argc, const char* const* argv, std::ostream& out, std::o
     std::ostringstream document;
     CommandContext context{
         .out = document, .err = err, .exitCode = ExitCode::Done, .pluginOption = {}};
+    context.liveOut = &out;
     const ExitCode code = runCommand(argc, argv, context);
+    if (context.wroteLive) return code;
     const std::string text = document.str();
     out << (text.empty() ? errorDocument(code, context.complaints) : text);
     return code;

@@ -15,6 +15,7 @@ CommandSpec overrideCommand(CommandContext& context);
 CommandSpec describeCommand(CommandContext& context);
 CommandSpec checkCommand(CommandContext& context);
 CommandSpec planCommand(CommandContext& context);
+CommandSpec pollCommand(CommandContext& context);
 CommandSpec inspectCommand(CommandContext& context);
 
 }  // namespace cli

@@ -58,28 +58,27 @@ runtime::FrameEndBy frameEndOf(const LineOptions& options) {
                                         : runtime::FrameEndBy::Silence;
 }
 
-runtime::ProtocolObject makeProtocol(const std::string& plugin, IInterfaceFactory& host,
-                                     const std::string& name) {
+runtime::Module bindModule(const std::string& plugin, IInterfaceFactory& host) {
     const auto library = valueOr(runtime::PluginLibrary::load(plugin), ExitCode::Other);
-    const auto module = valueOr(runtime::Module::bind(library, host), ExitCode::Other);
-    return valueOr(module.createProtocol(name), ExitCode::Other);
+    return valueOr(runtime::Module::bind(library, host), ExitCode::Other);
 }
 
 }  // namespace
 
-/// In the order of their making; the driver, last, goes first.
-struct Session::Parts {
-    Parts(CommandContext& of, const LineOptions& options, StorageNeed need)
+/// The host of the drivers, in the order of its making. A plug-in has one host in a process, so
+/// sessions that live at the same time share it.
+struct Session::Host {
+    Host(CommandContext& of, const LineOptions& options, const std::string& configText,
+         StorageNeed need)
         : context(of),
-          configText(configTextOf(options)),
           ports(portsOf(options, configText)),
           plugin(pluginFile(context)),
           storage(openOverrides(context, options, need)),
           simulator(makeSimulator(options, configText)),
           watch(watcher(portGone, context.err, options, isAscii(configText))),
           tracing(serial, watch),
-          host(multiTask, tracing, storage.get()),
-          channel(makeProtocol(plugin, host, options.protocol)) {
+          services(multiTask, tracing, storage.get()),
+          module(bindModule(plugin, services)) {
         serial.setGapFloor(options.minGapMs);
         serial.setFrameEnd(frameEndOf(options));
         serial.setReplyRules(std::make_shared<runtime::ModbusReplies>());
@@ -98,23 +97,53 @@ struct Session::Parts {
         }
     }
 
+    void startSimulator() {
+        if (simulated) return;
+        try {
+            simulator->start();
+        } catch (const std::system_error& error) {
+            throw CommandError(ExitCode::Port, fmt::format("simulated line: {}", error.what()));
+        }
+        simulated = true;
+    }
+
     CommandContext& context;
-    std::string configText;
     std::vector<PortMapping> ports;
     std::string plugin;
     std::unique_ptr<runtime::Storage> storage;
     std::unique_ptr<sim::Simulator> simulator;
+    bool simulated = false;
     runtime::PosixMultiTask multiTask;
     runtime::PosixSerialFactory serial;
     bool portGone = false;
     runtime::TracingSerialFactory::Callback watch;
     runtime::TracingSerialFactory tracing;
-    runtime::ServiceFactory host;
+    runtime::ServiceFactory services;
+    runtime::Module module;
+};
+
+/// The driver goes before its host.
+struct Session::Parts {
+    CommandContext& context;
+    std::string configText;
+    std::shared_ptr<Host> host;
     runtime::Channel channel;
+    bool prepared = false;
 };
 
 Session::Session(CommandContext& context, const LineOptions& options, StorageNeed need)
-    : parts_(std::make_unique<Parts>(context, options, need)) {
+    : Session(context, options, configTextOf(options), need, nullptr) {}
+
+Session::Session(CommandContext& context, const LineOptions& options, const Session& beside)
+    : Session(context, options, configTextOf(options), StorageNeed::Use, beside.parts_->host) {}
+
+Session::Session(CommandContext& context, const LineOptions& options, std::string configText,
+                 StorageNeed need, std::shared_ptr<Host> host) {
+    if (!host) host = std::make_shared<Host>(context, options, configText, need);
+    runtime::ProtocolObject protocol =
+        valueOr(host->module.createProtocol(options.protocol), ExitCode::Other);
+    parts_.reset(new Parts{context, std::move(configText), std::move(host),
+                           runtime::Channel(std::move(protocol))});
     if (!options.ident.empty()) parts_->channel.setIdent(options.ident);
     warnOfUnknownKeys(context, parts_->channel.protocol(), parts_->configText);
     if (const auto done = parts_->channel.configure(parts_->configText); !done) {
@@ -125,31 +154,42 @@ Session::Session(CommandContext& context, const LineOptions& options, StorageNee
 Session::~Session() = default;
 
 bool Session::portGone() const {
-    return parts_->portGone || parts_->serial.portGone();
+    return parts_->host->portGone || parts_->host->serial.portGone();
 }
 
 std::uint64_t Session::framesSent() const {
-    return parts_->tracing.counts().framesSent;
+    return parts_->host->tracing.counts().framesSent;
 }
 
-void Session::start() {
+bool Session::portVanished() const {
+    return parts_->host->serial.portGone();
+}
+
+std::string Session::portFault() const {
+    return parts_->host->serial.lastError();
+}
+
+void Session::prepareLine() {
+    if (parts_->prepared) return;
     if (!hasLine()) {
         throw CommandError(ExitCode::Usage, "no line: --port com1=/dev/ttyUSB0, or --sim");
     }
-    if (parts_->simulator) {
-        try {
-            parts_->simulator->start();
-        } catch (const std::system_error& error) {
-            throw CommandError(ExitCode::Port, fmt::format("simulated line: {}", error.what()));
-        }
-        parts_->mapPort({settings::itemOf(parts_->configText, "uart").value_or("com1"),
-                         parts_->simulator->path()});
+    if (parts_->host->simulator) {
+        parts_->host->startSimulator();
+        parts_->host->mapPort({settings::itemOf(parts_->configText, "uart").value_or("com1"),
+                               parts_->host->simulator->path()});
     }
-    if (parts_->storage) {
-        reportUnused(parts_->context, *parts_->storage, parts_->channel.protocol().GetIdent());
+    if (parts_->host->storage) {
+        reportUnused(parts_->context, *parts_->host->storage,
+                     parts_->channel.protocol().GetIdent());
     }
+    parts_->prepared = true;
+}
+
+void Session::start() {
+    prepareLine();
     if (const auto done = parts_->channel.start(); !done) {
-        const std::string reason = parts_->serial.lastError();
+        const std::string reason = parts_->host->serial.lastError();
         throw CommandError(ExitCode::Port,
                            reason.empty() ? done.error().text : done.error().text + ": " + reason);
     }
@@ -158,7 +198,7 @@ void Session::start() {
 }
 
 bool Session::hasLine() const {
-    return parts_->simulator != nullptr || !parts_->ports.empty();
+    return parts_->host->simulator != nullptr || !parts_->host->ports.empty();
 }
 
 runtime::Channel& Session::channel() const {
@@ -166,12 +206,12 @@ runtime::Channel& Session::channel() const {
 }
 
 runtime::Storage* Session::storage() {
-    return parts_->storage.get();
+    return parts_->host->storage.get();
 }
 
 void Session::checkStorage() {
-    if (parts_->storage && parts_->storage->failed()) {
-        throw CommandError(ExitCode::Other, "storage: " + parts_->storage->lastError());
+    if (parts_->host->storage && parts_->host->storage->failed()) {
+        throw CommandError(ExitCode::Other, "storage: " + parts_->host->storage->lastError());
     }
 }
 

@@ -27,6 +27,9 @@ class Session {
     /// Errors: CommandError, Usage for the configuration, Other for plug-in and storage.
     Session(CommandContext& context, const LineOptions& options,
             StorageNeed need = StorageNeed::Use);
+    /// Another driver on the host of a session that lives at the same time: the same plug-in,
+    /// ports, storage and simulated line; only configuration and driver are new. Errors: as above.
+    Session(CommandContext& context, const LineOptions& options, const Session& beside);
     ~Session();
     Session(const Session&) = delete;
     Session& operator=(const Session&) = delete;
@@ -36,6 +39,14 @@ class Session {
     /// Errors: CommandError, Usage when the command line names no line, Port with the driver's text
     /// and the run time's reason, Other when the overrides can't be read.
     void start();
+
+    /// All of start() but the driver's own: the simulator runs, the port is known. What is repeated
+    /// does nothing. For lines that are opened and closed again and again.
+    /// Errors: as start().
+    void prepareLine();
+    /// Tells whether the port has vanished since it was opened last, and why it was not opened.
+    [[nodiscard]] bool portVanished() const;
+    [[nodiscard]] std::string portFault() const;
 
     /// Tells whether the command line names a line at all.
     [[nodiscard]] bool hasLine() const;
@@ -70,7 +81,10 @@ class Session {
     [[nodiscard]] const std::string& configText() const;
 
   private:
+    struct Host;
     struct Parts;
+    Session(CommandContext& context, const LineOptions& options, std::string configText,
+            StorageNeed need, std::shared_ptr<Host> host);
     [[nodiscard]] Failure failureOf(const ITag& tag, const runtime::ChannelError& error,
                                     bool asked) const;
     [[nodiscard]] std::uint64_t framesSent() const;

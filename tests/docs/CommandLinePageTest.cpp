@@ -53,7 +53,8 @@ Names commandsOfCell(const std::string& cell) {
     Names commands;
     if (cell == "all") commands = {all.begin(), all.end()};
     if (cell == "all") commands.insert("mrtu");
-    if (cell.starts_with("line commands")) commands = {"read", "write", "console", "override"};
+    if (cell.starts_with("line commands"))
+        commands = {"read", "write", "console", "override", "poll"};
     for (const std::string& name : codeIn(cell))
         commands.insert(name);
     return commands;

@@ -238,14 +238,14 @@ int RunningSim::end(int signal) {
     return code;
 }
 
-TerminalSession::TerminalSession(const std::vector<std::string>& words) {
+TerminalSession::TerminalSession(const std::vector<std::string>& words, const char* type) {
     scratchFolder();
     struct winsize size {};
     size.ws_row = 24;
     size.ws_col = 80;
     pid_ = forkpty(&terminal_, nullptr, nullptr, &size);
     if (pid_ == 0) {
-        setenv("TERM", "dumb", 1);
+        setenv("TERM", type, 1);
         prepareChild({});
         exec(words);
     }
@@ -260,6 +260,13 @@ TerminalSession::~TerminalSession() {
     }
     close(watch_);
     close(terminal_);
+}
+
+void TerminalSession::resize(int columns, int rows) const {
+    struct winsize size {};
+    size.ws_row = static_cast<unsigned short>(rows);
+    size.ws_col = static_cast<unsigned short>(columns);
+    EXPECT_EQ(0, ioctl(terminal_, TIOCSWINSZ, &size));
 }
 
 void TerminalSession::send(int signal) const {

@@ -83,12 +83,14 @@ class RunningSim {
 /// `mrtu` at a terminal of its own.
 class TerminalSession {
   public:
-    explicit TerminalSession(const std::vector<std::string>& words);
+    /// @param type  What TERM says; "dumb": nothing can be drawn.
+    explicit TerminalSession(const std::vector<std::string>& words, const char* type = "dumb");
     ~TerminalSession();
     TerminalSession(const TerminalSession&) = delete;
     TerminalSession& operator=(const TerminalSession&) = delete;
 
     void type(const std::string& keys);
+    void resize(int columns, int rows) const;
     void send(int signal) const;
     /// The terminal's settings at this moment; they outlast the process.
     termios settings() const;

@@ -66,7 +66,7 @@ TEST(UsageTest, WhatIsUnknownIsAnsweredWithWhatIsAccepted) {
     } rows[] = {
         {{"reed", kUri},
          "unknown command: 'reed' is not one of read, write, console, override, info, describe, "
-         "check, plan, inspect, sim; did you mean 'read'?"},
+         "check, plan, poll, inspect, sim; did you mean 'read'?"},
         {{"override", "lst"},
          "unknown command: 'lst' is not one of list, set, clear; did you mean 'list'?"},
         {{"override"}, "one of list, set, clear must follow; 'mrtu override --help' tells more"},
@@ -162,7 +162,7 @@ TEST(UsageTest, EveryCommandThatIsOfferedStandsInTheHelp) {
         if (name.ends_with(',')) name.pop_back();
         EXPECT_NE(std::string::npos, help.find("\n  " + name + ' ')) << name;
     }
-    EXPECT_EQ(10, count);
+    EXPECT_EQ(11, count);
 }
 
 TEST(UsageTest, EveryCommandExplainsItselfWithExamples) {
