@@ -169,6 +169,10 @@ std::string Session::portFault() const {
     return parts_->host->serial.lastError();
 }
 
+void Session::limitWait(std::chrono::milliseconds wait) {
+    parts_->host->serial.limitWait(static_cast<int>(wait.count()));
+}
+
 void Session::prepareLine() {
     if (parts_->prepared) return;
     if (!hasLine()) {

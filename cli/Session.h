@@ -1,6 +1,7 @@
 // A loaded, configured driver on its line, for as long as one sub-command runs.
 #pragma once
 
+#include <chrono>
 #include <memory>
 #include <string>
 
@@ -47,6 +48,9 @@ class Session {
     /// Tells whether the port has vanished since it was opened last, and why it was not opened.
     [[nodiscard]] bool portVanished() const;
     [[nodiscard]] std::string portFault() const;
+    /// From now on no reply is waited for longer than so, whatever the driver asks for; 0: as long
+    /// as it asks for. Holds for all sessions on one host.
+    void limitWait(std::chrono::milliseconds wait);
 
     /// Tells whether the command line names a line at all.
     [[nodiscard]] bool hasLine() const;

@@ -56,10 +56,12 @@ class SessionSource final : public poll::BlockSource {
   public:
     SessionSource(std::shared_ptr<PollPlan> plan, std::vector<const ITag*> tags)
         : plan_(std::move(plan)),
-          source_(plan_->session().channel(), std::move(tags),
-                  {.gone = [this] { return plan_->session().portVanished(); },
-                   .whyNotOpen = [this] { return plan_->session().portFault(); },
-                   .limitWait = {}}) {}
+          source_(
+              plan_->session().channel(), std::move(tags),
+              {.gone = [this] { return plan_->session().portVanished(); },
+               .whyNotOpen = [this] { return plan_->session().portFault(); },
+               .limitWait =
+                   [this](std::chrono::milliseconds wait) { plan_->session().limitWait(wait); }}) {}
 
     std::vector<poll::TagReading> read(const poll::Block& block) override {
         return source_.read(block);

@@ -159,7 +159,7 @@ TEST_F(PollRunTest, NamesWhyNothingWasTaken) {
               output_.notices[0]);
 }
 
-TEST(PollRunRulesTest, OneCycleIsDoneWhenEveryTagWasTried) {
+TEST_F(PollRunTest, OneCycleIsDoneWhenEveryTagWasTried) {
     poll::Snapshot snapshot = cli_test::sampleSnapshot();
     EXPECT_TRUE(cli::cyclesDone(snapshot, 1));
     EXPECT_FALSE(cli::cyclesDone(snapshot, 2));
@@ -167,7 +167,7 @@ TEST(PollRunRulesTest, OneCycleIsDoneWhenEveryTagWasTried) {
     EXPECT_FALSE(cli::cyclesDone(snapshot, 1));
 }
 
-TEST(PollRunRulesTest, SilentNodesAndLostPortsEndTheCycles) {
+TEST_F(PollRunTest, SilentNodesAndLostPortsEndTheCycles) {
     poll::Snapshot snapshot = cli_test::sampleSnapshot();
     snapshot.nodes[0].reachable = false;
     EXPECT_TRUE(cli::cyclesDone(snapshot, 5));
@@ -180,7 +180,7 @@ TEST(PollRunRulesTest, SilentNodesAndLostPortsEndTheCycles) {
     EXPECT_EQ(ExitCode::Port, cli::exitCodeOf(snapshot));
 }
 
-TEST(PollRunRulesTest, TheFirstFailingTagDecides) {
+TEST_F(PollRunTest, TheFirstFailingTagDecides) {
     poll::Snapshot snapshot = cli_test::sampleSnapshot();
     snapshot.tags[1].error = {-4, "no response"};
     EXPECT_EQ(ExitCode::NoResponse, cli::exitCodeOf(snapshot));
