@@ -3,8 +3,6 @@
 #include <fmt/format.h>
 
 #include <algorithm>
-#include <array>
-#include <span>
 
 #include <algorithm>
 #include <tuple>
@@ -71,10 +69,7 @@ std::size_t firstForeignByte(std::string_view text) {
             ++at;
             continue;
         }
-        std::array<std::uint8_t, 4> bytes{};  // No character has more.
-        const std::size_t count = std::min(bytes.size(), text.size() - at);
-        std::copy_n(text.begin() + static_cast<std::ptrdiff_t>(at), count, bytes.begin());
-        const std::size_t length = values::utf8Length(std::span(bytes).first(count));
+        const std::size_t length = values::utf8Length(text.substr(at));
         if (length == 0) return at;
         at += length;
     }

@@ -2,6 +2,7 @@
 
 #include <fmt/format.h>
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 
@@ -80,6 +81,13 @@ std::size_t utf8Length(ByteView bytes) {
         return code < row.smallest || code > 0x10FFFF || surrogate ? 0 : row.length;
     }
     return 0;
+}
+
+std::size_t utf8Length(std::string_view text) {
+    std::array<std::uint8_t, 4> bytes{};  // No character has more.
+    const std::size_t count = std::min(bytes.size(), text.size());
+    std::copy_n(text.begin(), count, bytes.begin());
+    return utf8Length(ByteView(bytes).first(count));
 }
 
 std::string escapeText(ByteView bytes) {

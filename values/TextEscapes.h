@@ -25,5 +25,6 @@ Bytes unescapeText(std::string_view text);
 /// @return the length of the UTF-8 character that `bytes` begins with; 0 when there is none.
 /// Overlong forms, surrogates and numbers above U+10FFFF are none.
 std::size_t utf8Length(ByteView bytes);
+std::size_t utf8Length(std::string_view text);
 
 }  // namespace values

@@ -54,15 +54,13 @@ struct Character {
 };
 
 Character firstCharacter(std::string_view text) {
-    const values::Bytes start(
-        text.begin(),
-        text.begin() + static_cast<std::ptrdiff_t>(std::min<std::size_t>(4, text.size())));
-    const std::size_t bytes = values::utf8Length(start);
+    const std::size_t bytes = values::utf8Length(text);
     if (bytes == 0) return {};
+    const auto byteAt = [text](std::size_t at) { return static_cast<unsigned char>(text[at]); };
     // The lead byte of a character of n > 1 bytes begins with n ones and a zero.
-    char32_t code = bytes == 1 ? start[0] : start[0] & (0x7FU >> bytes);
+    char32_t code = bytes == 1 ? byteAt(0) : byteAt(0) & (0x7FU >> bytes);
     for (std::size_t i = 1; i < bytes; ++i)
-        code = code << 6 | (start[i] & 0x3FU);
+        code = code << 6 | (byteAt(i) & 0x3FU);
     return {code, bytes, true};
 }
 
