@@ -128,7 +128,7 @@ TEST_F(PollerTest, AWriteToAStoppedLineFails) {
 
 TEST_F(PollerTest, ALineThatStaysTheSameIsNotTouchedByAReload) {
     poller_.start({lineOf("com1", "a"), lineOf("com2", "b")});
-    waitFor([&] { return countOf(0) > 0; });
+    waitFor([&] { return countOf(0) > 0 && log_.of("com2") == "open "; });
     LineSetup reworded = lineOf("com1", "a");
     reworded.blocks[0].reason = "told otherwise";
     EXPECT_FALSE(poller_.reload({lineOf("com3", "c"), reworded}));
