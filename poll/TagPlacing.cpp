@@ -77,4 +77,14 @@ Limits limitsOf(std::span<const TagPlace> places, const settings::ScannedConfig&
     return limits;
 }
 
+std::vector<int> nodesOf(std::span<const TagPlace> places) {
+    std::vector<int> nodes;
+    nodes.reserve(places.size());
+    for (const TagPlace& place : places)
+        nodes.push_back(place.node);
+    std::sort(nodes.begin(), nodes.end());
+    nodes.erase(std::unique(nodes.begin(), nodes.end()), nodes.end());
+    return nodes;
+}
+
 }  // namespace poll

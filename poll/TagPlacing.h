@@ -2,7 +2,9 @@
 #pragma once
 
 #include <optional>
+#include <span>
 #include <string>
+#include <vector>
 
 #include "poll/Plan.h"
 #include "runtime/Channel.h"
@@ -23,5 +25,8 @@ std::optional<TagPlace> placeOf(const ITag& tag, const runtime::Channel& channel
 /// lowers them.
 Limits limitsOf(std::span<const TagPlace> places, const settings::ScannedConfig& config,
                 const settings::Description& description);
+
+/// @return the nodes of the places, each once, in ascending order.
+std::vector<int> nodesOf(std::span<const TagPlace> places);
 
 }  // namespace poll

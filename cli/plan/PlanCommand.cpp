@@ -71,13 +71,6 @@ void addPlaces(PlanTask& task, CommandContext& context, const Options& options, 
         throw CommandError(ExitCode::Usage, "no plan: not every tag can be made");
 }
 
-std::vector<int> nodesOf(const std::vector<poll::TagPlace>& places) {
-    std::vector<int> nodes;
-    for (const poll::TagPlace& place : places)
-        if (nodes.empty() || nodes.back() != place.node) nodes.push_back(place.node);
-    return nodes;
-}
-
 poll::LineHabits habitsOf(const Options& options) {
     return {.endsByLength = options.line.frameEnd == "length",
             .shortestGap = std::chrono::milliseconds{options.line.minGapMs},
@@ -101,7 +94,7 @@ PlanTask taskOf(const Options& options, CommandContext& context) {
                   .costs = {}};
     addPlaces(task, context, options, driver.protocol(), tags);
     task.costs =
-        poll::costsOf(task.config, task.description, nodesOf(task.places), habitsOf(options));
+        poll::costsOf(task.config, task.description, poll::nodesOf(task.places), habitsOf(options));
     return task;
 }
 

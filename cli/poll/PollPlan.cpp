@@ -19,9 +19,6 @@
 namespace cli {
 namespace {
 
-/// Of devices about which nothing is known yet.
-constexpr std::chrono::milliseconds kUsualTurnaround{5};
-
 /// How often the driver repeats a request that failed; what it takes without a word of the
 /// configuration stands in its description.
 int repeatsOf(const std::string& configText, const settings::Description& description) {
@@ -39,16 +36,6 @@ std::vector<poll::ListedTag> listedTags(CommandContext& context, const std::stri
     std::vector<poll::ListedTag> tags = TagNames(context, file).all();
     if (tags.empty()) throw CommandError(ExitCode::Usage, file + ": the list has no tags");
     return tags;
-}
-
-std::vector<int> nodesOf(const std::vector<poll::TagPlace>& places) {
-    std::vector<int> nodes;
-    nodes.reserve(places.size());
-    for (const poll::TagPlace& place : places)
-        nodes.push_back(place.node);
-    std::sort(nodes.begin(), nodes.end());
-    nodes.erase(std::unique(nodes.begin(), nodes.end()), nodes.end());
-    return nodes;
 }
 
 /// A line whose port is opened and closed while the driver stays.
@@ -149,14 +136,13 @@ void PollPlan::makeSetup(const std::vector<poll::ListedTag>& tags) {
     const std::string& text = session_->configText();
     const settings::ScannedConfig config = settings::scanConfig(options_.line.configFile, text);
     const poll::LineHabits habits{.endsByLength = options_.line.frameEnd == "length",
-                                  .shortestGap = std::chrono::milliseconds(options_.line.minGapMs),
-                                  .turnaround = kUsualTurnaround};
+                                  .shortestGap = std::chrono::milliseconds(options_.line.minGapMs)};
     setup_.name = settings::itemOf(text, "uart").value_or("com1");
     setup_.configuration = text;
     setup_.repeats = repeatsOf(text, description);
     setup_.blocks =
         poll::makePlan(setup_.places, poll::limitsOf(setup_.places, config, description),
-                       poll::costsOf(config, description, nodesOf(setup_.places), habits))
+                       poll::costsOf(config, description, poll::nodesOf(setup_.places), habits))
             .blocks;
 }
 
