@@ -56,5 +56,6 @@ function(mrtu_test name)
     string(APPEND label "-threads")
     add_dependencies(mrtu_threaded_tests ${name})
   endif()
-  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST PROPERTIES TIMEOUT 300 LABELS "${label}")
+  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST DISCOVERY_TIMEOUT 60
+    PROPERTIES TIMEOUT 300 LABELS "${label}")
 endfunction()
