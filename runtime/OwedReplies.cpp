@@ -48,10 +48,10 @@ Departure OwedReplies::before(ByteView request, TimePoint now) {
 void OwedReplies::sent(ByteView request, TimePoint now) {
     const bool repeated = isRepetition(request);
     if (!repeated) putAside();
-    const auto addressee =
-        request.size() <= kLongestRequest ? rules_.addressee(request) : std::nullopt;
-    latestAnswered_ = !addressee;
-    if (!addressee) return latest_.start({}, 0, now);
+    const auto addressee = rules_.addressee(request);
+    const bool isFollowed = addressee && request.size() <= kLongestRequest;
+    latestAnswered_ = !isFollowed;
+    if (!isFollowed) return latest_.start({}, 0, now);
     if (!repeated || latest_.owed == 0) latest_.start(request, *addressee, now);
     ++latest_.owed;
     latest_.last = now;
